@@ -1,0 +1,26 @@
+#include "ScriptRunner.h"
+
+#include "orbane/LuaRuntime.h"
+
+#include <lua.hpp>
+
+namespace Orbane {
+
+int ScriptRunner::Run(const QString &path, QTextStream &err)
+{
+    LuaRuntime &lua = LuaRuntime::Instance();
+    lua_State *L = lua.State();
+    const int top = lua_gettop(L);
+    std::string why;
+    if (!lua.RunFile(path.toStdString(), &why)) {
+        err << why.c_str() << "\n";
+        return 1;
+    }
+    int status = 0;
+    if (lua_gettop(L) > top && lua_isnumber(L, -1))
+        status = int(lua_tointeger(L, -1));
+    lua_settop(L, top);
+    return status;
+}
+
+} // namespace Orbane
