@@ -12,7 +12,7 @@ int ScriptRunner::Run(const QString &path, QTextStream &err)
     lua_State *L = lua.State();
     const int top = lua_gettop(L);
     std::string why;
-    if (!lua.RunFile(path.toStdString(), &why)) {
+    if (!lua.RunFile(path.toStdString(), &why, 1)) {
         err << why.c_str() << "\n";
         return 1;
     }

@@ -51,6 +51,8 @@ public:
     ScriptObject *New(const ScriptVal &args, const TagList &tags) const;
 
 private:
+    void ReadBaseClassID(const TagList &tags);
+
     RegistryList *mList = nullptr;
     OrbID mClassID, mBaseID;
     // The base class ID passed by address is read when needed: it may be a

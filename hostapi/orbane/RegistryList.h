@@ -23,6 +23,9 @@ public:
     // By class ID, else by script type name (the primary registration of the
     // native class that the script type is bound to). Null if neither.
     const Registry *FindScriptName(const char *name) const;
+    // The registration named `nativeName` that has a tag-map hook, else the
+    // first of that name.
+    const Registry *FindNativeName(const char *nativeName) const;
     // Creates an instance of the class `classID`; null if unknown.
     ScriptObject *New(const OrbID &classID, const ScriptVal &args, const TagList &tags) const;
 

@@ -105,6 +105,9 @@ public:
     bool IsEmpty() const noexcept { return mItems.empty(); }
     const std::vector<TagItem> &Items() const noexcept { return mItems; }
 
+    // Does the tag id's type promise values of this kind?
+    static bool KindFits(Tag tag, TagKind kind) noexcept;
+
 private:
     const TagItem *Typed(Tag tag, TagKind kind) const;
     std::vector<TagItem> mItems;

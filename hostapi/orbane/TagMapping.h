@@ -6,6 +6,7 @@ namespace Orbane {
 
 class ScriptVal;
 class TagList;
+struct TagItem;
 
 // Directions of scriptval_maptags.
 enum MapDirection : int32
@@ -21,5 +22,9 @@ enum MapDirection : int32
 // list gets its value under its name (enumerations by value name, colours as
 // {R, G, B, A} tables of 0..1).
 bool scriptval_maptags(const TagMapEntry *table, int32 direction, ScriptVal &args, TagList &tags);
+
+// One tag value as a script sees it without a tag table: integers and doubles
+// as numbers, texts and identifiers as strings, objects and pointers as such.
+ScriptVal TagItemValue(const TagItem &item);
 
 } // namespace Orbane

@@ -1,0 +1,252 @@
+#include "Counted.h"
+#include "TestClasses.h"
+#include "TestShow.h"
+
+#include "orbane/ScriptError.h"
+#include "orbane/ScriptVal.h"
+#include "orbane/TagList.h"
+#include "orbane/TagMapping.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdio>
+#include <string>
+#include <vector>
+
+namespace Orbane {
+
+using namespace Orbane::TestKit;
+
+namespace {
+
+ScriptVal Table(std::initializer_list<ScriptVal::Entry> entries)
+{
+    ScriptVal t = ScriptVal::NewTable();
+    for (const auto &[key, value] : entries)
+        t.SetKey(key, value);
+    return t;
+}
+
+ScriptVal Array(std::initializer_list<ScriptVal> values)
+{
+    ScriptVal t = ScriptVal::NewTable();
+    for (const ScriptVal &v : values)
+        t.Append(v);
+    return t;
+}
+
+bool IntoTags(ScriptVal args, TagList &tags)
+{
+    return scriptval_maptags(WidgetTags, MAP_ToTags, args, tags);
+}
+
+struct IntoCase
+{
+    const char *name;
+    ScriptVal args;
+    std::string tags;
+};
+
+std::vector<IntoCase> IntoCases()
+{
+    return {
+        {"PlainText", Table({{"WGT_Title", "Hello"}}), "30050000=Hello"},
+        {"PlainInteger", Table({{"WGT_Count", 3}}), "10050001=3"},
+        {"PlainIntegerFromBoolean", Table({{"WGT_Count", true}}), "10050001=1"},
+        {"PlainDouble", Table({{"WGT_Scale", 0.5}}), "20050002=0.5"},
+        {"PlainIdentifier", Table({{"WGT_Mode", "Fast"}}), "80050003=#Fast"},
+        {"BooleanTrue", Table({{"WGT_TriState", true}}), "10050004=1"},
+        {"BooleanFalse", Table({{"WGT_TriState", false}}), "10050004=0"},
+        {"BooleanFromOne", Table({{"WGT_TriState", 1}}), "10050004=1"},
+        {"BooleanFromZero", Table({{"WGT_TriState", 0}}), "10050004=0"},
+        {"EnumerationByName", Table({{"WGT_Align", "CenteredRight"}}), "10050005=3"},
+        {"EnumerationByNumber", Table({{"WGT_Align", 4}}), "10050005=4"},
+        {"ColourPacked", Table({{"WGT_Color", 2164195328.0}}), "10050007=2164195328"},
+        {"ColourNamedTable", Table({{"WGT_Color", Table({{"R", 1}, {"G", 0.5}, {"B", 0}})}}), "10050007=4278223103"},
+        {"ColourArray", Table({{"WGT_Color", Array({0, 0, 1, 0.5})}}), "10050007=2164195328"},
+        {"ColourClamped", Table({{"WGT_Color", Table({{"R", 2}, {"G", -1}, {"B", 0}, {"A", 1}})}}),
+         "10050007=4278190335"},
+        {"RepeatableArray", Table({{"WGT_AddItem", Array({"a", "b", "c"})}}), "38050008=a 38050008=b 38050008=c"},
+        {"RepeatableSingle", Table({{"WGT_AddItem", "only"}}), "38050008=only"},
+        {"InsertionOrder", Table({{"WGT_Scale", 1}, {"WGT_Title", "T"}, {"WGT_Count", 2}}),
+         "20050002=1 30050000=T 10050001=2"},
+        {"EmptyTable", ScriptVal::NewTable(), ""},
+        {"NoTable", ScriptVal(), ""},
+    };
+}
+
+class IntoTagsTest : public testing::TestWithParam<IntoCase>
+{
+};
+
+struct ErrorCase
+{
+    const char *name;
+    ScriptVal args;
+    const char *message;
+};
+
+std::vector<ErrorCase> ErrorCases()
+{
+    return {
+        {"UnknownTag", Table({{"Foo", 1}}), "unknown tag \"Foo\" for ScriptWidget"},
+        {"BooleanGivenString", Table({{"WGT_TriState", "yes"}}), "WGT_TriState: expected a boolean, got string"},
+        {"BooleanGivenTwo", Table({{"WGT_TriState", 2}}), "WGT_TriState: expected a boolean, got 2"},
+        {"UnknownEnumerationName", Table({{"WGT_Align", "Middle"}}),
+         "WGT_Align: unknown value \"Middle\"; expected one of Left, CenteredLeft, Center, CenteredRight, Right"},
+        {"UnknownEnumerationNumber", Table({{"WGT_Align", 9}}),
+         "WGT_Align: unknown value 9; expected one of Left, CenteredLeft, Center, CenteredRight, Right"},
+        {"EnumerationGivenBoolean", Table({{"WGT_Align", true}}),
+         "WGT_Align: expected a name of Align or a number, got boolean"},
+        {"TextGivenNumber", Table({{"WGT_Title", 5}}), "WGT_Title: expected a string, got 5"},
+        {"IntegerGivenFraction", Table({{"WGT_Count", 1.5}}), "WGT_Count: expected an integer, got 1.5"},
+        {"DoubleGivenString", Table({{"WGT_Scale", "big"}}), "WGT_Scale: expected a number, got string"},
+        {"IdentifierGivenNumber", Table({{"WGT_Mode", 1}}), "WGT_Mode: expected an identifier string, got 1"},
+        {"ObjectGivenNumber", Table({{"WGT_Partner", 5}}),
+         "WGT_Partner: expected an object of type ScriptWidget, got 5"},
+        {"ColourGivenString", Table({{"WGT_Color", "red"}}), nullptr},
+        {"ColourMissingChannel", Table({{"WGT_Color", Table({{"R", 1}, {"G", 1}})}}), nullptr},
+        {"ColourNegative", Table({{"WGT_Color", -1}}), nullptr},
+        {"RepeatableItemOfWrongType", Table({{"WGT_AddItem", Array({"a", 2})}}),
+         "WGT_AddItem: item 2: expected a string, got 2"},
+        {"RepeatableWithOtherKeys", Table({{"WGT_AddItem", Table({{1, "a"}, {"x", 1}})}}),
+         "WGT_AddItem: expected a value or an array of values, got a table with other keys"},
+        {"PositionalValue", Array({"x"}), "tag names must be strings, got 1"},
+        {"NotATable", ScriptVal("text"), "tags must be given as a table, got string"},
+    };
+}
+
+class MapErrorTest : public testing::TestWithParam<ErrorCase>
+{
+};
+
+struct FromCase
+{
+    const char *name;
+    TagList tags;
+    std::string attrs;
+};
+
+std::vector<FromCase> FromCases()
+{
+    return {
+        {"Plain",
+         {{WGT_Title, "Hello"}, {WGT_Count, 3}, {WGT_Scale, 0.5}, {WGT_Mode, OrbID("Fast")}},
+         "WGT_Title=Hello; WGT_Count=3; WGT_Scale=0.5; WGT_Mode=Fast"},
+        {"BooleanTrue", {{WGT_TriState, 1}}, "WGT_TriState=true"},
+        {"BooleanFalse", {{WGT_TriState, 0}}, "WGT_TriState=false"},
+        {"EnumerationByName", {{WGT_Align, 2}}, "WGT_Align=Center"},
+        {"EnumerationUnnamedValue", {{WGT_Align, 9}}, "WGT_Align=9"},
+        {"Colour", {{WGT_Color, 0xFF0000FFu}}, "WGT_Color={R=1, G=0, B=0, A=1}"},
+        {"Repeatable", {{WGT_AddItem, "a"}, {WGT_Title, "T"}, {WGT_AddItem, "b"}}, "WGT_Title=T; WGT_AddItem={a, b}"},
+        {"RowOrder", {{WGT_Scale, 1.0}, {WGT_Title, "T"}}, "WGT_Title=T; WGT_Scale=1"},
+        {"WrongKindIsSkipped", {{WGT_Title, 5}, {WGT_TriState, "yes"}}, ""},
+        {"UnknownTagsAreIgnored", {{0x10059999, 1}}, ""},
+    };
+}
+
+class FromTagsTest : public testing::TestWithParam<FromCase>
+{
+};
+
+const auto kName = [](const auto &info) { return std::string(info.param.name); };
+
+} // namespace
+
+TEST_P(IntoTagsTest, MapsNamedValuesToTags)
+{
+    TagList tags;
+    ASSERT_TRUE(IntoTags(GetParam().args, tags)) << TakeScriptError();
+    EXPECT_EQ(Show(tags), GetParam().tags);
+}
+
+INSTANTIATE_TEST_SUITE_P(TagMapping, IntoTagsTest, testing::ValuesIn(IntoCases()), kName);
+
+TEST_P(MapErrorTest, FailsWithAMessageAndLeavesTheListAlone)
+{
+    TagList tags{{WGT_Title, "before"}};
+    TakeScriptError();
+    EXPECT_FALSE(IntoTags(GetParam().args, tags));
+    const std::string message = TakeScriptError();
+    if (GetParam().message)
+        EXPECT_EQ(message, GetParam().message);
+    else
+        EXPECT_EQ(message.rfind("WGT_Color: expected a colour (a packed integer or a table {R=, G=, B=, A=}", 0), 0u)
+            << message;
+    EXPECT_EQ(Show(tags), "30050000=before");
+}
+
+INSTANTIATE_TEST_SUITE_P(TagMapping, MapErrorTest, testing::ValuesIn(ErrorCases()), kName);
+
+TEST_P(FromTagsTest, MapsTagsToNamedValues)
+{
+    ScriptVal attrs;
+    TagList tags = GetParam().tags;
+    ASSERT_TRUE(scriptval_maptags(WidgetTags, MAP_FromTags, attrs, tags));
+    EXPECT_EQ(Show(attrs), GetParam().attrs);
+}
+
+INSTANTIATE_TEST_SUITE_P(TagMapping, FromTagsTest, testing::ValuesIn(FromCases()), kName);
+
+TEST(TagMapping, AFailureAfterGoodValuesAddsNothing)
+{
+    TagList tags;
+    EXPECT_FALSE(IntoTags(Table({{"WGT_Title", "ok"}, {"WGT_TriState", "bad"}}), tags));
+    EXPECT_TRUE(tags.IsEmpty());
+    EXPECT_EQ(TakeScriptError(), "WGT_TriState: expected a boolean, got string");
+}
+
+TEST(TagMapping, ObjectsMustBeOfTheRowsTypeOrDeriveFromIt)
+{
+    int deaths = 0;
+    auto *widget = new Counted(&deaths, "ScriptWidget");
+    auto *gadget = new Counted(&deaths, "GadgetControl"); // its script base is ScriptWidget
+    auto *stranger = new Counted(&deaths, "Image");
+    TagList tags;
+    EXPECT_TRUE(IntoTags(Table({{"WGT_Partner", widget}}), tags));
+    EXPECT_TRUE(IntoTags(Table({{"WGT_Partner", gadget}}), tags));
+    EXPECT_EQ(Show(tags), "40050006=ScriptWidget 40050006=GadgetControl");
+    EXPECT_EQ(widget->RefCount(), 2) << "the list holds a reference";
+    EXPECT_FALSE(IntoTags(Table({{"WGT_Partner", stranger}}), tags));
+    EXPECT_EQ(TakeScriptError(), "WGT_Partner: expected an object of type ScriptWidget, got Image");
+
+    ScriptVal attrs;
+    ASSERT_TRUE(scriptval_maptags(WidgetTags, MAP_FromTags, attrs, tags));
+    EXPECT_EQ(attrs.FindKeyConst("WGT_Partner")->GetObject(), widget) << "not repeatable: the first occurrence";
+    for (auto *obj : {widget, gadget, stranger})
+        obj->DecRef();
+    tags.Clear();
+    attrs = ScriptVal();
+    EXPECT_EQ(deaths, 3);
+}
+
+// What a script sets comes back the same way from GetAttrs.
+TEST(TagMapping, RoundTripsEveryKind)
+{
+    const ScriptVal args = Table({
+        {"WGT_Title", "Title"},
+        {"WGT_Count", 12},
+        {"WGT_Scale", 0.25},
+        {"WGT_Mode", "Fast"},
+        {"WGT_TriState", true},
+        {"WGT_Align", "Right"},
+        {"WGT_Color", Table({{"R", 0}, {"G", 1}, {"B", 0}, {"A", 1}})},
+        {"WGT_AddItem", Array({"x", "y"})},
+    });
+    TagList tags;
+    ASSERT_TRUE(IntoTags(args, tags));
+    ScriptVal back;
+    ASSERT_TRUE(scriptval_maptags(WidgetTags, MAP_FromTags, back, tags));
+    EXPECT_EQ(Show(back), Show(args));
+}
+
+TEST(TagMapping, TagItemValueShowsRawValues)
+{
+    const TagList tags{{WGT_Count, 4}, {WGT_Scale, 1.5}, {WGT_Title, "t"}, {WGT_Mode, OrbID("m")}};
+    std::string out;
+    for (const TagItem &item : tags.Items())
+        out += Show(TagItemValue(item)) + " ";
+    EXPECT_EQ(out, "4 1.5 t m ");
+}
+
+} // namespace Orbane
