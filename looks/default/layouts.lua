@@ -1,0 +1,121 @@
+-- Layout descriptions of the inspector controls.
+--
+-- Each item is a table whose entry [1] is the description a control uses.
+-- A description is a tree of nodes; sizes are in logical pixels.
+--
+--   "name"                              the child the control registered as "name"
+--   { name = "label", <sizes> }         the same, with size rules
+--   { kind = "hbox", <box>, node, ... } children side by side
+--   { kind = "vbox", <box>, node, ... } children one under the other
+--                                       (a table with children and no kind is a vbox)
+--   { kind = "grid", <grid>, node, ... } children in cells: row = r, col = c
+--                                       (from 1), rowspan, colspan
+--   { kind = "space", width = w, height = h }  a fixed gap
+--   { kind = "stretch" }                a gap that takes spare room
+--   { kind = "rest" }                   every registered child no other node names
+--
+--   <sizes>  width, height (fixed); minwidth, minheight, maxwidth, maxheight;
+--            stretch = share of spare room in the parent box (default 0);
+--            align = "left" | "right" | "hcenter" | "top" | "bottom" | "vcenter"
+--                    | "center", joined with "|": keep the preferred size and
+--                    sit in the cell this way instead of filling it
+--   <box>    name, spacing (default 4), margins = n or { left, top, right, bottom }
+--   <grid>   name, hspacing, vspacing, margins, colstretch = { n, ... },
+--            rowstretch = { n, ... }
+--
+-- Containers may be empty: a control fills the one named "expression" with
+-- its expression field when the user adds an expression. Empty objects and
+-- hidden widgets take no room. A name the control did not register is left
+-- out of its layout.
+
+-- The column that labels share, so that controls line up in an inspector.
+local LABEL = { minwidth = 40, maxwidth = 110 }
+
+local function label(extra)
+    local node = { name = "label", minwidth = LABEL.minwidth, maxwidth = LABEL.maxwidth }
+    for k, v in pairs(extra or {}) do node[k] = v end
+    return node
+end
+
+local function expression()
+    return { kind = "vbox", name = "expression", spacing = 2 }
+end
+
+return {
+    -- Used for any control whose own description is missing: its children
+    -- in a row, an expression field under them.
+    ["Controls.Default.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 4, { kind = "rest" } },
+            expression(),
+        },
+    },
+
+    -- The second label at the left, the box with its (maybe wrapping) text.
+    ["Controls.CheckBox.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 4,
+                { name = "label", maxwidth = LABEL.maxwidth },
+                { name = "checkbox", stretch = 1 },
+            },
+            expression(),
+        },
+    },
+
+    -- An optional second label, then the button across the rest.
+    ["Controls.Button.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 4,
+                label(),
+                { name = "button", stretch = 1, minwidth = 40 },
+            },
+            expression(),
+        },
+    },
+
+    ["Controls.Combo.Layout.Horizontal"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 6,
+                label({ stretch = 1 }),
+                { name = "combo", stretch = 2, minwidth = 60 },
+            },
+            expression(),
+        },
+    },
+
+    ["Controls.Combo.Layout.Vertical"] = {
+        { kind = "vbox", spacing = 2,
+            { name = "label" },
+            { name = "combo", minwidth = 60 },
+            expression(),
+        },
+    },
+
+    -- Label and value on one line, the slider under them across the whole
+    -- width, the captions under the slider at its two ends and its middle.
+    ["Controls.Slider.Layout"] = {
+        { kind = "vbox", spacing = 1,
+            { kind = "hbox", spacing = 6,
+                { name = "label", stretch = 1 },
+                { name = "edit", width = 72 },
+            },
+            { name = "slider" },
+            { kind = "grid", hspacing = 4, vspacing = 0, colstretch = { 1, 1, 1 },
+                { name = "minlabel", row = 1, col = 1, align = "left|vcenter" },
+                { name = "midlabel", row = 1, col = 2, align = "hcenter|vcenter" },
+                { name = "maxlabel", row = 1, col = 3, align = "right|vcenter" },
+            },
+            expression(),
+        },
+    },
+
+    -- The name over a tree of keys and values; the control sets the tree's
+    -- height from its row count.
+    ["Controls.ScriptValList.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { name = "label" },
+            { name = "list", minheight = 40 },
+            expression(),
+        },
+    },
+}
