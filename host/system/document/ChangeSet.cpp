@@ -1,0 +1,47 @@
+#include "ChangeSet.h"
+
+#include <algorithm>
+
+namespace Orbane {
+
+namespace {
+bool SameValue(const Parameter *a, const Parameter *b)
+{
+    return a == b || (a && b && a->Equals(*b));
+}
+} // namespace
+
+void ChangeSet::Note(Input *in, const Input::Slot &slot, const AutoRef<Parameter> &before)
+{
+    const auto [it, added] = mIndex.emplace(Key(in, slot), mEntries.size());
+    if (added)
+        mEntries.push_back({AutoRef<Input>::Share(in), slot, before});
+}
+
+void ChangeSet::Swap()
+{
+    std::vector<Input *> touched;
+    for (Entry &e : mEntries) {
+        e.held = e.input->Exchange(e.slot, std::move(e.held));
+        if (std::find(touched.begin(), touched.end(), e.input.get()) == touched.end())
+            touched.push_back(e.input.get());
+    }
+    for (Input *in : touched)
+        in->Notify();
+}
+
+void ChangeSet::Prune()
+{
+    const auto unchanged = [](const Entry &e) { return SameValue(e.held, e.input->Peek(e.slot)); };
+    mEntries.erase(std::remove_if(mEntries.begin(), mEntries.end(), unchanged), mEntries.end());
+    Reindex();
+}
+
+void ChangeSet::Reindex()
+{
+    mIndex.clear();
+    for (std::size_t i = 0; i < mEntries.size(); ++i)
+        mIndex.emplace(Key(mEntries[i].input.get(), mEntries[i].slot), i);
+}
+
+} // namespace Orbane

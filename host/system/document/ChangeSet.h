@@ -1,0 +1,45 @@
+#pragma once
+
+#include "orbane/AutoRef.h"
+#include "orbane/Input.h"
+
+#include <cstddef>
+#include <map>
+#include <utility>
+#include <vector>
+
+namespace Orbane {
+
+// The Input slots an edit touched, each once, with the value the slot held
+// before the edit. Swapping exchanges those values with the stored ones, so
+// the same set serves undo, redo and rollback.
+class ChangeSet
+{
+public:
+    // Remembers `before` for the slot unless the slot is already known.
+    void Note(Input *in, const Input::Slot &slot, const AutoRef<Parameter> &before);
+    // Exchanges every held value with the one stored now, then tells the
+    // watchers of each Input concerned, once per Input.
+    void Swap();
+    // Forgets slots whose value is back to what it was before the edit.
+    void Prune();
+
+    std::size_t Size() const noexcept { return mEntries.size(); }
+    bool IsEmpty() const noexcept { return mEntries.empty(); }
+
+private:
+    struct Entry
+    {
+        AutoRef<Input> input;
+        Input::Slot slot;
+        AutoRef<Parameter> held;
+    };
+    using Key = std::pair<const Input *, Input::Slot>;
+
+    void Reindex();
+
+    std::vector<Entry> mEntries;
+    std::map<Key, std::size_t> mIndex;
+};
+
+} // namespace Orbane

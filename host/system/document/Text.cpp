@@ -1,0 +1,23 @@
+#include "orbane/Text.h"
+
+#include "orbane/ClassIDs.h"
+
+namespace Orbane {
+
+const OrbID &Text::DataType() const noexcept
+{
+    return CLSID_DataType_Text;
+}
+
+Parameter *Text::Clone() const
+{
+    return new Text(Value);
+}
+
+bool Text::Equals(const Parameter &o) const
+{
+    const auto *s = dynamic_cast<const Text *>(&o);
+    return s && s->Value == Value;
+}
+
+} // namespace Orbane

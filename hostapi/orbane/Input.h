@@ -1,0 +1,126 @@
+#pragma once
+
+#include "orbane/AutoRef.h"
+#include "orbane/LockableObject.h"
+#include "orbane/OrbID.h"
+#include "orbane/OrbString.h"
+#include "orbane/Parameter.h"
+#include "orbane/ScriptObject.h"
+#include "orbane/TagList.h"
+
+#include <map>
+#include <vector>
+
+namespace Orbane {
+
+class InputWatcher;
+class Operator;
+class OrbaneDoc;
+
+// Flags of Input::SetValue.
+enum SetValueFlags : uint32
+{
+    // Store without an undo record: the write a control makes when it is
+    // unbound restores what it showed; it is no user edit.
+    SETVALUE_NoUndo = 1u << 0,
+};
+
+// One parameter of a tool: an identifier, a display name, a data type, the
+// attributes the tool declared it with, and a value that is either plain or
+// animated (keyframes, blended between). Controls attach to it as watchers.
+// Values are touched on the UI thread only; the read/write lock guards the
+// watcher list, which other threads may walk.
+class Input : public RefObject, public LockableObject
+{
+public:
+    // Where a value lives: the plain value, or the keyframe at `time`.
+    struct Slot
+    {
+        bool keyed = false;
+        float64 time = 0.0;
+
+        bool operator==(const Slot &o) const noexcept { return keyed == o.keyed && (!keyed || time == o.time); }
+        bool operator<(const Slot &o) const noexcept
+        {
+            return keyed != o.keyed ? keyed < o.keyed : keyed && time < o.time;
+        }
+    };
+
+    // The value starts as a copy of `def` (may be null: no value yet).
+    Input(Operator *tool, const OrbID &id, const char *name, const OrbID &dataType, const TagList &attrs,
+          const Parameter *def);
+
+    const OrbID &GetID() const noexcept { return mID; }
+    // The display name; the identifier's text where none was given.
+    const char *GetName() const noexcept { return mName.IsEmpty() ? mID.c_str() : mName.c_str(); }
+    const OrbID &GetDataType() const noexcept { return mDataType; }
+    const TagList &GetAttrs() const noexcept { return mAttrs; }
+    const Parameter *GetDefault() const noexcept { return mDefault.get(); }
+    Operator *GetOperator() const noexcept { return mOperator; }
+    OrbaneDoc *GetDoc() const noexcept;
+    // The document's current time; 0 for an Input outside any document.
+    float64 CurrentTime() const noexcept;
+    const char *ScriptTypeName() const override { return "Input"; }
+
+    // The value at `time` as a new reference (hold it in an AutoParameter),
+    // or null where there is none. Animated: a key's own value at its time,
+    // blended between keys, the first or last key's value beyond them.
+    Parameter *GetValue(float64 time) const;
+    // Stores `value` (a copy of it) at `time`: as the keyframe at `time` where
+    // the Input is animated, as the plain value otherwise. Records undo in the
+    // document unless `flags` has SETVALUE_NoUndo, then tells every watcher,
+    // passing `tags` on. A value equal to the stored one changes nothing and
+    // tells nobody. A value of another data type is refused: false, with a
+    // script error naming the Input, its tool and both types.
+    // A time at or below TIME_UNDEFINED is an unset or disconnect time; on an
+    // animated Input it sets nothing (a sentinel must never become a key),
+    // on a plain one it sets the plain value.
+    bool SetValue(Parameter *value, float64 time, uint32 flags = 0, const TagList *tags = nullptr);
+    // Tells every watcher the value at the current time again.
+    void Notify(const TagList *tags = nullptr);
+
+    bool IsAnimated() const noexcept { return mAnimated; }
+    // Switching on keeps existing keys, or makes one at the current time from
+    // the plain value; switching off keeps the value at the current time as
+    // the plain value and drops the keys. Set-up, not an edit: no undo.
+    void SetAnimated(bool animated);
+    // The times of the keys, earliest first.
+    std::vector<float64> KeyTimes() const;
+
+    // Watchers are told in the order they were attached. Returns false for a
+    // null watcher or one already attached (or, on detach, not attached).
+    bool AttachWatcher(InputWatcher *w);
+    bool DetachWatcher(InputWatcher *w);
+    // Hold ReadLock (or a ReadGuard) while walking this list.
+    const std::vector<InputWatcher *> &Watchers() const noexcept { return mWatchers; }
+
+protected:
+    ~Input() override;
+
+private:
+    friend class Operator;
+    friend class ChangeSet;
+    friend class UndoRecorder;
+
+    bool Accepts(const Parameter *value) const;
+    bool SlotFor(float64 time, Slot &slot) const;
+    const Parameter *Peek(const Slot &slot) const;
+    // Puts `value` into `slot` (null removes a key) and returns what was
+    // there, without undo or notification.
+    AutoRef<Parameter> Exchange(const Slot &slot, AutoRef<Parameter> value);
+    bool IsWatching(InputWatcher *w) const;
+    void ForgetOperator() noexcept { mOperator = nullptr; }
+
+    OrbID mID;
+    OrbString mName;
+    OrbID mDataType;
+    TagList mAttrs;
+    Operator *mOperator;
+    AutoRef<Parameter> mDefault;
+    AutoRef<Parameter> mValue;
+    std::map<float64, AutoRef<Parameter>> mKeys;
+    bool mAnimated = false;
+    std::vector<InputWatcher *> mWatchers;
+};
+
+} // namespace Orbane

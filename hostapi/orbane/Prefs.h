@@ -1,0 +1,19 @@
+#pragma once
+
+#include "orbane/Tags.h"
+
+namespace Orbane {
+
+// Preference ids: tags of the document's preference list (OrbaneDoc::GetPrefs),
+// in a group of their own.
+constexpr uint32 TAGGROUP_Prefs = 0x10;
+
+enum PrefTag : Tag
+{
+    // How the polyline overlay exports splines (0: points, 1: the spline).
+    PREF_ExportSplineMode = MakeTag(TAGTYPE_Long, TAGGROUP_Prefs, 0),
+    // Whether a selection rectangle may pick points of several polylines.
+    PREF_SelectPointsFromMultiPolies = MakeTag(TAGTYPE_Long, TAGGROUP_Prefs, 1),
+};
+
+} // namespace Orbane

@@ -1,0 +1,364 @@
+#include "RecordingWatcher.h"
+#include "UndoGesture.h"
+
+#include "orbane/ClassIDs.h"
+#include "orbane/Operator.h"
+#include "orbane/OrbaneDoc.h"
+
+#include <QUndoStack>
+
+#include <gtest/gtest.h>
+
+namespace Orbane {
+namespace {
+
+class UndoTest : public testing::Test
+{
+protected:
+    void SetUp() override
+    {
+        AutoRef<Operator> rect(new Operator("Rectangle1", "Rectangle"));
+        tool = rect;
+        width = tool->AddInput("Width", "Width", CLSID_DataType_Number, {}, AutoNumber(0.5));
+        height = tool->AddInput("Height", "Height", CLSID_DataType_Number, {}, AutoNumber(0.25));
+        doc.AddTool(tool);
+        width->AttachWatcher(&watcher);
+    }
+
+    void TearDown() override { width->DetachWatcher(&watcher); }
+
+    void Write(Input *in, float64 value, float64 time = 0.0) { ASSERT_TRUE(in->SetValue(AutoNumber(value), time)); }
+
+    std::size_t ChangeCount(int step) const
+    {
+        const auto *gesture = dynamic_cast<const UndoGesture *>(doc.UndoStack()->command(step));
+        return gesture ? gesture->ChangeCount() : 0;
+    }
+
+    float64 LastSeen() const
+    {
+        const auto *n = log.empty() ? nullptr : dynamic_cast<Number *>(log.back().value.get());
+        return n ? n->Value : -1.0;
+    }
+
+    OrbaneDoc doc;
+    Operator *tool = nullptr;
+    Input *width = nullptr;
+    Input *height = nullptr;
+    std::vector<RecordingWatcher::Call> log;
+    RecordingWatcher watcher{"w", log};
+};
+
+TEST_F(UndoTest, AWriteOutsideAGestureIsAStepOfItsOwn)
+{
+    Write(width, 0.6);
+    Write(width, 0.7);
+    EXPECT_EQ(doc.UndoNames(), (QStringList{"Change Width", "Change Width"}));
+    ASSERT_TRUE(doc.Undo());
+    EXPECT_EQ(NumberAt(width, 0.0), 0.6);
+    EXPECT_EQ(LastSeen(), 0.6);
+    ASSERT_TRUE(doc.Undo());
+    EXPECT_EQ(NumberAt(width, 0.0), 0.5);
+    EXPECT_EQ(LastSeen(), 0.5);
+    EXPECT_FALSE(doc.Undo());
+    EXPECT_EQ(doc.RedoNames(), (QStringList{"Change Width", "Change Width"}));
+    ASSERT_TRUE(doc.Redo());
+    EXPECT_EQ(NumberAt(width, 0.0), 0.6);
+    EXPECT_EQ(LastSeen(), 0.6);
+}
+
+TEST_F(UndoTest, AThousandMoveDragIsOneSmallStep)
+{
+    doc.StartUndo("Drag Width");
+    for (int i = 1; i <= 1000; ++i)
+        Write(width, 0.5 + i * 0.0001);
+    EXPECT_EQ(doc.UndoStack()->count(), 0);
+    EXPECT_FALSE(doc.CanUndo());
+    ASSERT_TRUE(doc.EndUndo());
+
+    ASSERT_EQ(doc.UndoStack()->count(), 1);
+    EXPECT_EQ(doc.UndoNames(), QStringList{"Drag Width"});
+    EXPECT_EQ(ChangeCount(0), 1u);
+    EXPECT_EQ(doc.UndoStack()->command(0)->childCount(), 0);
+    const float64 end = NumberAt(width, 0.0);
+    EXPECT_DOUBLE_EQ(end, 0.6);
+
+    ASSERT_TRUE(doc.Undo());
+    EXPECT_EQ(NumberAt(width, 0.0), 0.5);
+    EXPECT_EQ(LastSeen(), 0.5);
+    ASSERT_TRUE(doc.Redo());
+    EXPECT_EQ(NumberAt(width, 0.0), end);
+    EXPECT_EQ(LastSeen(), end);
+}
+
+TEST_F(UndoTest, InterleavedWritesToTwoInputsAreOneStep)
+{
+    doc.StartUndo("Adjust Rectangle");
+    for (int i = 1; i <= 50; ++i) {
+        Write(width, 0.5 + i * 0.01);
+        Write(height, 0.25 + i * 0.01);
+    }
+    doc.EndUndo(true);
+    EXPECT_EQ(doc.UndoNames(), QStringList{"Adjust Rectangle"});
+    EXPECT_EQ(ChangeCount(0), 2u);
+    doc.Undo();
+    EXPECT_EQ(NumberAt(width, 0.0), 0.5);
+    EXPECT_EQ(NumberAt(height, 0.0), 0.25);
+    doc.Redo();
+    EXPECT_DOUBLE_EQ(NumberAt(width, 0.0), 1.0);
+    EXPECT_DOUBLE_EQ(NumberAt(height, 0.0), 0.75);
+}
+
+TEST_F(UndoTest, TwoGesturesAreTwoSteps)
+{
+    for (const char *name : {"Drag 1", "Drag 2"}) {
+        doc.StartUndo(name);
+        Write(width, NumberAt(width, 0.0) + 0.1);
+        Write(width, NumberAt(width, 0.0) + 0.1);
+        doc.EndUndo();
+    }
+    EXPECT_EQ(doc.UndoNames(), (QStringList{"Drag 1", "Drag 2"}));
+    doc.Undo();
+    EXPECT_DOUBLE_EQ(NumberAt(width, 0.0), 0.7);
+}
+
+TEST_F(UndoTest, NestedGesturesMakeOneStepNamedByTheOutermost)
+{
+    doc.StartUndo("Move Corner");
+    Write(width, 0.6);
+    doc.StartUndo("Inner");
+    EXPECT_EQ(doc.UndoDepth(), 2);
+    Write(height, 0.3);
+    EXPECT_TRUE(doc.EndUndo());
+    EXPECT_EQ(doc.UndoStack()->count(), 0);
+    Write(width, 0.65);
+    EXPECT_TRUE(doc.EndUndo());
+    EXPECT_EQ(doc.UndoDepth(), 0);
+    EXPECT_FALSE(doc.EndUndo());
+
+    EXPECT_EQ(doc.UndoNames(), QStringList{"Move Corner"});
+    doc.Undo();
+    EXPECT_EQ(NumberAt(width, 0.0), 0.5);
+    EXPECT_EQ(NumberAt(height, 0.0), 0.25);
+}
+
+TEST_F(UndoTest, AGestureThatChangesNothingLeavesNoStep)
+{
+    doc.StartUndo("Click");
+    doc.EndUndo();
+    doc.StartUndo("There And Back");
+    Write(width, 0.9);
+    Write(width, 0.5);
+    doc.EndUndo();
+    EXPECT_EQ(doc.UndoStack()->count(), 0);
+    EXPECT_FALSE(doc.CanUndo());
+}
+
+TEST_F(UndoTest, PartlyCancelledGestureKeepsOnlyWhatChanged)
+{
+    doc.StartUndo("Adjust");
+    Write(width, 0.9);
+    Write(height, 0.4);
+    Write(width, 0.5);
+    doc.EndUndo();
+    EXPECT_EQ(ChangeCount(0), 1u);
+}
+
+TEST_F(UndoTest, EndWithoutKeepRollsBackAndDrops)
+{
+    Write(height, 0.3);
+    doc.StartUndo("Cancelled Drag");
+    Write(width, 0.8);
+    Write(height, 0.35);
+    Write(width, 0.9);
+    log.clear();
+    EXPECT_TRUE(doc.EndUndo(false));
+    EXPECT_EQ(NumberAt(width, 0.0), 0.5);
+    EXPECT_EQ(NumberAt(height, 0.0), 0.3);
+    ASSERT_EQ(log.size(), 1u);
+    EXPECT_EQ(LastSeen(), 0.5);
+    EXPECT_EQ(doc.UndoNames(), QStringList{"Change Height"});
+    EXPECT_TRUE(doc.RedoNames().isEmpty());
+}
+
+TEST_F(UndoTest, InnerRollbackKeepsTheOuterWrites)
+{
+    doc.StartUndo("Outer");
+    Write(width, 0.6);
+    doc.StartUndo("Try");
+    Write(width, 0.7);
+    Write(height, 0.9);
+    doc.EndUndo(false);
+    EXPECT_EQ(NumberAt(width, 0.0), 0.6);
+    EXPECT_EQ(NumberAt(height, 0.0), 0.25);
+    doc.EndUndo(true);
+    EXPECT_EQ(doc.UndoNames(), QStringList{"Outer"});
+    EXPECT_EQ(ChangeCount(0), 1u);
+    doc.Undo();
+    EXPECT_EQ(NumberAt(width, 0.0), 0.5);
+}
+
+TEST_F(UndoTest, NoUndoFlagRecordsNothing)
+{
+    ASSERT_TRUE(width->SetValue(AutoNumber(0.8), TIME_DISCONNECT, SETVALUE_NoUndo));
+    EXPECT_EQ(NumberAt(width, 0.0), 0.8);
+    EXPECT_EQ(doc.UndoStack()->count(), 0);
+    EXPECT_EQ(LastSeen(), 0.8);
+}
+
+TEST_F(UndoTest, UndoWaitsForTheOpenGesture)
+{
+    Write(width, 0.6);
+    doc.StartUndo("Drag");
+    Write(width, 0.7);
+    EXPECT_FALSE(doc.Undo());
+    EXPECT_EQ(NumberAt(width, 0.0), 0.7);
+    doc.EndUndo();
+    EXPECT_TRUE(doc.Undo());
+    EXPECT_EQ(NumberAt(width, 0.0), 0.6);
+}
+
+TEST_F(UndoTest, KeyframesComeBackExactly)
+{
+    width->SetAnimated(true); // key at 0 holding 0.5
+    Write(width, 1.0, 10.0);
+    doc.StartUndo("Drag");
+    Write(width, 0.75, 10.0);  // changes a key
+    Write(width, 0.25, 20.0);  // adds a key
+    Write(width, 0.125, 20.0); // and moves it again
+    doc.EndUndo();
+    EXPECT_EQ(width->KeyTimes(), (std::vector<float64>{0.0, 10.0, 20.0}));
+    EXPECT_EQ(ChangeCount(1), 2u);
+
+    doc.Undo();
+    EXPECT_EQ(width->KeyTimes(), (std::vector<float64>{0.0, 10.0}));
+    EXPECT_EQ(NumberAt(width, 10.0), 1.0);
+    doc.Undo();
+    EXPECT_EQ(width->KeyTimes(), std::vector<float64>{0.0});
+    doc.Redo();
+    doc.Redo();
+    EXPECT_EQ(width->KeyTimes(), (std::vector<float64>{0.0, 10.0, 20.0}));
+    EXPECT_EQ(NumberAt(width, 10.0), 0.75);
+    EXPECT_EQ(NumberAt(width, 20.0), 0.125);
+}
+
+TEST_F(UndoTest, UndoTellsWatchersTheValueAtTheCurrentTime)
+{
+    width->SetAnimated(true);
+    Write(width, 1.0, 10.0);
+    doc.SetCurrentTime(5.0);
+    Write(width, 2.0, 10.0);
+    EXPECT_EQ(LastSeen(), 1.25);
+    doc.Undo();
+    EXPECT_EQ(LastSeen(), 0.75);
+}
+
+TEST_F(UndoTest, WatcherWritingInReplyDuringUndoIsNotRecorded)
+{
+    // A control that keeps Height at twice Width, as linked controls do.
+    watcher.OnCall = [&](Input *, Parameter *value) {
+        height->SetValue(AutoNumber(dynamic_cast<Number *>(value)->Value * 2.0), 0.0);
+    };
+    Write(width, 0.6);
+    EXPECT_EQ(doc.UndoNames(), (QStringList{"Change Width", "Change Height"}));
+    doc.Undo(); // Height back to 0.25
+    doc.Undo(); // Width back to 0.5; the watcher's reply is stored, not recorded
+    EXPECT_TRUE(doc.UndoNames().isEmpty());
+    EXPECT_EQ(doc.RedoNames(), (QStringList{"Change Width", "Change Height"}));
+    EXPECT_EQ(NumberAt(width, 0.0), 0.5);
+    EXPECT_EQ(NumberAt(height, 0.0), 1.0);
+    doc.Redo();
+    doc.Redo();
+    EXPECT_EQ(NumberAt(width, 0.0), 0.6);
+    EXPECT_EQ(NumberAt(height, 0.0), 1.2);
+    EXPECT_EQ(doc.UndoStack()->count(), 2);
+    watcher.OnCall = nullptr;
+}
+
+TEST_F(UndoTest, StepsOutliveTheirTool)
+{
+    Write(width, 0.6);
+    doc.StartUndo("Left Open");
+    Write(width, 0.7);
+    width->DetachWatcher(&watcher);
+    AutoRef<Input> keep = AutoRef<Input>::Share(width);
+    doc.RemoveTool(tool);
+    EXPECT_EQ(keep->GetOperator(), nullptr);
+    EXPECT_TRUE(doc.EndUndo());
+    EXPECT_TRUE(doc.Undo());
+    EXPECT_EQ(NumberAt(keep, 0.0), 0.6);
+    width->AttachWatcher(&watcher);
+}
+
+struct KindCase
+{
+    const char *name;
+    OrbID type;
+    std::function<Parameter *()> before;
+    std::function<Parameter *()> after;
+};
+
+class UndoKindTest : public testing::TestWithParam<KindCase>
+{
+};
+
+TEST_P(UndoKindTest, UndoAndRedoRestoreExactValues)
+{
+    const KindCase &c = GetParam();
+    OrbaneDoc doc;
+    AutoRef<Operator> tool(new Operator("Tool1", "Tool"));
+    AutoParameter before(c.before()), after(c.after());
+    Input *in = tool->AddInput("Value", "Value", c.type, {}, before);
+    doc.AddTool(tool);
+
+    doc.StartUndo("Edit");
+    ASSERT_TRUE(in->SetValue(after, 0.0));
+    doc.EndUndo();
+    EXPECT_TRUE(AutoParameter(in, 0.0)->Equals(*after));
+    doc.Undo();
+    EXPECT_TRUE(AutoParameter(in, 0.0)->Equals(*before));
+    doc.Redo();
+    EXPECT_TRUE(AutoParameter(in, 0.0)->Equals(*after));
+}
+
+ScriptVal Pair(float64 a, float64 b)
+{
+    ScriptVal t = ScriptVal::NewTable();
+    t.Append(ScriptVal(a));
+    t.Append(ScriptVal(b));
+    return t;
+}
+
+INSTANTIATE_TEST_SUITE_P(Kinds, UndoKindTest,
+                         testing::Values(KindCase{"Number", CLSID_DataType_Number, [] { return new Number(0.1); },
+                                                  [] { return new Number(0.2); }},
+                                         KindCase{"Point", CLSID_DataType_Point, [] { return new Point(0.1, 0.2); },
+                                                  [] { return new Point(0.3, 0.4, 1.0); }},
+                                         KindCase{"Text", CLSID_DataType_Text, [] { return new Text("before"); },
+                                                  [] { return new Text("after"); }},
+                                         KindCase{"ID", CLSID_DataType_ID, [] { return new OrbIDParam("Linear"); },
+                                                  [] { return new OrbIDParam("Smooth"); }},
+                                         KindCase{"ScriptVal", CLSID_DataType_ScriptVal,
+                                                  [] { return new ScriptValParam(Pair(1, 2)); },
+                                                  [] { return new ScriptValParam(Pair(1, 3)); }}),
+                         [](const auto &info) { return std::string(info.param.name); });
+
+TEST(UndoLifetimeTest, DocumentGoesWithAnOpenGestureAndSteps)
+{
+    AutoRef<Operator> tool(new Operator("Tool1", "Tool"));
+    Input *in = tool->AddInput("Value", "Value", CLSID_DataType_Number, {}, AutoNumber(0.0));
+    {
+        OrbaneDoc doc;
+        doc.AddTool(tool);
+        in->SetValue(AutoNumber(1.0), 0.0);
+        doc.StartUndo("Open");
+        in->SetValue(AutoNumber(2.0), 0.0);
+    }
+    EXPECT_EQ(tool->GetDoc(), nullptr);
+    EXPECT_EQ(tool->RefCount(), 1);
+    EXPECT_EQ(in->RefCount(), 1);
+    EXPECT_EQ(AutoNumber(in, 0.0)->Value, 2.0);
+}
+
+} // namespace
+} // namespace Orbane
