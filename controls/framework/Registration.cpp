@@ -1,0 +1,189 @@
+// Registers every control class of the library with the host when the library
+// is loaded: one line per class ID, in this order. ControlDesc gives the
+// family defaults; each line says only where a class departs from them.
+// Classes whose script tag names are not published yet register without a tag
+// map, but keep their tag-mapping hook (which then maps by an empty table), so
+// adding the table later is a one-word change here.
+
+#include "framework/AngleTags.h"
+#include "framework/ButtonTags.h"
+#include "framework/CheckBoxTags.h"
+#include "framework/ComboTags.h"
+#include "framework/ControlClasses.h"
+#include "framework/ControlRegistration.h"
+#include "framework/CrosshairTags.h"
+#include "framework/FFICasts.h"
+#include "framework/ListTags.h"
+#include "framework/PointTags.h"
+#include "framework/PolyLineTags.h"
+#include "framework/RectangleTags.h"
+#include "framework/SliderTags.h"
+#include "framework/VariantRegistration.h"
+
+#include "orbane/ClassIDs.h"
+#include "orbane/OverlayControl.h"
+
+namespace Orbane {
+
+namespace {
+
+// The base of the camera and light controls, pointed at by their registries
+// for as long as they live. Made on first use, so it exists whatever the order
+// in which the library's statics are made.
+const OrbID &TransformControlID()
+{
+    static const OrbID id("TransformControl");
+    return id;
+}
+
+using D = ControlDesc;
+
+// The family tag is a pointer tag: the text travels by address.
+const void *const kOverlayFamily = "OverlayControl";
+
+// Primaries of the ID variants, described once for both registrations.
+ControlDesc ComboDesc()
+{
+    return D::Input("ComboControl", CLSID_InputControl_Combo).Tags<ComboControlTags>();
+}
+
+ControlDesc LabelDesc()
+{
+    return D::Input("LabelControl", CLSID_InputControl_Label);
+}
+
+// ListControl shares its tag names with ScriptValListControl.
+ControlDesc ListDesc()
+{
+    return D::Input("ListControl", CLSID_InputControl_List).Tags<ListControlTags>();
+}
+
+ControlDesc MultiButtonDesc()
+{
+    return D::Input("MultiButtonControl", CLSID_InputControl_MultiButton);
+}
+
+ControlRegistration<AngleControl> gAngle{
+    D::Preview("AngleControl").Tags<AngleControlTags>().Cleanup(&AngleControl::RegCleanup)};
+ControlRegistration<ButtonControl> gButton{D::Input("ButtonControl").Tags<ButtonControlTags>()};
+ControlRegistration<CameraControl, TransformControl> gCamera{D::Preview("CameraControl")
+                                                                 .Base(TransformControlID(), "TransformControl")
+                                                                 .Flag(REG_PreviewFlag64)
+                                                                 .Flag(REG_PreviewFlag65)};
+ControlRegistration<CheckBoxControl> gCheckBox{
+    D::Input("CheckBoxControl", CLSID_InputControl_Checkbox).Script("CheckboxControl").Tags<CheckBoxControlTags>()};
+ControlRegistration<CheckListControl> gCheckList{D::Input("CheckListControl")};
+ControlRegistration<ClipControl> gClip{D::Input("ClipControl")};
+ControlRegistration<ColorControl> gColor{D::Input("ColorControl")};
+ControlRegistration<ColorGamutControl> gColorGamut{D::Input("ColorGamutControl")};
+ControlRegistration<ColorRangesControl> gColorRanges{D::Input("ColorRangesControl")};
+ControlRegistration<ColorSuppressionControl> gColorSuppression{D::Input("ColorSuppressionControl")};
+ControlRegistration<ColorWheelControl> gColorWheel{D::Input("ColorWheelControl")};
+ControlRegistration<ComboControl> gCombo{ComboDesc()};
+VariantRegistration<ComboControl> gComboID{ComboDesc().Variant(CLSID_InputControl_ComboID, "ComboIDControl")};
+ControlRegistration<CropControl> gCrop{D::Preview("CropControl", CLSID_PreviewControl_Crop).NoScript().NoHook()};
+ControlRegistration<CrosshairControl> gCrosshair{D::Preview("CrosshairControl").Tags<CrosshairControlTags>()};
+ControlRegistration<CustomFilterControl> gCustomFilter{D::Input("CustomFilterControl")};
+ControlRegistration<EllipseControl> gEllipse{D::Preview("EllipseControl").Cleanup(&EllipseControl::RegCleanup)};
+ControlRegistration<FileControl> gFile{D::Input("FileControl")};
+ControlRegistration<FontfileControl> gFontfile{
+    D::Input("FontfileControl", "FontFileControl").Script("FontFileControl").Cleanup(&FontfileControl::RegCleanup)};
+ControlRegistration<GammaControl> gGamma{D::Input("GammaControl")};
+ControlRegistration<GradientControl> gGradient{D::Input("GradientControl")};
+ControlRegistration<HistogramControl> gHistogram{D::Input("HistogramControl")};
+ControlRegistration<ImageControl> gImage{D::Input("ImageControl")};
+ControlRegistration<ImgOverlayControl> gImgOverlay{
+    D::Preview("ImgOverlayControl").Script("ImageOverlayControl").Flag(REG_PreviewFlag64)};
+ControlRegistration<LabelControl> gLabel{LabelDesc()};
+VariantRegistration<LabelControl> gLabelNest{LabelDesc().Variant(CLSID_InputControl_Nest)};
+VariantRegistration<LabelControl> gLabelSeparator{LabelDesc().Variant(CLSID_InputControl_Separator)};
+VariantRegistration<LabelControl> gLabelSpacer{LabelDesc().Variant(CLSID_InputControl_Spacer)};
+ControlRegistration<LevelsControl> gLevels{D::Input("LevelsControl")};
+ControlRegistration<LevelsOutputControl> gLevelsOutput{D::Input("LevelsOutputControl")};
+ControlRegistration<LightControl, TransformControl> gLight{
+    D::Preview("LightControl").Base(TransformControlID(), "TransformControl").Flag(REG_PreviewFlag65)};
+ControlRegistration<ListControl> gList{ListDesc()};
+VariantRegistration<ListControl> gListID{ListDesc().Variant(CLSID_InputControl_ListID, "ListIDControl")};
+ControlRegistration<LogControl> gLog{D::Input("LogControl")};
+ControlRegistration<MeshControl> gMesh{D::Preview("MeshControl").Flag(REG_PreviewFlag64)};
+ControlRegistration<MultiButtonControl> gMultiButton{MultiButtonDesc()};
+VariantRegistration<MultiButtonControl> gMultiButtonID{
+    MultiButtonDesc().Variant(CLSID_InputControl_MultiButtonID, "MultiButtonIDControl")};
+ControlRegistration<ObloidControl> gObloid{D::Preview("ObloidControl", "CubeControl")};
+ControlRegistration<OffsetControl> gOffset{D::Input("OffsetControl")};
+ControlRegistration<PatternControl> gPattern{D::Input("PatternControl")};
+ControlRegistration<PointControl> gPoint{D::Preview("PointControl").Tags<PointControlTags>()};
+ControlRegistration<PolyLineControl> gPolyLine{
+    D::Preview("PolyLineControl", "PolylineControl").Script("PolylineControl").Tags<PolyLineControlTags>()};
+ControlRegistration<PositionerControl> gPositioner{D::Preview("PositionerControl")};
+ControlRegistration<RangeControl> gRange{D::Input("RangeControl")};
+ControlRegistration<RectangleControl> gRectangle{D::Preview("RectangleControl").Tags<RectangleControlTags>()};
+ControlRegistration<ScrewControl> gScrew{D::Input("ScrewControl")};
+ControlRegistration<ScriptValListControl> gScriptValList{D::Input("ScriptValListControl").Tags<ListControlTags>()};
+ControlRegistration<SliderControl> gSlider{
+    D::Input("SliderControl", CLSID_InputControl_Slider).Tags<SliderControlTags>()};
+ControlRegistration<SliderOverlay, OverlayControl> gSliderOverlay{D::Preview("SliderOverlay")
+                                                                      .Base(OverlayControl::ClassID)
+                                                                      .NoScript()
+                                                                      .NoHook()
+                                                                      .Flag(REG_PreviewFlag64)
+                                                                      .Flag(REG_ClassFamily, kOverlayFamily)};
+ControlRegistration<SplineControl> gSpline{D::Input("SplineControl")
+                                               .Cleanup(&SplineControl::RegCleanup)
+                                               .Flag(REG_SplineFlag)
+                                               .Flag(REG_DisplayName, "Spline Control")
+                                               .Flag(REG_MenuPath, "Controls\\Spline")};
+// The tracker is an overlay whose map carries the inspector's name; kept so.
+ControlRegistration<TrackerControl> gTracker{D::Preview("TrackerControl").MapName("InputControl.Create")};
+ControlRegistration<TransformControl> gTransform{D::Preview("TransformControl").Flag(REG_PreviewFlag65)};
+ControlRegistration<XYOffsetControl> gXYOffset{D::Preview("XYOffsetControl")};
+
+} // namespace
+
+} // namespace Orbane
+
+ORBANE_FFI_CASTS(AngleControl)
+ORBANE_FFI_CASTS(ButtonControl)
+ORBANE_FFI_CASTS(CameraControl)
+ORBANE_FFI_CASTS(CheckBoxControl)
+ORBANE_FFI_CASTS(CheckListControl)
+ORBANE_FFI_CASTS(ClipControl)
+ORBANE_FFI_CASTS(ColorControl)
+ORBANE_FFI_CASTS(ColorGamutControl)
+ORBANE_FFI_CASTS(ColorRangesControl)
+ORBANE_FFI_CASTS(ColorSuppressionControl)
+ORBANE_FFI_CASTS(ColorWheelControl)
+ORBANE_FFI_CASTS(ComboControl)
+ORBANE_FFI_CASTS(CrosshairControl)
+ORBANE_FFI_CASTS(CustomFilterControl)
+ORBANE_FFI_CASTS(EllipseControl)
+ORBANE_FFI_CASTS(FileControl)
+ORBANE_FFI_CASTS(FontfileControl)
+ORBANE_FFI_CASTS(GammaControl)
+ORBANE_FFI_CASTS(GradientControl)
+ORBANE_FFI_CASTS(HistogramControl)
+ORBANE_FFI_CASTS(ImageControl)
+ORBANE_FFI_CASTS(ImgOverlayControl)
+ORBANE_FFI_CASTS(LabelControl)
+ORBANE_FFI_CASTS(LevelsControl)
+ORBANE_FFI_CASTS(LevelsOutputControl)
+ORBANE_FFI_CASTS(LightControl)
+ORBANE_FFI_CASTS(ListControl)
+ORBANE_FFI_CASTS(LogControl)
+ORBANE_FFI_CASTS(MeshControl)
+ORBANE_FFI_CASTS(MultiButtonControl)
+ORBANE_FFI_CASTS(ObloidControl)
+ORBANE_FFI_CASTS(OffsetControl)
+ORBANE_FFI_CASTS(PatternControl)
+ORBANE_FFI_CASTS(PointControl)
+ORBANE_FFI_CASTS(PolyLineControl)
+ORBANE_FFI_CASTS(PositionerControl)
+ORBANE_FFI_CASTS(RangeControl)
+ORBANE_FFI_CASTS(RectangleControl)
+ORBANE_FFI_CASTS(ScrewControl)
+ORBANE_FFI_CASTS(ScriptValListControl)
+ORBANE_FFI_CASTS(SliderControl)
+ORBANE_FFI_CASTS(SplineControl)
+ORBANE_FFI_CASTS(TrackerControl)
+ORBANE_FFI_CASTS(TransformControl)
+ORBANE_FFI_CASTS(XYOffsetControl)
