@@ -201,7 +201,12 @@ bool ObjectItem(const TagMapEntry &row, const ScriptVal &v, TagList &out, std::s
 {
     const auto *want = static_cast<const char *>(row.extra);
     if (v.IsObject() && (!want || ObjectIsA(v.GetObject(), want))) {
-        out.Add(Tag(row.tag), v.GetObject());
+        // A pointer-typed row (an overlay's Input given by a script) carries
+        // the object's address; the object's owner keeps it alive.
+        if (TagTypeOf(Tag(row.tag)) == TAGTYPE_Ptr)
+            out.Add(Tag(row.tag), static_cast<void *>(v.GetObject()));
+        else
+            out.Add(Tag(row.tag), v.GetObject());
         return true;
     }
     const std::string type = want ? std::string("an object of type ") + want : "an object";
@@ -353,6 +358,8 @@ ScriptVal RowValue(const TagMapEntry &row, const TagItem &item)
     case TMK_Color:
         return isLong ? ColourTable(item.l) : ScriptVal();
     case TMK_Object:
+        if (item.kind == TagKind::Ptr)
+            return ScriptVal(static_cast<ScriptObject *>(item.ptr));
         return item.kind == TagKind::Object ? ScriptVal(item.obj) : ScriptVal();
     }
     return TagItemValue(item);

@@ -253,7 +253,7 @@ TEST_F(LuaTest, ClassesListsEveryRegistrationInOrder)
             g.Name, g.ScriptType, g.BaseClassID, g.Tags,
             w.index < v.index and v.index < g.index,
         })"),
-              "TestWidget; ScriptWidget; TestRoot; 9; TestWidget; WidgetIDControl; WidgetControl; 9; "
+              "TestWidget; ScriptWidget; TestRoot; 10; TestWidget; WidgetIDControl; WidgetControl; 10; "
               "TestGadget; GadgetControl; WidgetControl; 0; true");
     EXPECT_EQ(Eval("result = #orbane.Classes()"), std::to_string(ClassRegistry.All().size()));
 }

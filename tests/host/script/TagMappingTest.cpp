@@ -220,6 +220,24 @@ TEST(TagMapping, ObjectsMustBeOfTheRowsTypeOrDeriveFromIt)
     EXPECT_EQ(deaths, 3);
 }
 
+// An object row on a pointer tag carries the address (the way overlays take
+// their linked Inputs) and gives the same object back.
+TEST(TagMapping, ObjectOnAPointerTagTravelsAsItsAddress)
+{
+    int deaths = 0;
+    auto *widget = new Counted(&deaths, "ScriptWidget");
+    TagList tags;
+    EXPECT_TRUE(IntoTags(Table({{"WGT_Link", widget}}), tags));
+    EXPECT_EQ(tags.GetPtr(WGT_Link), static_cast<void *>(widget));
+    EXPECT_EQ(widget->RefCount(), 1) << "a pointer holds no reference";
+    ScriptVal attrs;
+    ASSERT_TRUE(scriptval_maptags(WidgetTags, MAP_FromTags, attrs, tags));
+    EXPECT_EQ(attrs.FindKeyConst("WGT_Link")->GetObject(), widget);
+    attrs = ScriptVal();
+    widget->DecRef();
+    EXPECT_EQ(deaths, 1);
+}
+
 // What a script sets comes back the same way from GetAttrs.
 TEST(TagMapping, RoundTripsEveryKind)
 {

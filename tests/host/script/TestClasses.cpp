@@ -34,6 +34,7 @@ const TagMapEntry WidgetTags[] = {
     {"WGT_Partner", WGT_Partner, TMK_Object, "ScriptWidget", nullptr},
     {"WGT_Color", WGT_Color, TMK_Color, nullptr, nullptr},
     {"WGT_AddItem", WGT_AddItem, TMK_Plain, nullptr, nullptr},
+    {"WGT_Link", WGT_Link, TMK_Object, "ScriptWidget", nullptr},
     {nullptr, 0, 0, nullptr, nullptr},
 };
 

@@ -26,10 +26,11 @@ enum WidgetTag : Tag
     WGT_Partner = 0x40050006,  // object of script type "ScriptWidget"
     WGT_Color = 0x10050007,    // colour
     WGT_AddItem = 0x38050008,  // repeatable text
+    WGT_Link = 0x60050009,     // object of script type "ScriptWidget" carried as a pointer
 };
 
 extern const TagMapEntry WidgetTags[];
-constexpr int kWidgetTagCount = 9;
+constexpr int kWidgetTagCount = 10;
 
 // Registered the way the control library registers a control: class ID
 // "WidgetControl", registry and native name "TestWidget", script type
