@@ -1,25 +1,75 @@
 #include "CommandLine.h"
 #include "ControlLister.h"
 #include "ControlModule.h"
+#include "MainWindow.h"
 #include "ScriptRunner.h"
+#include "UiScripting.h"
+
+#include "orbane/LuaRuntime.h"
+#include "orbane/OrbaneDoc.h"
+#include "orbane/Theme.h"
+#include "orbane/ToolLoader.h"
 
 #include <QApplication>
+#include <QDir>
 #include <QTextStream>
 
 using namespace Orbane;
 
 namespace {
 
+bool NoDisplay()
+{
+    return qEnvironmentVariableIsEmpty("DISPLAY") && qEnvironmentVariableIsEmpty("WAYLAND_DISPLAY");
+}
+
 // With no display, or when asked, Qt draws off screen: scripts and
 // screenshots work the same on a build machine as on a desk.
 void ChooseOffscreen(int argc, char **argv)
 {
-    const bool noDisplay = qEnvironmentVariableIsEmpty("DISPLAY") && qEnvironmentVariableIsEmpty("WAYLAND_DISPLAY");
     bool asked = false;
     for (int i = 1; i < argc; ++i)
         asked |= QByteArray(argv[i]) == "--headless" || QByteArray(argv[i]) == "--list-controls";
-    if ((noDisplay || asked) && qEnvironmentVariableIsEmpty("QT_QPA_PLATFORM"))
+    if ((NoDisplay() || asked) && qEnvironmentVariableIsEmpty("QT_QPA_PLATFORM"))
         qputenv("QT_QPA_PLATFORM", "offscreen");
+}
+
+// Headless runs of a comp write what a person would have seen.
+int WriteScreenshots(MainWindow &window, const QString &dir, QTextStream &out)
+{
+    QDir().mkpath(dir);
+    const std::pair<const char *, QWidget *> shots[] = {
+        {"window", &window}, {"inspector", window.Inspector()}, {"viewer", window.Viewer()}};
+    for (const auto &[name, widget] : shots) {
+        const QString path = QDir(dir).absoluteFilePath(QString("%1.png").arg(name));
+        if (!widget->grab().save(path))
+            return 1;
+        out << path << "\n";
+    }
+    return 0;
+}
+
+int RunWindow(const CommandLine &cl, QApplication &app, QTextStream &out, QTextStream &err)
+{
+    OrbaneDoc doc;
+    MainWindow window(&doc);
+    UiScripting::Install(&doc, &window);
+    window.show();
+    std::string why;
+    if (!cl.comp.isEmpty() && !ToolLoader::LoadComp(doc, cl.comp.toStdString(), &why)) {
+        err << "orbane: " << QString::fromStdString(why) << "\n";
+        return 1;
+    }
+    int status = 0;
+    if (!cl.script.isEmpty())
+        status = ScriptRunner::Run(cl.script, err);
+    else if (cl.headless || NoDisplay())
+        status = WriteScreenshots(window, cl.shotDir.isEmpty() ? "screenshots" : cl.shotDir, out);
+    else
+        status = app.exec();
+    // Objects that scripts still hold are released while the window lives.
+    LuaRuntime::Instance().Reset();
+    return status;
 }
 
 } // namespace
@@ -29,6 +79,7 @@ int main(int argc, char **argv)
     ChooseOffscreen(argc, argv);
     QApplication app(argc, argv);
     QApplication::setApplicationName("orbane");
+    Theme::Apply(app);
     QTextStream out(stdout), err(stderr);
 
     CommandLine cl = CommandLine::Parse(QApplication::arguments());
@@ -43,8 +94,9 @@ int main(int argc, char **argv)
     }
     if (cl.listControls)
         return ControlLister::Print(out);
-    if (!cl.script.isEmpty())
-        return ScriptRunner::Run(cl.script, err);
-    err << "orbane: nothing to do yet without --script or --list-controls\n";
-    return 2;
+    if (cl.comp.isEmpty() && cl.script.isEmpty()) {
+        err << CommandLine::Usage();
+        return 2;
+    }
+    return RunWindow(cl, app, out, err);
 }

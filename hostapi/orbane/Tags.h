@@ -68,6 +68,8 @@ constexpr int32 REGKIND_PreviewControl = 0x1B0000;
 enum InputTag : Tag
 {
     INPA_Name = 0x30020014,          // the Input's display name
+    INPA_InputControl = 0x88020010,  // class ID of an inspector control that shows the Input (repeatable)
+    INPA_PreviewControl = 0x88020011, // class ID of a viewer overlay that edits the Input (repeatable)
     INPA_LayoutHeight = 0x10020007,  // a layout object's height
     INPA_IDItem = 0x88030000,        // add an item by identifier (repeatable)
     LINKS_Name = 0x30040000,         // label text

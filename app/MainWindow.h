@@ -1,0 +1,48 @@
+#pragma once
+
+#include "orbane/InspectorPanel.h"
+#include "orbane/ViewerPanel.h"
+
+#include <QMainWindow>
+
+class QComboBox;
+class QSlider;
+
+namespace Orbane {
+
+class Operator;
+class OrbaneDoc;
+
+// The application window: the viewer in the middle, the inspector of the
+// chosen tool on the right, a time slider below, undo and redo above.
+class MainWindow : public QMainWindow
+{
+    Q_OBJECT
+public:
+    explicit MainWindow(OrbaneDoc *doc, QWidget *parent = nullptr);
+    ~MainWindow() override;
+
+    InspectorPanel *Inspector() const { return mInspector; }
+    ViewerPanel *Viewer() const { return mViewer; }
+    // Shows the named tool's controls and overlays; false where there is no such tool.
+    bool ShowTool(const QString &name);
+
+private slots:
+    void OnToolAdded(Orbane::Operator *tool);
+    void OnToolRemoving(Orbane::Operator *tool);
+    void OnToolChosen(int index);
+    void OnTimeChanged(double time);
+
+private:
+    QWidget *BuildInspectorDock();
+    void BuildToolBar();
+    QSlider *BuildTimeSlider();
+
+    OrbaneDoc *mDoc;
+    InspectorPanel *mInspector = nullptr;
+    ViewerPanel *mViewer = nullptr;
+    QComboBox *mToolChooser = nullptr;
+    QSlider *mTimeSlider = nullptr;
+};
+
+} // namespace Orbane

@@ -1,0 +1,356 @@
+#include "UiScripting.h"
+
+#include "MainWindow.h"
+#include "UiTarget.h"
+#include "ViewerScripting.h"
+
+#include "orbane/AutoParam.h"
+#include "orbane/CustomButton.h"
+#include "orbane/Input.h"
+#include "orbane/InputControl.h"
+#include "orbane/LuaRuntime.h"
+#include "orbane/Operator.h"
+#include "orbane/OrbaneDoc.h"
+#include "orbane/ParameterScript.h"
+#include "orbane/ScriptError.h"
+#include "orbane/ScriptVal.h"
+#include "orbane/ToolLoader.h"
+
+#include <QApplication>
+#include <QClipboard>
+#include <QComboBox>
+#include <QKeySequence>
+#include <QLabel>
+#include <QLineEdit>
+#include <QMouseEvent>
+#include <QTest>
+#include <QUndoStack>
+
+namespace Orbane {
+
+namespace {
+
+OrbaneDoc *gDoc = nullptr;
+MainWindow *gWindow = nullptr;
+
+// Raises a Lua error with the script's file and line.
+int Raise(lua_State *L, const QString &message)
+{
+    luaL_where(L, 1);
+    lua_pushstring(L, message.toUtf8().constData());
+    lua_concat(L, 2);
+    return lua_error(L);
+}
+
+QWidget *TargetOrRaise(lua_State *L, int idx, InputControl **control = nullptr)
+{
+    UiTarget t = UiTarget::Resolve(L, idx, gWindow);
+    if (!t.widget)
+        Raise(L, t.error);
+    if (control)
+        *control = t.control;
+    return t.widget;
+}
+
+Input *InputOrRaise(lua_State *L)
+{
+    Operator *tool = gDoc->FindTool(luaL_checkstring(L, 1));
+    if (!tool)
+        Raise(L, QString("no tool \"%1\"").arg(lua_tostring(L, 1)));
+    Input *input = tool->FindInput(OrbID(luaL_checkstring(L, 2)));
+    if (!input)
+        Raise(L, QString("tool \"%1\" has no Input \"%2\"").arg(lua_tostring(L, 1), lua_tostring(L, 2)));
+    return input;
+}
+
+float64 TimeArg(lua_State *L, int idx)
+{
+    return lua_isnumber(L, idx) ? lua_tonumber(L, idx) : gDoc->GetCurrentTime();
+}
+
+void PushNames(lua_State *L, const QStringList &names)
+{
+    lua_createtable(L, names.size(), 0);
+    for (int i = 0; i < names.size(); ++i) {
+        lua_pushstring(L, names[i].toUtf8().constData());
+        lua_rawseti(L, -2, i + 1);
+    }
+}
+
+// --- document ---
+
+int LoadComp(lua_State *L)
+{
+    std::string why;
+    if (!ToolLoader::LoadComp(*gDoc, luaL_checkstring(L, 1), &why))
+        return Raise(L, QString::fromStdString(why));
+    if (!gDoc->Tools().empty())
+        gWindow->ShowTool(QString::fromUtf8(gDoc->Tools().front()->GetName()));
+    return 0;
+}
+
+int LoadTool(lua_State *L)
+{
+    std::string why;
+    AutoRef<Operator> tool(ToolLoader::LoadTool(luaL_checkstring(L, 1), luaL_checkstring(L, 2), &why));
+    if (!tool)
+        return Raise(L, QString::fromStdString(why));
+    if (!gDoc->AddTool(tool.get()))
+        return Raise(L, QString("a tool named \"%1\" exists already").arg(lua_tostring(L, 2)));
+    return 0;
+}
+
+int Tools(lua_State *L)
+{
+    QStringList names;
+    for (Operator *tool : gDoc->Tools())
+        names << QString::fromUtf8(tool->GetName());
+    PushNames(L, names);
+    return 1;
+}
+
+int ShowTool(lua_State *L)
+{
+    if (!gWindow->ShowTool(QString::fromUtf8(luaL_checkstring(L, 1))))
+        return Raise(L, QString("no tool \"%1\"").arg(lua_tostring(L, 1)));
+    return 0;
+}
+
+int GetValue(lua_State *L)
+{
+    Input *input = InputOrRaise(L);
+    AutoParameter value(input->GetValue(TimeArg(L, 3)));
+    LuaRuntime::Push(L, ParameterScript::ToScript(value.get()));
+    return 1;
+}
+
+// A script's write: one undo step, like any other edit.
+int SetValue(lua_State *L)
+{
+    Input *input = InputOrRaise(L);
+    std::string why;
+    AutoParameter value(ParameterScript::FromScript(input->GetDataType(), LuaRuntime::ToScriptVal(L, 3), &why));
+    if (!value)
+        return Raise(L, QString("Input \"%1\": %2").arg(input->GetName(), QString::fromStdString(why)));
+    if (!input->SetValue(value.get(), TimeArg(L, 4), 0, nullptr) && HasScriptError())
+        return Raise(L, QString::fromStdString(TakeScriptError()));
+    return 0;
+}
+
+int GetTime(lua_State *L)
+{
+    lua_pushnumber(L, gDoc->GetCurrentTime());
+    return 1;
+}
+
+int SetTime(lua_State *L)
+{
+    gDoc->SetCurrentTime(luaL_checknumber(L, 1));
+    return 0;
+}
+
+int Undo(lua_State *L)
+{
+    lua_pushboolean(L, gDoc->Undo());
+    return 1;
+}
+
+int Redo(lua_State *L)
+{
+    lua_pushboolean(L, gDoc->Redo());
+    return 1;
+}
+
+int UndoNames(lua_State *L)
+{
+    PushNames(L, gDoc->UndoNames());
+    return 1;
+}
+
+int RedoNames(lua_State *L)
+{
+    PushNames(L, gDoc->RedoNames());
+    return 1;
+}
+
+// The control object itself, for ffi casts and attributes.
+int Control(lua_State *L)
+{
+    InputControl *control = nullptr;
+    TargetOrRaise(L, 1, &control);
+    LuaRuntime::PushObject(L, control);
+    return 1;
+}
+
+// --- a person's hands ---
+
+void SendMouse(QWidget *w, QEvent::Type type, QPoint pos, Qt::MouseButton button, Qt::MouseButtons held,
+               Qt::KeyboardModifiers mods)
+{
+    QMouseEvent event(type, pos, w->mapToGlobal(pos), button, held, mods);
+    QApplication::sendEvent(w, &event);
+}
+
+int Press(lua_State *L)
+{
+    QWidget *w = TargetOrRaise(L, 1);
+    const UiGesture g = UiGesture::Read(L, 2);
+    SendMouse(w, QEvent::MouseButtonPress, g.At(w), g.button, g.button, g.mods);
+    return 0;
+}
+
+int Release(lua_State *L)
+{
+    QWidget *w = TargetOrRaise(L, 1);
+    const UiGesture g = UiGesture::Read(L, 2);
+    SendMouse(w, QEvent::MouseButtonRelease, g.At(w), g.button, Qt::NoButton, g.mods);
+    return 0;
+}
+
+// A move with the button held (a drag step), or a hover with button = "none".
+int Move(lua_State *L)
+{
+    QWidget *w = TargetOrRaise(L, 1);
+    const UiGesture g = UiGesture::Read(L, 2);
+    lua_getfield(L, 2, "button");
+    const bool hover = lua_isstring(L, -1) && QByteArray(lua_tostring(L, -1)) == "none";
+    lua_pop(L, 1);
+    SendMouse(w, QEvent::MouseMove, g.At(w), Qt::NoButton, hover ? Qt::NoButton : g.button, g.mods);
+    return 0;
+}
+
+int Click(lua_State *L)
+{
+    QWidget *w = TargetOrRaise(L, 1);
+    const UiGesture g = UiGesture::Read(L, 2);
+    QTest::mouseClick(w, g.button, g.mods, g.At(w));
+    return 0;
+}
+
+// Drag(target, {x =, y =}, {x =, y =}, {mods =, steps =}): press, moves in
+// steps, release; one gesture.
+int Drag(lua_State *L)
+{
+    QWidget *w = TargetOrRaise(L, 1);
+    const UiGesture from = UiGesture::Read(L, 2), to = UiGesture::Read(L, 3), opts = UiGesture::Read(L, 4);
+    lua_getfield(L, 4, "steps");
+    const int steps = lua_isnumber(L, -1) ? qMax(1, int(lua_tointeger(L, -1))) : 10;
+    lua_pop(L, 1);
+    const QPoint a = from.At(w), b = to.At(w);
+    SendMouse(w, QEvent::MouseButtonPress, a, opts.button, opts.button, opts.mods);
+    for (int i = 1; i <= steps; ++i)
+        SendMouse(w, QEvent::MouseMove, a + (b - a) * i / steps, Qt::NoButton, opts.button, opts.mods);
+    SendMouse(w, QEvent::MouseButtonRelease, b, opts.button, Qt::NoButton, opts.mods);
+    return 0;
+}
+
+int KeyCode(lua_State *L, int idx)
+{
+    if (lua_isnumber(L, idx))
+        return int(lua_tointeger(L, idx));
+    const QKeySequence seq = QKeySequence::fromString(QString::fromUtf8(luaL_checkstring(L, idx)));
+    if (seq.isEmpty())
+        return Raise(L, QString("unknown key \"%1\"").arg(lua_tostring(L, idx)));
+    return seq[0] & ~Qt::KeyboardModifierMask;
+}
+
+// Key(target, "Left", "shift"[, "press"|"release"]).
+int Key(lua_State *L)
+{
+    QWidget *w = TargetOrRaise(L, 1);
+    const int key = KeyCode(L, 2);
+    const Qt::KeyboardModifiers mods = UiGesture::Modifiers(QString::fromUtf8(luaL_optstring(L, 3, "")));
+    const QByteArray phase = luaL_optstring(L, 4, "click");
+    if (phase != "release")
+        QTest::keyPress(w, Qt::Key(key), mods);
+    if (phase != "press")
+        QTest::keyRelease(w, Qt::Key(key), mods);
+    return 0;
+}
+
+int Type(lua_State *L)
+{
+    QWidget *w = TargetOrRaise(L, 1);
+    QTest::keyClicks(w, QString::fromUtf8(luaL_checkstring(L, 2)));
+    return 0;
+}
+
+int Grab(lua_State *L)
+{
+    QWidget *w = TargetOrRaise(L, 1);
+    const char *path = luaL_checkstring(L, 2);
+    if (!w->grab().save(QString::fromUtf8(path)))
+        return Raise(L, QString("cannot write %1").arg(path));
+    return 0;
+}
+
+QString TextOf(QWidget *w)
+{
+    if (auto *edit = qobject_cast<QLineEdit *>(w))
+        return edit->text();
+    if (auto *label = qobject_cast<QLabel *>(w))
+        return label->text();
+    if (auto *button = qobject_cast<CustomButton *>(w))
+        return button->GetLabel();
+    if (auto *combo = qobject_cast<QComboBox *>(w))
+        return combo->currentText();
+    return QString();
+}
+
+// State(target) -> { visible, enabled, x, y, width, height, text, check }.
+int State(lua_State *L)
+{
+    QWidget *w = TargetOrRaise(L, 1);
+    lua_createtable(L, 0, 8);
+    lua_pushboolean(L, w->isVisible());
+    lua_setfield(L, -2, "visible");
+    lua_pushboolean(L, w->isEnabled());
+    lua_setfield(L, -2, "enabled");
+    const QRect r = w->geometry();
+    for (auto [key, v] : {std::pair{"x", r.x()}, {"y", r.y()}, {"width", r.width()}, {"height", r.height()}}) {
+        lua_pushinteger(L, v);
+        lua_setfield(L, -2, key);
+    }
+    lua_pushstring(L, TextOf(w).toUtf8().constData());
+    lua_setfield(L, -2, "text");
+    if (auto *button = qobject_cast<CustomButton *>(w)) {
+        lua_pushinteger(L, button->GetCheck());
+        lua_setfield(L, -2, "check");
+    }
+    return 1;
+}
+
+// The text on the clipboard, as a paste would give it.
+int Clipboard(lua_State *L)
+{
+    lua_pushstring(L, QApplication::clipboard()->text().toUtf8().constData());
+    return 1;
+}
+
+int Process(lua_State *)
+{
+    QApplication::processEvents();
+    return 0;
+}
+
+} // namespace
+
+void UiScripting::Install(OrbaneDoc *doc, MainWindow *window)
+{
+    gDoc = doc;
+    gWindow = window;
+    const std::pair<const char *, lua_CFunction> functions[] = {
+        {"LoadComp", LoadComp}, {"LoadTool", LoadTool},   {"Tools", Tools},         {"ShowTool", ShowTool},
+        {"GetValue", GetValue}, {"SetValue", SetValue},   {"GetTime", GetTime},     {"SetTime", SetTime},
+        {"Undo", Undo},         {"Redo", Redo},           {"UndoNames", UndoNames}, {"RedoNames", RedoNames},
+        {"Control", Control},   {"Press", Press},         {"Release", Release},     {"Move", Move},
+        {"Click", Click},       {"Drag", Drag},           {"Key", Key},             {"Type", Type},
+        {"Grab", Grab},         {"State", State},         {"Process", Process},
+        {"Clipboard", Clipboard},
+    };
+    for (const auto &[name, fn] : functions)
+        LuaRuntime::Instance().AddModuleFunction(name, fn);
+    ViewerScripting::Install(window);
+}
+
+} // namespace Orbane

@@ -1,0 +1,177 @@
+#include "ViewerScripting.h"
+
+#include "MainWindow.h"
+#include "UiTarget.h"
+
+#include "orbane/LuaRuntime.h"
+#include "orbane/Registry.h"
+#include "orbane/ViewerPanel.h"
+
+#include <QApplication>
+#include <QKeySequence>
+#include <QMouseEvent>
+#include <QTest>
+
+#include <cmath>
+
+namespace Orbane {
+
+namespace {
+
+MainWindow *gWindow = nullptr;
+
+int Raise(lua_State *L, const QString &message)
+{
+    luaL_where(L, 1);
+    lua_pushstring(L, message.toUtf8().constData());
+    lua_concat(L, 2);
+    return lua_error(L);
+}
+
+bool Number(lua_State *L, int idx, const char *key, double &out)
+{
+    lua_getfield(L, idx, key);
+    const bool found = lua_isnumber(L, -1);
+    if (found)
+        out = lua_tonumber(L, -1);
+    lua_pop(L, 1);
+    return found;
+}
+
+// { ix =, iy = } in image coordinates (0..1, Y up), else { x =, y = } in the
+// viewer's widget pixels (Y down), else the centre; then { dx =, dy = }
+// widget pixels more.
+QPoint Position(lua_State *L, int idx, const ViewerPanel *viewer)
+{
+    QPointF at(viewer->width() / 2.0, viewer->height() / 2.0);
+    double ix = 0, iy = 0, x = 0, y = 0, dx = 0, dy = 0;
+    if (lua_istable(L, idx)) {
+        if (Number(L, idx, "ix", ix) && Number(L, idx, "iy", iy))
+            at = viewer->ImageToWidget({ix, iy});
+        else if (Number(L, idx, "x", x) && Number(L, idx, "y", y))
+            at = QPointF(x, y);
+        Number(L, idx, "dx", dx);
+        Number(L, idx, "dy", dy);
+    }
+    return QPoint(int(std::lround(at.x() + dx)), int(std::lround(at.y() + dy)));
+}
+
+void SendMouse(ViewerPanel *viewer, QEvent::Type type, QPoint pos, Qt::MouseButton button, Qt::MouseButtons held,
+               Qt::KeyboardModifiers mods)
+{
+    QMouseEvent event(type, pos, viewer->mapToGlobal(pos), button, held, mods);
+    QApplication::sendEvent(viewer, &event);
+}
+
+int ViewerPress(lua_State *L)
+{
+    const UiGesture g = UiGesture::Read(L, 1);
+    SendMouse(gWindow->Viewer(), QEvent::MouseButtonPress, Position(L, 1, gWindow->Viewer()), g.button, g.button,
+              g.mods);
+    return 0;
+}
+
+// A move with the button held: one step of a drag.
+int ViewerMove(lua_State *L)
+{
+    const UiGesture g = UiGesture::Read(L, 1);
+    SendMouse(gWindow->Viewer(), QEvent::MouseMove, Position(L, 1, gWindow->Viewer()), Qt::NoButton, g.button,
+              g.mods);
+    return 0;
+}
+
+int ViewerRelease(lua_State *L)
+{
+    const UiGesture g = UiGesture::Read(L, 1);
+    SendMouse(gWindow->Viewer(), QEvent::MouseButtonRelease, Position(L, 1, gWindow->Viewer()), g.button,
+              Qt::NoButton, g.mods);
+    return 0;
+}
+
+int ViewerHover(lua_State *L)
+{
+    const UiGesture g = UiGesture::Read(L, 1);
+    SendMouse(gWindow->Viewer(), QEvent::MouseMove, Position(L, 1, gWindow->Viewer()), Qt::NoButton, Qt::NoButton,
+              g.mods);
+    return 0;
+}
+
+int KeyCode(lua_State *L, int idx)
+{
+    if (lua_isnumber(L, idx))
+        return int(lua_tointeger(L, idx));
+    const QKeySequence seq = QKeySequence::fromString(QString::fromUtf8(luaL_checkstring(L, idx)));
+    if (seq.isEmpty())
+        return Raise(L, QString("unknown key \"%1\"").arg(lua_tostring(L, idx)));
+    return seq[0] & ~Qt::KeyboardModifierMask;
+}
+
+// ViewerKey("Left", "shift"[, "press"|"release"|"click"]). The modifier keys
+// go down before the key and up after it, as a person's hands do.
+int ViewerKey(lua_State *L)
+{
+    ViewerPanel *viewer = gWindow->Viewer();
+    const int key = KeyCode(L, 1);
+    const Qt::KeyboardModifiers mods = UiGesture::Modifiers(QString::fromUtf8(luaL_optstring(L, 2, "")));
+    const QByteArray phase = luaL_optstring(L, 3, "click");
+    if (phase != "click" && phase != "press" && phase != "release")
+        return Raise(L, QString("unknown key phase \"%1\"; expected click, press or release").arg(phase.constData()));
+    if (phase != "release")
+        QTest::keyPress(viewer, Qt::Key(key), mods);
+    if (phase != "press")
+        QTest::keyRelease(viewer, Qt::Key(key), mods);
+    return 0;
+}
+
+int ViewerGrab(lua_State *L)
+{
+    const char *path = luaL_checkstring(L, 1);
+    if (!gWindow->Viewer()->grab().save(QString::fromUtf8(path)))
+        return Raise(L, QString("cannot write %1").arg(path));
+    return 0;
+}
+
+int ViewerImage(lua_State *L)
+{
+    const char *path = luaL_checkstring(L, 1);
+    if (!gWindow->Viewer()->LoadImage(QString::fromUtf8(path)))
+        return Raise(L, QString("cannot read the image %1").arg(path));
+    return 0;
+}
+
+// ViewerInfo() -> { zoom, width, height, imageWidth, imageHeight, hot }.
+int ViewerInfo(lua_State *L)
+{
+    const ViewerPanel *viewer = gWindow->Viewer();
+    lua_createtable(L, 0, 6);
+    lua_pushnumber(L, viewer->Mapping().Zoom());
+    lua_setfield(L, -2, "zoom");
+    for (auto [key, v] : {std::pair{"width", viewer->width()},
+                          {"height", viewer->height()},
+                          {"imageWidth", viewer->ImageSize().width()},
+                          {"imageHeight", viewer->ImageSize().height()}}) {
+        lua_pushinteger(L, v);
+        lua_setfield(L, -2, key);
+    }
+    if (const PreviewControl *hot = viewer->HotControl()) {
+        lua_pushstring(L, hot->GetRegistry() ? hot->GetRegistry()->Name() : "PreviewControl");
+        lua_setfield(L, -2, "hot");
+    }
+    return 1;
+}
+
+} // namespace
+
+void ViewerScripting::Install(MainWindow *window)
+{
+    gWindow = window;
+    const std::pair<const char *, lua_CFunction> functions[] = {
+        {"ViewerPress", ViewerPress}, {"ViewerMove", ViewerMove}, {"ViewerRelease", ViewerRelease},
+        {"ViewerHover", ViewerHover}, {"ViewerKey", ViewerKey},   {"ViewerGrab", ViewerGrab},
+        {"ViewerImage", ViewerImage}, {"ViewerInfo", ViewerInfo},
+    };
+    for (const auto &[name, fn] : functions)
+        LuaRuntime::Instance().AddModuleFunction(name, fn);
+}
+
+} // namespace Orbane

@@ -1,0 +1,222 @@
+#include "orbane/ToolLoader.h"
+
+#include "orbane/AutoRef.h"
+#include "orbane/Input.h"
+#include "orbane/LuaRuntime.h"
+#include "orbane/Operator.h"
+#include "orbane/OrbaneDoc.h"
+#include "orbane/Parameter.h"
+#include "orbane/ParameterScript.h"
+#include "orbane/Registry.h"
+#include "orbane/RegistryList.h"
+#include "orbane/ScriptError.h"
+#include "orbane/ScriptVal.h"
+#include "orbane/TagList.h"
+
+#include <QDir>
+#include <QFileInfo>
+
+#include <vector>
+
+namespace Orbane {
+
+namespace {
+
+const char *Str(const ScriptVal &table, const char *key, const char *def)
+{
+    const ScriptVal *v = table.FindKeyConst(ScriptVal(key));
+    return v && v->IsString() ? v->GetString() : def;
+}
+
+// A field that may hold one class name or a list of them.
+std::vector<std::string> Names(const ScriptVal &table, const char *key)
+{
+    std::vector<std::string> names;
+    const ScriptVal *v = table.FindKeyConst(ScriptVal(key));
+    if (v && v->IsString())
+        names.emplace_back(v->GetString());
+    else if (v && v->IsTable())
+        for (int32 i = 1; i <= v->Length(); ++i)
+            names.emplace_back(v->FindKeyConst(ScriptVal(i))->GetString());
+    return names;
+}
+
+// Runs a description file and takes the table it returns.
+bool RunDescription(const std::string &path, ScriptVal &out, std::string *error)
+{
+    LuaRuntime &lua = LuaRuntime::Instance();
+    if (!lua.RunFile(path, error, 1))
+        return false;
+    out = LuaRuntime::ToScriptVal(lua.State(), -1);
+    lua_pop(lua.State(), 1);
+    if (!out.IsTable()) {
+        *error = path + ": the file must return a table";
+        return false;
+    }
+    return true;
+}
+
+bool AddNumberedAttr(const ScriptVal &key, const ScriptVal &value, TagList &tags, std::string *error)
+{
+    const Tag tag = Tag(key.GetNumber());
+    const uint32 type = TagTypeOf(tag);
+    if (!key.IsNumber() || type == 0) {
+        *error = std::string("attrs: keys are tag ids, got ") + key.TypeName();
+        return false;
+    }
+    if (value.IsString())
+        type == TAGTYPE_ID ? tags.Add(tag, OrbID(value.GetString())) : tags.Add(tag, value.GetString());
+    else if (type == TAGTYPE_Double)
+        tags.Add(tag, value.GetNumber());
+    else
+        tags.Add(tag, int64(value.IsBool() ? value.GetBool() : value.GetNumber()));
+    return true;
+}
+
+// Input attributes given by number: { [0x10050001] = 1 }, or, where their
+// order matters (repeated item tags), as { tag, value } pairs in a list.
+bool AddNumberedAttrs(const ScriptVal &attrs, TagList &tags, std::string *error)
+{
+    for (const auto &[key, value] : attrs.GetEntries()) {
+        const bool pair = key.IsNumber() && TagTypeOf(Tag(key.GetNumber())) == 0 && value.IsTable();
+        const ScriptVal *pairTag = pair ? value.FindKeyConst(ScriptVal(1)) : nullptr;
+        const ScriptVal *pairValue = pair ? value.FindKeyConst(ScriptVal(2)) : nullptr;
+        if (pair && (!pairTag || !pairValue)) {
+            *error = "attrs: a pair in the list must be { tag, value }";
+            return false;
+        }
+        if (!AddNumberedAttr(pair ? *pairTag : key, pair ? *pairValue : value, tags, error))
+            return false;
+    }
+    return true;
+}
+
+// Maps one named tag through the first of the Input's classes that knows it.
+bool MapNamedTag(const std::vector<std::string> &classes, const ScriptVal &name, const ScriptVal &value,
+                 TagList &tags, std::string *error)
+{
+    std::string why = std::string("unknown tag \"") + name.GetString("?") + "\"";
+    for (const std::string &cls : classes) {
+        const Registry *reg = ClassRegistry.FindScriptName(cls.c_str());
+        TagMapHook hook = reg ? reg->FindMapHook() : nullptr;
+        if (!hook)
+            continue;
+        ScriptVal one = ScriptVal::NewTable();
+        one.SetKey(name, value);
+        TagList mapped;
+        if (hook(OrbID("Create"), 0, one, mapped)) {
+            tags.Append(mapped);
+            return true;
+        }
+        why = TakeScriptError();
+    }
+    *error = why;
+    return false;
+}
+
+bool BuildAttrs(const ScriptVal &decl, const char *name, TagList &tags, std::string *error)
+{
+    tags.Add(INPA_Name, name);
+    if (const char *label = Str(decl, "label", nullptr))
+        tags.Add(LINKS_Name, label);
+    if (const char *label2 = Str(decl, "label2", nullptr))
+        tags.Add(LINKS_SecondName, label2);
+    std::vector<std::string> classes = Names(decl, "control");
+    for (const std::string &c : classes)
+        tags.Add(INPA_InputControl, OrbID(c));
+    for (const std::string &c : Names(decl, "overlay")) {
+        tags.Add(INPA_PreviewControl, OrbID(c));
+        classes.push_back(c);
+    }
+    if (const ScriptVal *attrs = decl.FindKeyConst(ScriptVal("attrs")); attrs && !AddNumberedAttrs(*attrs, tags, error))
+        return false;
+    if (const ScriptVal *named = decl.FindKeyConst(ScriptVal("tags")))
+        for (const auto &[key, value] : named->GetEntries())
+            if (!MapNamedTag(classes, key, value, tags, error))
+                return false;
+    return true;
+}
+
+bool AddInputFrom(Operator &tool, const ScriptVal &decl, std::string *error)
+{
+    const char *id = Str(decl, "id", nullptr);
+    if (!id) {
+        *error = "an Input needs an id";
+        return false;
+    }
+    const char *name = Str(decl, "name", id);
+    const OrbID type(Str(decl, "type", "Number"));
+    TagList attrs;
+    AutoRef<Parameter> def;
+    std::string why;
+    if (!BuildAttrs(decl, name, attrs, &why)) {
+        *error = std::string("Input \"") + id + "\": " + why;
+        return false;
+    }
+    if (const ScriptVal *v = decl.FindKeyConst(ScriptVal("default"))) {
+        def = AutoRef<Parameter>(ParameterScript::FromScript(type, *v, &why));
+        if (!def) {
+            *error = std::string("Input \"") + id + "\": default: " + why;
+            return false;
+        }
+    }
+    if (!tool.AddInput(OrbID(id), name, type, attrs, def.get())) {
+        *error = TakeScriptError();
+        return false;
+    }
+    return true;
+}
+
+} // namespace
+
+Operator *ToolLoader::FromTable(const ScriptVal &desc, const char *name, std::string *error)
+{
+    AutoRef<Operator> tool(new Operator(name, Str(desc, "type", name)));
+    const ScriptVal *inputs = desc.FindKeyConst(ScriptVal("inputs"));
+    for (int32 i = 1; inputs && i <= inputs->Length(); ++i) {
+        std::string why;
+        if (!AddInputFrom(*tool, *inputs->FindKeyConst(ScriptVal(i)), &why)) {
+            *error = std::string("tool \"") + name + "\": " + why;
+            return nullptr;
+        }
+    }
+    return tool.Take();
+}
+
+Operator *ToolLoader::LoadTool(const std::string &path, const char *name, std::string *error)
+{
+    ScriptVal desc;
+    if (!RunDescription(path, desc, error))
+        return nullptr;
+    Operator *tool = FromTable(desc, name, error);
+    if (!tool)
+        *error = path + ": " + *error;
+    return tool;
+}
+
+bool ToolLoader::LoadComp(OrbaneDoc &doc, const std::string &path, std::string *error)
+{
+    ScriptVal comp;
+    if (!RunDescription(path, comp, error))
+        return false;
+    const QDir base = QFileInfo(QString::fromStdString(path)).absoluteDir();
+    const ScriptVal *tools = comp.FindKeyConst(ScriptVal("tools"));
+    for (int32 i = 1; tools && i <= tools->Length(); ++i) {
+        const ScriptVal &entry = *tools->FindKeyConst(ScriptVal(i));
+        const std::string file = base.filePath(QString::fromUtf8(Str(entry, "file", ""))).toStdString();
+        AutoRef<Operator> tool(LoadTool(file, Str(entry, "name", "Tool"), error));
+        if (!tool)
+            return false;
+        if (!doc.AddTool(tool.get())) {
+            *error = path + ": cannot add tool \"" + tool->GetName() + "\" (is the name taken?)";
+            return false;
+        }
+    }
+    if (const ScriptVal *time = comp.FindKeyConst(ScriptVal("time")))
+        doc.SetCurrentTime(time->GetNumber());
+    if (const char *image = Str(comp, "image", nullptr))
+        doc.SetPref(PREF_ViewerImage, base.filePath(QString::fromUtf8(image)).toStdString());
+    return true;
+}
+
+} // namespace Orbane

@@ -1,0 +1,41 @@
+#pragma once
+
+#include <string>
+
+namespace Orbane {
+
+class Operator;
+class OrbaneDoc;
+class ScriptVal;
+
+// Builds tools and comps from their Lua descriptions.
+//
+// A tool file returns a table:
+//   { type = "Demo", inputs = {
+//       { id = "Invert", name = "Invert", type = "Number", default = 0,
+//         control = "CheckboxControl",            -- or a list of classes: one control each
+//         overlay = "CrosshairControl",            -- viewer overlays, likewise
+//         label = "Invert", label2 = "Colours",    -- label texts (0x30040000, 0x30040001)
+//         tags = { CBC_TriState = true },          -- named tags of the control and overlay classes
+//         attrs = { [0x10050001] = 1 } },          -- any further Input attributes by number;
+//                                                  -- { { 0x38040000, "A" }, { 0x38040001, "" } }
+//                                                  -- gives them in this order (repeated tags)
+//       ... } }
+// Data types: "Number", "Point" (default {x, y}), "Text", "ID", "ScriptVal".
+// Named tags go through the same tag maps as orbane.Create, so a misspelt
+// tag fails with a message naming the tool, the Input and the tag.
+//
+// A comp file returns { time = 0, tools = { { file = "tools/Demo.lua", name = "Demo1" }, ... } };
+// file names are relative to the comp file. An optional `image = "images/x.png"`
+// names the image the viewer shows (PREF_ViewerImage).
+class ToolLoader
+{
+public:
+    // A new tool (one reference, the caller's) named `name`; null with `error` set.
+    static Operator *FromTable(const ScriptVal &desc, const char *name, std::string *error);
+    static Operator *LoadTool(const std::string &path, const char *name, std::string *error);
+    // Adds every tool of the comp to the document and sets its time.
+    static bool LoadComp(OrbaneDoc &doc, const std::string &path, std::string *error);
+};
+
+} // namespace Orbane
