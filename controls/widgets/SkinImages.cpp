@@ -1,0 +1,42 @@
+#include "widgets/SkinImages.h"
+
+#include "orbane/DIB.h"
+
+#include <map>
+#include <string>
+
+namespace Orbane {
+
+namespace {
+
+class Cache
+{
+public:
+    ~Cache()
+    {
+        for (auto &entry : mImages)
+            if (entry.second)
+                entry.second->Recycle();
+    }
+
+    DIB *Get(const char *name)
+    {
+        auto found = mImages.find(name);
+        if (found == mImages.end())
+            found = mImages.emplace(name, DIB::FromResource(name, SkinImages::Ratio)).first;
+        return found->second;
+    }
+
+private:
+    std::map<std::string, DIB *> mImages;
+};
+
+} // namespace
+
+DIB *SkinImages::Get(const char *name)
+{
+    static Cache cache;
+    return name ? cache.Get(name) : nullptr;
+}
+
+} // namespace Orbane

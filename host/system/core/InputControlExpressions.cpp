@@ -1,0 +1,233 @@
+// The expression fields and the context menu of InputControl.
+
+#include "orbane/InputControl.h"
+
+#include "orbane/AutoParam.h"
+#include "orbane/ClassIDs.h"
+#include "orbane/Input.h"
+#include "orbane/OrbaneDoc.h"
+#include "orbane/Parser.h"
+
+#include <QContextMenuEvent>
+#include <QKeyEvent>
+#include <QLineEdit>
+#include <QMenu>
+
+namespace Orbane {
+
+namespace {
+
+const char kExpressionAction[] = "Expression";
+
+} // namespace
+
+QLineEdit *InputControl::GetExpressionEdit(int32 index) const
+{
+    if (index < 0 || std::size_t(index) >= mExpressionEdits.size())
+        return nullptr;
+    return mExpressionEdits[std::size_t(index)];
+}
+
+int32 InputControl::IndexOf(const QObject *edit) const
+{
+    for (std::size_t i = 0; i < mExpressionEdits.size(); ++i)
+        if (edit && mExpressionEdits[i] == edit)
+            return int32(i);
+    return -1;
+}
+
+QLineEdit *InputControl::MakeExpressionEdit(int32 index)
+{
+    if (index < 0 || std::size_t(index) >= mInputs.size())
+        return nullptr;
+    if (QLineEdit *edit = GetExpressionEdit(index))
+        return edit;
+    mExpressionEdits.resize(mInputs.size());
+    mExpressions.resize(mInputs.size());
+    auto *edit = new QLineEdit(this);
+    edit->setObjectName("expression");
+    edit->setFont(mControlFont);
+    edit->setPlaceholderText("Expression");
+    edit->setText(QString::fromStdString(mExpressions[std::size_t(index)].str()));
+    edit->setVisible(!mExpressions[std::size_t(index)].IsEmpty());
+    edit->installEventFilter(this);
+    connect(edit, SIGNAL(returnPressed()), this, SLOT(OnExpressionEntered()));
+    mExpressionEdits[std::size_t(index)] = edit;
+    return edit;
+}
+
+QLineEdit *InputControl::CreateExpressionEdit(const QRect &rect, int32 index)
+{
+    QLineEdit *edit = MakeExpressionEdit(index);
+    if (edit && rect.isValid())
+        edit->setGeometry(rect);
+    return edit;
+}
+
+QLineEdit *InputControl::CreateExpressionEdit(Layout::Container *where, int32 index)
+{
+    const bool existed = GetExpressionEdit(index) != nullptr;
+    QLineEdit *edit = MakeExpressionEdit(index);
+    // CreateLayout moves fields that existed already into a new container.
+    if (edit && where && (!existed || !where->Find(OrbID("expression." + std::to_string(index)))))
+        where->AddWidget(OrbID("expression." + std::to_string(index)), edit);
+    return edit;
+}
+
+bool InputControl::AddExpressionEdit(int32 index, const TagList *)
+{
+    QLineEdit *edit = GetExpressionEdit(index);
+    if (!edit) {
+        Layout::LayoutObj *where = FindLayoutObj("expression");
+        edit = where && where->AsContainer() ? CreateExpressionEdit(where->AsContainer(), index)
+                                             : CreateExpressionEdit(QRect(), index);
+    }
+    if (!edit)
+        return false;
+    edit->show();
+    edit->setFocus(Qt::OtherFocusReason);
+    Relayout();
+    return true;
+}
+
+OrbString InputControl::GetExpressionData(int32 index) const
+{
+    if (index < 0 || std::size_t(index) >= mExpressions.size())
+        return OrbString();
+    return mExpressions[std::size_t(index)];
+}
+
+QRect InputControl::GetExpressionRect(int32 index) const
+{
+    const QLineEdit *edit = GetExpressionEdit(index);
+    return edit && !edit->isHidden() ? edit->geometry() : QRect();
+}
+
+bool InputControl::RemoveExpressionAt(int32 index)
+{
+    if (index < 0 || std::size_t(index) >= mInputs.size())
+        return false;
+    if (std::size_t(index) < mExpressions.size())
+        mExpressions[std::size_t(index)] = OrbString();
+    if (QLineEdit *edit = GetExpressionEdit(index)) {
+        edit->clear();
+        edit->hide();
+    }
+    Relayout();
+    return true;
+}
+
+bool InputControl::ExpressionChanged(int32 index, const char *text)
+{
+    if (index < 0 || std::size_t(index) >= mInputs.size())
+        return false;
+    if (!text || !*text)
+        return RemoveExpressionAt(index);
+    Input *in = mInputs[std::size_t(index)];
+    if (in->GetDataType() != CLSID_DataType_Number)
+        return false;
+    Parser parser;
+    const AutoNumber now(in, GetCurrentTime());
+    parser.SetVar("value", now ? now->Value : 0.0);
+    parser.SetVar("time", GetCurrentTime());
+    bool ok = parser.SetExpression(text);
+    const float64 value = ok ? parser.Evaluate(&ok) : 0.0;
+    if (QLineEdit *edit = GetExpressionEdit(index))
+        edit->setToolTip(ok ? QString() : QString::fromUtf8(parser.GetError()));
+    if (!ok)
+        return false;
+    mExpressions.resize(mInputs.size());
+    mExpressions[std::size_t(index)] = OrbString(text);
+    return WriteExpression(index, value);
+}
+
+bool InputControl::WriteExpression(int32 index, float64 value)
+{
+    Input *in = mInputs[std::size_t(index)];
+    if (IsLocked())
+        return false;
+    AutoNumber number(value);
+    OpenUndo();
+    const bool ok = AutoRef<Input>::Share(in)->SetValue(number, GetCurrentTime(), 0, nullptr);
+    ResetUndo(nullptr);
+    return ok;
+}
+
+bool InputControl::SetExpressions(const char *text, const TagList *)
+{
+    bool ok = true;
+    for (std::size_t i = 0; i < mInputs.size(); ++i)
+        ok = ExpressionChanged(int32(i), text) && ok;
+    return ok;
+}
+
+void InputControl::OnOK()
+{
+    for (std::size_t i = 0; i < mExpressionEdits.size(); ++i)
+        if (QLineEdit *edit = mExpressionEdits[i]; edit && edit->hasFocus())
+            ExpressionChanged(int32(i), edit->text().toUtf8().constData());
+}
+
+void InputControl::OnCancel()
+{
+    for (std::size_t i = 0; i < mExpressionEdits.size(); ++i) {
+        QLineEdit *edit = mExpressionEdits[i];
+        if (!edit || !edit->hasFocus())
+            continue;
+        const OrbString kept = GetExpressionData(int32(i));
+        edit->setText(QString::fromStdString(kept.str()));
+        if (kept.IsEmpty()) {
+            edit->hide();
+            Relayout();
+        }
+    }
+}
+
+void InputControl::OnExpressionEntered()
+{
+    const int32 index = IndexOf(sender());
+    if (QLineEdit *edit = GetExpressionEdit(index))
+        ExpressionChanged(index, edit->text().toUtf8().constData());
+}
+
+bool InputControl::eventFilter(QObject *watched, QEvent *event)
+{
+    if (event->type() == QEvent::KeyPress && IndexOf(watched) >= 0 &&
+        static_cast<QKeyEvent *>(event)->key() == Qt::Key_Escape) {
+        OnCancel();
+        return true;
+    }
+    return QWidget::eventFilter(watched, event);
+}
+
+void InputControl::AddToMenu(QMenu *menu)
+{
+    if (!menu || mInputs.empty() || mFlags & CF_ActionOnly)
+        return;
+    QAction *action = menu->addAction(kExpressionAction, this, SLOT(OnExpressionMenu()));
+    action->setCheckable(true);
+    const QLineEdit *edit = GetExpressionEdit(0);
+    action->setChecked(edit && !edit->isHidden());
+}
+
+void InputControl::OnExpressionMenu()
+{
+    const QLineEdit *edit = GetExpressionEdit(0);
+    if (edit && !edit->isHidden())
+        RemoveExpressionAt(0);
+    else
+        AddExpressionEdit(0, nullptr);
+}
+
+void InputControl::contextMenuEvent(QContextMenuEvent *event)
+{
+    QMenu menu(this);
+    AddToMenu(&menu);
+    if (menu.isEmpty()) {
+        event->ignore();
+        return;
+    }
+    menu.exec(event->globalPos());
+}
+
+} // namespace Orbane

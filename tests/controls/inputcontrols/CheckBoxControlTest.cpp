@@ -1,0 +1,390 @@
+#include "ToolFixture.h"
+
+#include "orbane/AutoParam.h"
+#include "orbane/ClassIDs.h"
+#include "orbane/CustomCheckBox.h"
+#include "orbane/ElideLabel.h"
+#include "orbane/Input.h"
+
+#include <QtTest>
+
+using namespace Orbane;
+using namespace Orbane::Test;
+
+Q_DECLARE_METATYPE(Orbane::TagList)
+
+namespace {
+
+constexpr Tag kTriState = 0x10050000;
+constexpr Tag kAllowWrap = 0x10050001;
+
+CustomCheckBox *BoxOf(const InputControl *c)
+{
+    return c->findChild<CustomCheckBox *>("checkbox");
+}
+
+ElideLabel *LabelOf(const InputControl *c)
+{
+    return c->findChild<ElideLabel *>("label");
+}
+
+InputControl *CheckBox(ToolFixture &f, const std::vector<Input *> &inputs, int32 width = ToolFixture::kWidth)
+{
+    return f.Create(CLSID_InputControl_Checkbox, inputs, width);
+}
+
+void Click(InputControl *c)
+{
+    CustomCheckBox *box = BoxOf(c);
+    QTest::mouseClick(box, Qt::LeftButton, Qt::NoModifier, box->BoxRect().center());
+}
+
+// Counts the paint events a widget receives.
+class PaintCounter : public QObject
+{
+public:
+    explicit PaintCounter(QWidget *w) { w->installEventFilter(this); }
+    int paints = 0;
+
+protected:
+    bool eventFilter(QObject *, QEvent *event) override
+    {
+        if (event->type() == QEvent::Paint)
+            ++paints;
+        return false;
+    }
+};
+
+} // namespace
+
+class CheckBoxControlTest : public QObject
+{
+    Q_OBJECT
+private slots:
+    void initTestCase();
+    void labelRule_data();
+    void labelRule();
+    void notifyGate_data();
+    void notifyGate();
+    void textsRule_data();
+    void textsRule();
+    void disconnectWrite_data();
+    void disconnectWrite();
+    void layoutReadOnce();
+    void clicksWrite_data();
+    void clicksWrite();
+    void mixedValueShowsThirdState();
+    void triStateSwitchAtOnce();
+    void wrapping_data();
+    void wrapping();
+    void copyAttr_data();
+    void copyAttr();
+    void undoRenotifiesEveryControl();
+};
+
+void CheckBoxControlTest::initTestCase()
+{
+    std::string error;
+    QVERIFY2(ToolFixture::LoadControls(&error), error.c_str());
+}
+
+void CheckBoxControlTest::labelRule_data()
+{
+    QTest::addColumn<TagList>("attrs");
+    QTest::addColumn<QString>("label");
+    QTest::addColumn<QString>("second");
+    QTest::newRow("label text") << TagList{{0x30040000, "Invert"}, {0x30020014, "Invert Name"}} << "Invert"
+                                << "";
+    QTest::newRow("Input name") << TagList{{0x30020014, "Invert Name"}} << "Invert Name"
+                                << "";
+    QTest::newRow("identifier") << TagList{} << "InvertID"
+                                << "";
+    QTest::newRow("second text") << TagList{{0x30040000, "Red"}, {0x30040001, "Channels"}} << "Red"
+                                 << "Channels";
+}
+
+void CheckBoxControlTest::labelRule()
+{
+    QFETCH(TagList, attrs);
+    QFETCH(QString, label);
+    QFETCH(QString, second);
+    ToolFixture f;
+    InputControl *c = CheckBox(f, {f.AddNumber("InvertID", 0.0, attrs)});
+    QVERIFY(c);
+    QCOMPARE(BoxOf(c)->GetLabel(), label);
+    QCOMPARE(LabelOf(c)->text(), second);
+    QCOMPARE(LabelOf(c)->isHidden(), second.isEmpty());
+    QCOMPARE(LabelOf(c)->elideMode(), int(ElideLabel::Elide_Right));
+    QCOMPARE(LabelOf(c)->focusProxy(), BoxOf(c));
+    TagList got;
+    c->GetAttrsTagList(got);
+    QCOMPARE(QString(got.GetString(0x30040000, "")), label);
+}
+
+void CheckBoxControlTest::notifyGate_data()
+{
+    QTest::addColumn<double>("value");
+    QTest::addColumn<int>("state");
+    QTest::addColumn<int>("paints");
+    QTest::newRow("unchanged") << 0.0 << 0 << 0;
+    QTest::newRow("0.5 rounds to 1") << 0.5 << 1 << 1;
+    QTest::newRow("-0.5 rounds to 0") << -0.5 << 0 << 0;
+    QTest::newRow("0.49 rounds to 0") << 0.49 << 0 << 0;
+    QTest::newRow("1.4 rounds to 1") << 1.4 << 1 << 1;
+    QTest::newRow("-1 is mixed") << -1.0 << 2 << 1;
+}
+
+void CheckBoxControlTest::notifyGate()
+{
+    QFETCH(double, value);
+    QFETCH(int, state);
+    QFETCH(int, paints);
+    ToolFixture f;
+    Input *in = f.AddNumber("Invert", 0.0);
+    InputControl *c = CheckBox(f, {in});
+    QCoreApplication::processEvents();
+    // The box covers the control: a redisplay shows as a repaint of the box.
+    PaintCounter counter(BoxOf(c));
+    const AutoNumber number(value);
+    for (int i = 0; i < 3; ++i) {
+        c->NotifyChanged(in, number, nullptr);
+        QCoreApplication::processEvents();
+        QCOMPARE(counter.paints, paints);
+    }
+    QCOMPARE(BoxOf(c)->GetCheck(), state);
+    // Nothing was written back.
+    QCOMPARE(f.NumberOf(in), 0.0);
+    // A null parameter is ignored.
+    QVERIFY(c->NotifyChanged(in, nullptr, nullptr));
+    QCOMPARE(BoxOf(c)->GetCheck(), state);
+}
+
+void CheckBoxControlTest::textsRule_data()
+{
+    QTest::addColumn<TagList>("tags");
+    QTest::addColumn<QString>("label");
+    QTest::addColumn<QString>("second");
+    QTest::addColumn<bool>("changed");
+    QTest::newRow("no text tags") << TagList{{kTriState, 0}} << "Invert"
+                                  << "Opt" << false;
+    QTest::newRow("same text") << TagList{{0x30040000, "Invert"}} << "Invert"
+                               << "Opt" << false;
+    QTest::newRow("same texts") << TagList{{0x30040000, "Invert"}, {0x30040001, "Opt"}} << "Invert"
+                                << "Opt" << false;
+    QTest::newRow("new label") << TagList{{0x30040000, "Flip"}} << "Flip"
+                               << "Opt" << true;
+    QTest::newRow("Input name") << TagList{{0x30020014, "Named"}} << "Named"
+                                << "Opt" << true;
+    QTest::newRow("new second") << TagList{{0x30040001, "More"}} << "Invert"
+                                << "More" << true;
+}
+
+void CheckBoxControlTest::textsRule()
+{
+    QFETCH(TagList, tags);
+    QFETCH(QString, label);
+    QFETCH(QString, second);
+    QFETCH(bool, changed);
+    ToolFixture f;
+    Input *in = f.AddNumber("Invert", 0.0, TagList{{0x30040000, "Invert"}, {0x30040001, "Opt"}});
+    InputControl *c = CheckBox(f, {in});
+    // What the child shows is put back only where the texts changed.
+    BoxOf(c)->SetLabel(QString("shown"));
+    QVERIFY(c->SetAttrsTagList(in, tags));
+    TagList got;
+    c->GetAttrsTagList(got);
+    QCOMPARE(QString(got.GetString(0x30040000, "")), label);
+    QCOMPARE(QString(got.GetString(0x30040001, "")), second);
+    // Texts changed after Open wait for the next redisplay.
+    QCOMPARE(BoxOf(c)->GetLabel(), QString("shown"));
+    c->UpdateDisplay(nullptr, nullptr);
+    QCOMPARE(BoxOf(c)->GetLabel(), changed ? label : QString("shown"));
+    QCOMPARE(LabelOf(c)->text(), second);
+}
+
+void CheckBoxControlTest::disconnectWrite_data()
+{
+    QTest::addColumn<bool>("animated");
+    QTest::addColumn<double>("stored");
+    QTest::addColumn<double>("after");
+    QTest::newRow("shown value written back") << false << 1.3 << 1.0;
+    QTest::newRow("mixed written back") << false << -0.7 << -1.0;
+    QTest::newRow("equal value") << false << 1.0 << 1.0;
+    QTest::newRow("no key at the disconnect time") << true << 1.3 << 1.3;
+}
+
+void CheckBoxControlTest::disconnectWrite()
+{
+    QFETCH(bool, animated);
+    QFETCH(double, stored);
+    QFETCH(double, after);
+    ToolFixture f;
+    Input *in = f.AddNumber("Invert", stored);
+    in->SetAnimated(animated);
+    InputControl *c = CheckBox(f, {in});
+    QCOMPARE(BoxOf(c)->GetCheck(), after < 0 ? 2 : int(after != 0.0));
+    // The user never touched it.
+    f.Destroy(c);
+    QCOMPARE(f.NumberOf(in), after);
+    QCOMPARE(int(in->KeyTimes().size()), animated ? 1 : 0);
+    // Flags 1: no undo record.
+    QVERIFY(f.doc.UndoNames().isEmpty());
+}
+
+void CheckBoxControlTest::layoutReadOnce()
+{
+    ToolFixture f;
+    for (int i = 0; i < 4; ++i)
+        QVERIFY(CheckBox(f, {f.AddNumber(("In" + std::to_string(i)).c_str(), 0.0)}));
+    QCOMPARE(InputControl::LayoutReadCount("Controls.CheckBox.Layout"), 1);
+}
+
+void CheckBoxControlTest::clicksWrite_data()
+{
+    QTest::addColumn<bool>("triState");
+    QTest::addColumn<QList<double>>("values");
+    QTest::addColumn<QList<int>>("states");
+    QTest::newRow("two states") << false << QList<double>{1, 0, 1, 0} << QList<int>{1, 0, 1, 0};
+    QTest::newRow("three states") << true << QList<double>{1, -1, 0, 1} << QList<int>{1, 2, 0, 1};
+}
+
+void CheckBoxControlTest::clicksWrite()
+{
+    QFETCH(bool, triState);
+    QFETCH(QList<double>, values);
+    QFETCH(QList<int>, states);
+    ToolFixture f;
+    Input *in = f.AddNumber("Invert", 0.0, TagList{{kTriState, triState}});
+    InputControl *c = CheckBox(f, {in});
+    QCOMPARE(BoxOf(c)->GetStyle(), triState ? 2 : 1);
+    for (int i = 0; i < values.size(); ++i) {
+        Click(c);
+        QCOMPARE(f.NumberOf(in), values[i]);
+        QCOMPARE(BoxOf(c)->GetCheck(), states[i]);
+        QCOMPARE(f.doc.UndoNames().size(), i + 1);
+        QVERIFY(!c->IsUndoOpen());
+    }
+    QCOMPARE(f.doc.UndoNames().first(), QString("Change Invert"));
+}
+
+void CheckBoxControlTest::mixedValueShowsThirdState()
+{
+    ToolFixture f;
+    Input *in = f.AddNumber("Invert", -1.0, TagList{{kTriState, 1}});
+    InputControl *c = CheckBox(f, {in});
+    QCOMPARE(BoxOf(c)->GetCheck(), 2);
+    const AutoNumber one(1.0);
+    QVERIFY(in->SetValue(one, 0.0));
+    QCOMPARE(BoxOf(c)->GetCheck(), 1);
+    const AutoNumber mixed(-1.0);
+    QVERIFY(in->SetValue(mixed, 0.0));
+    QCOMPARE(BoxOf(c)->GetCheck(), 2);
+}
+
+void CheckBoxControlTest::triStateSwitchAtOnce()
+{
+    ToolFixture f;
+    Input *in = f.AddNumber("Invert", 0.0, TagList{{kTriState, 1}});
+    InputControl *c = CheckBox(f, {in});
+    QCOMPARE(BoxOf(c)->GetStyle(), 2);
+    QVERIFY(c->SetAttrsTagList(in, TagList{{kTriState, 0}}));
+    QCOMPARE(BoxOf(c)->GetStyle(), 1);
+    int32 tri = -5;
+    c->CopyAttr(kTriState, &tri);
+    QCOMPARE(tri, 0);
+    Click(c);
+    Click(c);
+    QCOMPARE(f.NumberOf(in), 0.0);
+    // A list without the tag keeps the style.
+    QVERIFY(c->SetAttrsTagList(in, TagList{{0x30040000, "Invert"}}));
+    QCOMPARE(BoxOf(c)->GetStyle(), 1);
+    QVERIFY(c->SetAttrsTagList(TagList{{kTriState, 1}}));
+    QCOMPARE(BoxOf(c)->GetStyle(), 2);
+}
+
+void CheckBoxControlTest::wrapping_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<bool>("grows");
+    QTest::newRow("fits on one line") << "Invert" << false;
+    QTest::newRow("wraps") << "Invert the colours of every channel before the mask is applied to the foreground image"
+                           << true;
+}
+
+void CheckBoxControlTest::wrapping()
+{
+    QFETCH(QString, text);
+    QFETCH(bool, grows);
+    ToolFixture f;
+    const QByteArray label = text.toUtf8();
+    Input *plain = f.AddNumber("Plain", 0.0, TagList{{0x30040000, label.constData()}});
+    Input *wrapping = f.AddNumber("Wrapping", 0.0, TagList{{0x30040000, label.constData()}, {kAllowWrap, 1}});
+    InputControl *one = CheckBox(f, {plain}, 240);
+    InputControl *many = CheckBox(f, {wrapping}, 240);
+    QVERIFY(BoxOf(many)->IsWrapAllowed());
+    QVERIFY(!BoxOf(one)->IsWrapAllowed());
+    if (grows) {
+        QVERIFY(many->height() > one->height());
+        QVERIFY(BoxOf(many)->height() > BoxOf(one)->height());
+        // Wider, it needs fewer lines.
+        const int32 narrow = many->height();
+        QVERIFY(f.Resize(many, 900) < narrow);
+    } else {
+        QCOMPARE(many->height(), one->height());
+        QCOMPARE(f.Resize(many, 900), one->height());
+    }
+}
+
+void CheckBoxControlTest::copyAttr_data()
+{
+    QTest::addColumn<bool>("triState");
+    QTest::newRow("two states") << false;
+    QTest::newRow("three states") << true;
+}
+
+void CheckBoxControlTest::copyAttr()
+{
+    QFETCH(bool, triState);
+    ToolFixture f;
+    InputControl *c = CheckBox(f, {f.AddNumber("Invert", 0.0, TagList{{kTriState, triState}})});
+    int32 out = 77;
+    // False: a value was supplied.
+    QCOMPARE(c->CopyAttr(kTriState, &out), false);
+    QCOMPARE(out, int32(triState));
+    out = 77;
+    QCOMPARE(c->CopyAttr(kAllowWrap, &out), true);
+    QCOMPARE(out, 77);
+    TagList got;
+    c->GetAttrsTagList(got);
+    QCOMPARE(got.GetBool(kTriState, !triState), triState);
+}
+
+void CheckBoxControlTest::undoRenotifiesEveryControl()
+{
+    ToolFixture f;
+    Input *in = f.AddNumber("Invert", 0.0);
+    InputControl *first = CheckBox(f, {in});
+    InputControl *second = CheckBox(f, {in});
+    Click(first);
+    QCOMPARE(f.NumberOf(in), 1.0);
+    QCOMPARE(BoxOf(second)->GetCheck(), 1);
+    // The second control was told and wrote nothing.
+    QCOMPARE(f.doc.UndoNames(), QStringList{"Change Invert"});
+    QVERIFY(f.doc.Undo());
+    QCOMPARE(f.NumberOf(in), 0.0);
+    QCOMPARE(BoxOf(first)->GetCheck(), 0);
+    QCOMPARE(BoxOf(second)->GetCheck(), 0);
+    QVERIFY(f.doc.Redo());
+    QCOMPARE(f.NumberOf(in), 1.0);
+    QCOMPARE(BoxOf(first)->GetCheck(), 1);
+    QCOMPARE(BoxOf(second)->GetCheck(), 1);
+    QCOMPARE(f.doc.UndoNames().size(), 1);
+    // Clicking the second after the redo toggles from what it shows.
+    Click(second);
+    QCOMPARE(f.NumberOf(in), 0.0);
+    QCOMPARE(BoxOf(first)->GetCheck(), 0);
+    QCOMPARE(f.doc.UndoNames().size(), 2);
+}
+
+QTEST_MAIN(CheckBoxControlTest)
+#include "CheckBoxControlTest.moc"

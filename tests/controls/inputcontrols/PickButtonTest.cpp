@@ -1,0 +1,175 @@
+#include "TestControl.h"
+#include "ToolFixture.h"
+
+#include "inputcontrols/PickButton.h"
+
+#include "orbane/AutoParam.h"
+#include "orbane/ClassIDs.h"
+#include "orbane/Input.h"
+#include "orbane/Operator.h"
+#include "orbane/OrbaneEvent.h"
+
+#include <QSignalSpy>
+#include <QtTest>
+
+using namespace Orbane;
+using namespace Orbane::Test;
+
+Q_DECLARE_METATYPE(Orbane::TagList)
+
+namespace {
+
+constexpr Tag kSaveIndex = 0x10030007;
+
+// A widget of the application that records the pick notifications it gets.
+class PickTarget : public QWidget
+{
+public:
+    using QWidget::QWidget;
+    QList<QPair<uint32, uint64>> notes;
+
+protected:
+    void customEvent(QEvent *event) override
+    {
+        if (event->type() == OrbaneEvent::EventType()) {
+            auto *note = static_cast<OrbaneEvent *>(event);
+            notes.append({note->ID(), note->Param2()});
+        }
+    }
+};
+
+void Set(Input *in, float64 value)
+{
+    const AutoNumber number(value);
+    in->SetValue(number, in->CurrentTime());
+}
+
+} // namespace
+
+class PickButtonTest : public QObject
+{
+    Q_OBJECT
+private slots:
+    void saveRestore_data();
+    void saveRestore();
+    void failedPickRestores();
+    void pickOverWidgetNotifiesIt();
+    void disabledPickIsAPlainButton();
+    void attachedObjectHeld();
+};
+
+void PickButtonTest::saveRestore_data()
+{
+    QTest::addColumn<TagList>("attrs");
+    QTest::addColumn<bool>("point");
+    QTest::addColumn<int>("slot");
+    QTest::newRow("slot 0") << TagList{{kSaveIndex, 0}} << false << 0;
+    QTest::newRow("slot 31") << TagList{{kSaveIndex, 31}} << false << 31;
+    QTest::newRow("slot 32 skipped") << TagList{{kSaveIndex, 32}} << false << -1;
+    QTest::newRow("negative skipped") << TagList{{kSaveIndex, -1}} << false << -1;
+    QTest::newRow("no index skipped") << TagList{} << false << -1;
+    QTest::newRow("point skipped") << TagList{{kSaveIndex, 3}} << true << -1;
+}
+
+void PickButtonTest::saveRestore()
+{
+    QFETCH(TagList, attrs);
+    QFETCH(bool, point);
+    QFETCH(int, slot);
+    ToolFixture f;
+    f.doc.SetCurrentTime(4.0);
+    Input *owned = f.AddNumber("Owner", 0.0);
+    Input *in = point ? f.AddPoint("Centre", 0.5, 0.5, attrs) : f.AddNumber("Gain", 2.5, attrs);
+    auto *owner = static_cast<TestControl *>(f.Bind(new TestControl, {owned}));
+    PickButton button(&f.page);
+    button.SetOwner(owner);
+    QCOMPARE(button.SaveValues(), slot >= 0 ? 1 : 0);
+    if (slot >= 0)
+        QCOMPARE(button.SavedValue(slot), 2.5);
+    if (!point)
+        Set(in, 9.0);
+    const int steps = f.doc.UndoNames().size();
+    QCOMPARE(button.RestoreValues(), slot >= 0 ? 1 : 0);
+    if (!point)
+        QCOMPARE(f.NumberOf(in), slot >= 0 ? 2.5 : 9.0);
+    // Flags 1: the restore records no undo step.
+    QCOMPARE(f.doc.UndoNames().size(), steps);
+}
+
+void PickButtonTest::failedPickRestores()
+{
+    ToolFixture f;
+    Input *gain = f.AddNumber("Gain", 1.5, TagList{{kSaveIndex, 2}});
+    auto *owner = static_cast<TestControl *>(f.Bind(new TestControl, {gain}));
+    PickButton button(&f.page);
+    button.setGeometry(10, 200, 60, 24);
+    button.show();
+    button.SetOwner(owner);
+    button.SetPickEnabled(true);
+    QSignalSpy picked(&button, SIGNAL(Picked(QWidget *, QPoint)));
+    QTest::mousePress(&button, Qt::LeftButton, Qt::NoModifier, QPoint(5, 5));
+    QVERIFY(button.IsPicking());
+    QCOMPARE(button.cursor().shape(), Qt::CrossCursor);
+    Set(gain, 7.0);
+    // Released far outside every window of the application.
+    QTest::mouseRelease(&button, Qt::LeftButton, Qt::NoModifier, QPoint(-5000, -5000));
+    QVERIFY(!button.IsPicking());
+    QVERIFY(!button.testAttribute(Qt::WA_SetCursor));
+    QCOMPARE(f.NumberOf(gain), 1.5);
+    QCOMPARE(picked.count(), 0);
+}
+
+void PickButtonTest::pickOverWidgetNotifiesIt()
+{
+    ToolFixture f;
+    Input *gain = f.AddNumber("Gain", 1.5, TagList{{kSaveIndex, 2}});
+    auto *owner = static_cast<TestControl *>(f.Bind(new TestControl, {gain}));
+    PickTarget target(&f.page);
+    target.setGeometry(100, 300, 120, 80);
+    target.show();
+    PickButton button(&f.page);
+    button.setGeometry(10, 200, 60, 24);
+    button.show();
+    button.SetOwner(owner);
+    button.SetPickEnabled(true);
+    QSignalSpy picked(&button, SIGNAL(Picked(QWidget *, QPoint)));
+    QTest::mousePress(&button, Qt::LeftButton, Qt::NoModifier, QPoint(5, 5));
+    Set(gain, 7.0);
+    const QPoint over = button.mapFrom(&f.page, target.geometry().topLeft() + QPoint(30, 20));
+    QTest::mouseRelease(&button, Qt::LeftButton, Qt::NoModifier, over);
+    QCOMPARE(picked.count(), 1);
+    QCOMPARE(picked.first().at(0).value<QWidget *>(), static_cast<QWidget *>(&target));
+    QCOMPARE(picked.first().at(1).toPoint(), QPoint(30, 20));
+    QTRY_COMPARE(target.notes.size(), 1);
+    QCOMPARE(target.notes.first().first, CCPickButton::kPickEvent);
+    QCOMPARE(target.notes.first().second, uint64(30) | uint64(20) << 16);
+    // A pick that found its widget keeps what the pick did.
+    QCOMPARE(f.NumberOf(gain), 7.0);
+}
+
+void PickButtonTest::disabledPickIsAPlainButton()
+{
+    PickButton button;
+    button.resize(60, 24);
+    QSignalSpy pressed(&button, SIGNAL(ButtonPressed(uint64, bool)));
+    QTest::mousePress(&button, Qt::LeftButton, Qt::NoModifier, QPoint(5, 5));
+    QVERIFY(!button.IsPicking());
+    QTest::mouseRelease(&button, Qt::LeftButton, Qt::NoModifier, QPoint(5, 5));
+    QCOMPARE(pressed.count(), 1);
+}
+
+void PickButtonTest::attachedObjectHeld()
+{
+    Operator *tool = new Operator("Held", "TestTool");
+    {
+        PickButton button;
+        button.Attach(tool);
+        QCOMPARE(tool->RefCount(), 2);
+        QCOMPARE(button.GetAttached(), static_cast<ScriptObject *>(tool));
+    }
+    QCOMPARE(tool->RefCount(), 1);
+    tool->DecRef();
+}
+
+QTEST_MAIN(PickButtonTest)
+#include "PickButtonTest.moc"
