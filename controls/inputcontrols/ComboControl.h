@@ -1,0 +1,85 @@
+#pragma once
+
+#include "inputcontrols/ComboItems.h"
+
+#include "orbane/AutoParam.h"
+#include "orbane/InputControl.h"
+
+namespace Orbane {
+
+class ElideLabel;
+class OrbComboBox;
+
+// Shows an Input as a drop-down list of items with a label. Registered
+// twice: the plain combo box (CLSID_InputControl_Combo), whose Input holds
+// the chosen item's value as a number, and the identifier variant
+// (CLSID_InputControl_ComboID), whose Input holds the chosen item's
+// identifier, as an identifier or, for a Text Input, as text. One class
+// serves both and tells them apart by the class ID it was created as.
+//
+// While the list is open, the item under the mouse or the keyboard is
+// written at once, so the user sees its effect before choosing; the choice
+// (or Escape, which puts the value back) ends that gesture as one undo step.
+class ComboControl : public InputControl
+{
+    Q_OBJECT
+public:
+    // Sent with every write, in the tag list that reaches each control of
+    // the Input: the chosen item's integer (0x18040000) where it is not 0,
+    // and its pointer (0x68040000) where it is not null.
+    static constexpr Tag CCA_ItemInteger = 0x100003e8;
+    static constexpr Tag CCAP_ItemPointer = 0x600003e8;
+
+    ComboControl(const Registry *reg, const ScriptVal &args, const TagList &tags);
+    ~ComboControl() override;
+
+    std::size_t SizeOf() const override { return sizeof(ComboControl); }
+    bool CopyAttr(Tag tag, void *out) override;
+    bool GetAttrsTagList(TagList &tags) const override;
+
+    using InputControl::SetAttrsTagList;
+    bool SetAttrsTagList(Input *input, const TagList &tags) override;
+    bool AddInput(Input *input, const TagList *tags) override;
+    bool Open(QWidget *host, const QRect &rect, const TagList *tags) override;
+    bool NotifyChanged(Input *input, Parameter *value, const TagList *tags) override;
+    bool UpdateDisplay(Input *input, const TagList *tags) override;
+    bool OnDisconnect(Input *input, const TagList *tags) override;
+
+    bool IsIDVariant() const;
+
+private slots:
+    void OnCombo(int row);
+    void TestCombo(int row);
+    void PopupShow();
+    void PopupHide();
+    void EndPopup();
+
+private:
+    void FillRows();
+    void ShowTexts();
+    int32 SelectionFor(const Parameter *value) const;
+    void Select(int row, bool final);
+    AutoParameter ValueOf(int32 index) const;
+    TagList ItemTags(int32 index) const;
+    bool Write(int32 index, float64 time);
+
+    ComboItems mItems;
+    int32 mSelection = -1;
+    bool mIsText = false;
+    bool mAlphaSort = false;
+    int32 mLabelPosition = 0;
+    // The list is open: highlighted items are written as previews.
+    bool mLivePreview = false;
+    // A preview write is running.
+    bool mPreviewing = false;
+    // The open list's gesture has not been ended by a choice yet.
+    bool mGesture = false;
+    bool mTextsChanged = false;
+    AutoParameter mBeforePopup;
+    OrbString mLabelText;
+    OrbString mSecondText;
+    ElideLabel *mLabel;
+    OrbComboBox *mCombo;
+};
+
+} // namespace Orbane

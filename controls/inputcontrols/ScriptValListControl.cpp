@@ -1,0 +1,178 @@
+#include "inputcontrols/ScriptValListControl.h"
+
+#include "framework/ListTags.h"
+#include "inputcontrols/ScriptValTreeWidget.h"
+
+#include "orbane/Input.h"
+
+#include <QHeaderView>
+#include <QLabel>
+#include <QStyle>
+#include <QStyleOptionViewItem>
+
+#include <algorithm>
+
+namespace Orbane {
+
+namespace {
+
+constexpr int32 kIndentation = 16;
+
+// A tree shorter than one row shows nothing at all.
+uint32 RowsFrom(const TagList &tags, uint32 def)
+{
+    return uint32(std::max<int64>(1, tags.GetLong(LC_Rows, def)));
+}
+
+} // namespace
+
+ScriptValListControl::ScriptValListControl(const Registry *reg, const ScriptVal &args, const TagList &tags)
+    : InputControl(reg, args, tags), mTree(new ScriptValTreeWidget(this)), mLabel(new QLabel(this))
+{
+    mRows = RowsFrom(tags, kDefaultRows);
+    mTree->setObjectName("list");
+    mLabel->setObjectName("label");
+    RegisterChild("list", mTree);
+    RegisterChild("label", mLabel);
+}
+
+ScriptValListControl::~ScriptValListControl() = default;
+
+bool ScriptValListControl::CopyAttr(Tag tag, void *out)
+{
+    if (tag == LC_Rows && out) {
+        *static_cast<int32 *>(out) = int32(mRows);
+        // False: the value was supplied.
+        return false;
+    }
+    return InputControl::CopyAttr(tag, out);
+}
+
+bool ScriptValListControl::GetAttrsTagList(TagList &tags) const
+{
+    InputControl::GetAttrsTagList(tags);
+    tags.Set(LINKS_Name, mLabelText);
+    tags.Set(LC_Rows, TagValue(mRows));
+    return true;
+}
+
+bool ScriptValListControl::SetAttrsTagList(Input *input, const TagList &tags)
+{
+    if (tags.FindQuery(LC_Rows)) {
+        mRows = RowsFrom(tags, mRows);
+        ApplyTreeHeight();
+    }
+    InputControl::SetAttrsTagList(input, tags);
+    if (TakeTexts(tags, mLabelText, mSecondText))
+        mTextsChanged = true;
+    if (mTextsChanged)
+        NotifyChanged(nullptr, nullptr, nullptr);
+    return true;
+}
+
+bool ScriptValListControl::AddInput(Input *input, const TagList *tags)
+{
+    if (!InputControl::AddInput(input, tags))
+        return false;
+    mLabelText = LabelOf(input);
+    mSecondText = SecondLabelOf(input);
+    return true;
+}
+
+void ScriptValListControl::SetupTree()
+{
+    mTree->setColumnCount(2);
+    mTree->setHeaderLabels({QString(), QString()});
+    mTree->setHeaderHidden(false);
+    mTree->setSortingEnabled(true);
+    mTree->sortByColumn(0, Qt::AscendingOrder);
+    mTree->setSelectionMode(QAbstractItemView::ExtendedSelection);
+    mTree->setSelectionBehavior(QAbstractItemView::SelectRows);
+    mTree->setIndentation(kIndentation);
+    mTree->setAlternatingRowColors(true);
+    // SetSize shares the width out itself, leaving room for a scroll bar.
+    mTree->header()->setStretchLastSection(false);
+}
+
+int32 ScriptValListControl::RowHeight() const
+{
+    QStyleOptionViewItem item;
+    item.initFrom(mTree);
+    item.font = mTree->font();
+    item.fontMetrics = mTree->fontMetrics();
+    item.features = QStyleOptionViewItem::HasDisplay;
+    item.text = QStringLiteral("Xy");
+    return mTree->style()->sizeFromContents(QStyle::CT_ItemViewItem, &item, QSize(), mTree).height();
+}
+
+void ScriptValListControl::Hold(Parameter *value)
+{
+    if (value != mHeldValue.get())
+        mHeldValue = AutoParameter(AutoRef<Parameter>::Share(value));
+}
+
+void ScriptValListControl::ApplyTreeHeight()
+{
+    if (Layout::LayoutObj *list = FindLayoutObj("list")) {
+        const int32 height = 2 * mTree->frameWidth() + RowHeight() * int32(mRows);
+        list->SetAttrs(TagList{{INPA_LayoutHeight, height}});
+    }
+}
+
+bool ScriptValListControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
+{
+    if (!InputControl::Open(host, rect, tags))
+        return false;
+    mLabel->setText(QString::fromStdString(mLabelText.str()));
+    mLabel->setAlignment(Qt::AlignLeft);
+    mLabel->setWordWrap(false);
+    mLabel->show();
+    SetupTree();
+    mTree->show();
+    if (Input *in = GetCurrentInput()) {
+        const AutoParameter now(in->GetValue(GetCurrentTime()));
+        Hold(now);
+    }
+    LoadLayout("Controls.ScriptValList.Layout");
+    ApplyTreeHeight();
+    mTextsChanged = false;
+    // The tree shows the value from the start, not from the first change.
+    UpdateDisplay(GetCurrentInput(), nullptr);
+    return true;
+}
+
+bool ScriptValListControl::SetSize(int32 &width, int32 &height, const TagList *tags)
+{
+    const bool sized = InputControl::SetSize(width, height, tags);
+    const int32 room =
+        mTree->width() - 2 * mTree->frameWidth() - mTree->style()->pixelMetric(QStyle::PM_ScrollBarExtent);
+    const int32 keys = room * 2 / 5;
+    mTree->setColumnWidth(0, keys);
+    mTree->setColumnWidth(1, room - keys);
+    return sized;
+}
+
+bool ScriptValListControl::NotifyChanged(Input *input, Parameter *value, const TagList *tags)
+{
+    // No gate: a table may change inside while the parameter stays the same.
+    if (value)
+        Hold(value);
+    return InputControl::NotifyChanged(input, value, tags);
+}
+
+bool ScriptValListControl::UpdateDisplay(Input *input, const TagList *tags)
+{
+    if (IsOpen()) {
+        mTree->clear();
+        const AutoParameter held = mHeldValue;
+        if (const auto *table = dynamic_cast<const ScriptValParam *>(held.get()); table && table->Value.IsTable())
+            mTree->Fill(mTree->invisibleRootItem(), table->Value, false);
+        if (mTextsChanged) {
+            mLabel->setText(QString::fromStdString(mLabelText.str()));
+            mTextsChanged = false;
+        }
+    }
+    return InputControl::UpdateDisplay(input, tags);
+}
+
+} // namespace Orbane

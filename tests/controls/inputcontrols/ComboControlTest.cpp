@@ -1,0 +1,561 @@
+#include "ToolFixture.h"
+
+#include "orbane/AutoParam.h"
+#include "orbane/ClassIDs.h"
+#include "orbane/ElideLabel.h"
+#include "orbane/Input.h"
+#include "orbane/InputWatcher.h"
+#include "orbane/InspectorPanel.h"
+#include "orbane/Operator.h"
+#include "orbane/OrbComboBox.h"
+#include "orbane/Registry.h"
+
+#include <QAbstractItemView>
+#include <QtTest>
+
+using namespace Orbane;
+using namespace Orbane::Test;
+
+Q_DECLARE_METATYPE(Orbane::TagList)
+
+namespace {
+
+constexpr Tag kLabelPosition = 0x10050000;
+constexpr Tag kAlphaSort = 0x10050001;
+constexpr Tag kAddString = 0x38040000;
+constexpr Tag kAddSeparator = 0x38040001;
+constexpr Tag kItemInteger = 0x18040000;
+constexpr Tag kItemValue = 0x28030000;
+constexpr Tag kItemPointer = 0x68040000;
+constexpr Tag kItemID = 0x88030000;
+constexpr Tag kWrittenInteger = 0x100003e8;
+constexpr Tag kWrittenPointer = 0x600003e8;
+// The value Inputs start at: no item has it, so every first choice writes.
+constexpr float64 kNoItem = -7.0;
+
+OrbComboBox *ComboOf(const InputControl *c)
+{
+    return c->findChild<OrbComboBox *>("combo");
+}
+
+ElideLabel *LabelOf(const InputControl *c)
+{
+    return c->findChild<ElideLabel *>("label");
+}
+
+QStringList RowTexts(const OrbComboBox *combo)
+{
+    QStringList rows;
+    for (int row = 0; row < combo->count(); ++row)
+        rows << (combo->ItemIndexOf(row) >= 0 && combo->itemText(row).isEmpty() ? "-" : combo->itemText(row));
+    return rows;
+}
+
+// The items "A", a separator, "B", "C".
+TagList ABC(TagList more = TagList())
+{
+    TagList attrs{{kAddString, "A"}, {kAddSeparator, ""}, {kAddString, "B"}, {kAddString, "C"}};
+    attrs.Append(more);
+    return attrs;
+}
+
+Input *AddID(ToolFixture &f, const char *id, const OrbID &type, const char *value, const TagList &attrs)
+{
+    AutoParameter def;
+    if (type == CLSID_DataType_Text)
+        def = AutoParameter(AutoText(OrbString(value)));
+    else
+        def = AutoParameter(AutoOrbIDParam(OrbID(value)));
+    return f.tool->AddInput(OrbID(id), id, type, attrs, def);
+}
+
+OrbString IDOf(const ToolFixture &f, Input *in)
+{
+    const AutoParameter value(in->GetValue(f.doc.GetCurrentTime()));
+    if (const auto *text = dynamic_cast<const Text *>(value.get()))
+        return text->Value;
+    if (const auto *id = dynamic_cast<const OrbIDParam *>(value.get()))
+        return OrbString(id->Value.str());
+    return OrbString("<none>");
+}
+
+QPoint RowCentre(const OrbComboBox *combo, int row)
+{
+    const QAbstractItemView *view = combo->view();
+    return view->visualRect(view->model()->index(row, 0)).center();
+}
+
+// Opens the list and clicks a row, as the user picks an item.
+void Pick(OrbComboBox *combo, int row)
+{
+    combo->showPopup();
+    QTest::mouseClick(combo->view()->viewport(), Qt::LeftButton, Qt::NoModifier, RowCentre(combo, row));
+    QCoreApplication::processEvents();
+}
+
+// Keeps the tags of the last write an Input told its watchers of.
+class TagWatcher : public InputWatcher
+{
+public:
+    explicit TagWatcher(Input *in) : mInput(in) { in->AttachWatcher(this); }
+    ~TagWatcher() override { mInput->DetachWatcher(this); }
+    void OnInputChanged(Input *, Parameter *, const TagList *tags) override
+    {
+        ++calls;
+        last = tags ? *tags : TagList();
+    }
+    int calls = 0;
+    TagList last;
+
+private:
+    Input *mInput;
+};
+
+} // namespace
+
+class ComboControlTest : public QObject
+{
+    Q_OBJECT
+private slots:
+    void initTestCase();
+    void itemValues_data();
+    void itemValues();
+    void nearestItem_data();
+    void nearestItem();
+    void identifiers_data();
+    void identifiers();
+    void choosingTheSelectedItemWritesNothing();
+    void keyboardChoosesAtOnce();
+    void livePreview_data();
+    void livePreview();
+    void removedWhileOpen();
+    void writesCarryItemTags_data();
+    void writesCarryItemTags();
+    void disconnectWrite_data();
+    void disconnectWrite();
+    void alphaSort_data();
+    void alphaSort();
+    void labelPosition_data();
+    void labelPosition();
+    void inspectorBuildsBothVariants();
+};
+void ComboControlTest::initTestCase()
+{
+    std::string error;
+    QVERIFY2(ToolFixture::LoadControls(&error), error.c_str());
+}
+
+void ComboControlTest::itemValues_data()
+{
+    QTest::addColumn<TagList>("attrs");
+    QTest::addColumn<QStringList>("rows");
+    QTest::addColumn<QList<double>>("values"); // written by picking each row in turn; NaN: a separator
+    const double sep = qQNaN();
+    QTest::newRow("separator does not count") << TagList{{kAddString, "A"}, {kAddSeparator, ""}, {kAddString, "B"}}
+                                              << QStringList{"A", "-", "B"} << QList<double>{0, sep, 1};
+    QTest::newRow("explicit value keeps the ordinal")
+        << TagList{{kAddString, "A"}, {kItemValue, 10.0}, {kAddString, "B"}} << QStringList{"A", "B"}
+        << QList<double>{10, 1};
+    QTest::newRow("value after a separator belongs to nobody")
+        << TagList{{kAddString, "A"}, {kAddSeparator, ""}, {kItemValue, 5.0}, {kAddString, "B"}}
+        << QStringList{"A", "-", "B"} << QList<double>{0, sep, 1};
+    QTest::newRow("value before any item is skipped")
+        << TagList{{kItemValue, 5.0}, {kAddString, "A"}, {kAddString, "B"}, {kItemValue, -2.5}} << QStringList{"A", "B"}
+        << QList<double>{0, -2.5};
+    QTest::newRow("leading separators") << TagList{{kAddSeparator, ""}, {kAddSeparator, ""}, {kAddString, "A"}}
+                                        << QStringList{"-", "-", "A"} << QList<double>{sep, sep, 0};
+    QTest::newRow("other attributes are skipped")
+        << TagList{{0x30040000, "Mode"}, {kAddString, "A"}, {0x30020014, "x"}, {kAddString, "B"}}
+        << QStringList{"A", "B"} << QList<double>{0, 1};
+}
+
+void ComboControlTest::itemValues()
+{
+    QFETCH(TagList, attrs);
+    QFETCH(QStringList, rows);
+    QFETCH(QList<double>, values);
+    ToolFixture f;
+    Input *in = f.AddNumber("Mode", kNoItem, attrs);
+    InputControl *c = f.Create(CLSID_InputControl_Combo, {in});
+    QVERIFY(c);
+    OrbComboBox *combo = ComboOf(c);
+    QCOMPARE(RowTexts(combo), rows);
+    QCOMPARE(combo->currentIndex(), -1);
+    for (int row = 0; row < values.size(); ++row) {
+        if (qIsNaN(values[row]))
+            continue;
+        Pick(combo, row);
+        QCOMPARE(f.NumberOf(in), values[row]);
+        QCOMPARE(combo->currentIndex(), row);
+    }
+}
+
+void ComboControlTest::nearestItem_data()
+{
+    QTest::addColumn<TagList>("attrs");
+    QTest::addColumn<double>("value");
+    QTest::addColumn<QString>("shown");
+    const TagList ab{{kAddString, "A"}, {kAddString, "B"}};
+    QTest::newRow("1.4 picks 1") << ABC() << 1.4 << "B";
+    QTest::newRow("1.6 picks 2") << ABC() << 1.6 << "C";
+    QTest::newRow("0.6 picks 1") << ABC() << 0.6 << "B";
+    QTest::newRow("1.6 past the last") << ab << 1.6 << "";
+    QTest::newRow("exact") << ab << 1.0 << "B";
+    QTest::newRow("-0.49") << ab << -0.49 << "A";
+    QTest::newRow("halfway is too far") << ab << 0.5 << "";
+    QTest::newRow("separator value") << ABC() << -1000000.0 << "";
+    QTest::newRow("no items") << TagList{} << 0.0 << "";
+    QTest::newRow("equal distances: the first")
+        << TagList{{kAddString, "A"}, {kItemValue, 1.25}, {kAddString, "B"}, {kItemValue, 0.75}} << 1.0 << "A";
+    QTest::newRow("nearest of two within reach")
+        << TagList{{kAddString, "A"}, {kItemValue, 1.4}, {kAddString, "B"}, {kItemValue, 1.0}} << 1.1 << "B";
+}
+
+void ComboControlTest::nearestItem()
+{
+    QFETCH(TagList, attrs);
+    QFETCH(double, value);
+    QFETCH(QString, shown);
+    ToolFixture f;
+    Input *in = f.AddNumber("Mode", kNoItem, attrs);
+    InputControl *c = f.Create(CLSID_InputControl_Combo, {in});
+    OrbComboBox *combo = ComboOf(c);
+    QCOMPARE(combo->currentIndex(), -1);
+    // A change of the Input selects; the value itself stays as it is.
+    QVERIFY(in->SetValue(AutoNumber(value), f.doc.GetCurrentTime()));
+    QCOMPARE(combo->currentText(), shown);
+    QCOMPARE(f.NumberOf(in), value);
+    // Open reads the same from the start.
+    InputControl *second = f.Create(CLSID_InputControl_Combo, {in});
+    QCOMPARE(ComboOf(second)->currentText(), shown);
+}
+
+void ComboControlTest::identifiers_data()
+{
+    QTest::addColumn<QString>("type");
+    QTest::addColumn<QString>("start");
+    QTest::addColumn<QString>("shown");
+    QTest::addColumn<int>("pick"); // a row
+    QTest::addColumn<QString>("written");
+    for (const char *type : {"ID", "Text"}) {
+        const QString t(type);
+        QTest::addRow("%s: identifier given", type) << t << "over"
+                                                    << "Over" << 0 << "add";
+        QTest::addRow("%s: text is the identifier", type) << t << "Multiply"
+                                                          << "Multiply" << 4 << "screen";
+        QTest::addRow("%s: unknown identifier", type) << t << "dissolve"
+                                                      << "" << 4 << "screen";
+        QTest::addRow("%s: empty never matches a separator", type) << t << ""
+                                                                   << "" << 3 << "Multiply";
+    }
+}
+
+void ComboControlTest::identifiers()
+{
+    QFETCH(QString, type);
+    QFETCH(QString, start);
+    QFETCH(QString, shown);
+    QFETCH(int, pick);
+    QFETCH(QString, written);
+    ToolFixture f;
+    const TagList attrs{{kAddString, "Add"},      {kItemID, OrbID("add")},   {kAddString, "Over"},
+                        {kItemID, OrbID("over")}, {kAddSeparator, ""},       {kAddString, "Multiply"},
+                        {kAddString, "Screen"},   {kItemID, OrbID("screen")}};
+    const OrbID dataType = type == "Text" ? CLSID_DataType_Text : CLSID_DataType_ID;
+    Input *in = AddID(f, "Apply", dataType, "", attrs);
+    InputControl *c = f.Create(CLSID_InputControl_ComboID, {in});
+    QVERIFY(c);
+    QCOMPARE(c->GetRegistry()->ClassID(), CLSID_InputControl_ComboID);
+    OrbComboBox *combo = ComboOf(c);
+    QCOMPARE(RowTexts(combo), (QStringList{"Add", "Over", "-", "Multiply", "Screen"}));
+    AutoParameter value;
+    if (type == "Text")
+        value = AutoParameter(AutoText(OrbString(start.toStdString())));
+    else
+        value = AutoParameter(AutoOrbIDParam(OrbID(start.toStdString())));
+    in->SetValue(value, f.doc.GetCurrentTime());
+    QCOMPARE(combo->currentText(), shown);
+    QCOMPARE(combo->currentIndex() < 0, shown.isEmpty());
+    Pick(combo, pick);
+    QCOMPARE(QString::fromStdString(IDOf(f, in).str()), written);
+    const AutoParameter now(in->GetValue(f.doc.GetCurrentTime()));
+    QCOMPARE(now->DataType(), dataType);
+}
+
+void ComboControlTest::choosingTheSelectedItemWritesNothing()
+{
+    ToolFixture f;
+    Input *in = f.AddNumber("Mode", 1.0, ABC());
+    InputControl *c = f.Create(CLSID_InputControl_Combo, {in});
+    OrbComboBox *combo = ComboOf(c);
+    QCOMPARE(combo->currentText(), QString("B"));
+    TagWatcher watcher(in);
+    Pick(combo, 2);
+    QCOMPARE(watcher.calls, 0);
+    QVERIFY(f.doc.UndoNames().isEmpty());
+    QCOMPARE(f.doc.UndoDepth(), 0);
+    // Return on the shown row neither.
+    combo->showPopup();
+    QTest::keyClick(combo->view(), Qt::Key_Return);
+    QCoreApplication::processEvents();
+    QVERIFY(!combo->IsPopupVisible());
+    QCOMPARE(watcher.calls, 0);
+    QVERIFY(f.doc.UndoNames().isEmpty());
+    QCOMPARE(f.doc.UndoDepth(), 0);
+    QCOMPARE(f.NumberOf(in), 1.0);
+}
+
+void ComboControlTest::keyboardChoosesAtOnce()
+{
+    ToolFixture f;
+    Input *in = f.AddNumber("Mode", 0.0, ABC({{0x30040000, "Blend Mode"}}));
+    InputControl *c = f.Create(CLSID_InputControl_Combo, {in});
+    OrbComboBox *combo = ComboOf(c);
+    combo->setFocus();
+    QTest::keyClick(combo, Qt::Key_Down); // past the separator
+    QCOMPARE(f.NumberOf(in), 1.0);
+    QTest::keyClick(combo, Qt::Key_End);
+    QCOMPARE(f.NumberOf(in), 2.0);
+    // Each key is one step, closed at once.
+    QCOMPARE(f.doc.UndoNames(), (QStringList{"Change Blend Mode", "Change Blend Mode"}));
+    QCOMPARE(f.doc.UndoDepth(), 0);
+    QVERIFY(f.doc.Undo());
+    QCOMPARE(f.NumberOf(in), 1.0);
+    QCOMPARE(combo->currentText(), QString("B"));
+}
+
+void ComboControlTest::livePreview_data()
+{
+    QTest::addColumn<QList<int>>("keys");
+    QTest::addColumn<QList<double>>("previews"); // the value after each key but the last
+    QTest::addColumn<double>("final");
+    QTest::addColumn<int>("steps");
+    const int down = Qt::Key_Down, up = Qt::Key_Up;
+    QTest::newRow("choose the previewed item") << QList<int>{down, Qt::Key_Return} << QList<double>{1} << 1.0 << 1;
+    QTest::newRow("preview two, choose the second")
+        << QList<int>{down, down, Qt::Key_Return} << QList<double>{1, 2} << 2.0 << 1;
+    QTest::newRow("preview and come back") << QList<int>{down, up, Qt::Key_Return} << QList<double>{1, 0} << 0.0 << 0;
+    QTest::newRow("escape puts the value back")
+        << QList<int>{down, down, Qt::Key_Escape} << QList<double>{1, 2} << 0.0 << 0;
+    QTest::newRow("escape without a preview") << QList<int>{Qt::Key_Escape} << QList<double>{} << 0.0 << 0;
+}
+
+void ComboControlTest::livePreview()
+{
+    QFETCH(QList<int>, keys);
+    QFETCH(QList<double>, previews);
+    QFETCH(double, final);
+    QFETCH(int, steps);
+    ToolFixture f;
+    Input *in = f.AddNumber("Mode", 0.0, ABC());
+    InputControl *c = f.Create(CLSID_InputControl_Combo, {in});
+    // A second control of the same Input follows every preview.
+    InputControl *other = f.Create(CLSID_InputControl_Combo, {in});
+    OrbComboBox *combo = ComboOf(c);
+    combo->showPopup();
+    QVERIFY(combo->IsPopupVisible());
+    for (int i = 0; i < keys.size(); ++i) {
+        QTest::keyClick(combo->view(), Qt::Key(keys[i]));
+        if (i < previews.size()) {
+            QCOMPARE(f.NumberOf(in), previews[i]);
+            QCOMPARE(ComboOf(other)->currentText(), QString("ABC").mid(int(previews[i]), 1));
+            // Still choosing: no step yet, nothing to undo.
+            QVERIFY(f.doc.UndoNames().isEmpty());
+        }
+    }
+    QCoreApplication::processEvents();
+    QVERIFY(!combo->IsPopupVisible());
+    QCOMPARE(f.NumberOf(in), final);
+    QCOMPARE(f.doc.UndoDepth(), 0);
+    QCOMPARE(f.doc.UndoNames().size(), steps);
+    QCOMPARE(ComboOf(c)->currentText(), QString("ABC").mid(int(final), 1));
+    if (steps) {
+        QVERIFY(f.doc.Undo());
+        QCOMPARE(f.NumberOf(in), 0.0);
+        QCOMPARE(combo->currentText(), QString("A"));
+    }
+}
+
+// The tool leaves the inspector while the user is still choosing.
+void ComboControlTest::removedWhileOpen()
+{
+    ToolFixture f;
+    Input *in = f.AddNumber("Mode", 0.0, ABC());
+    InputControl *c = f.Create(CLSID_InputControl_Combo, {in});
+    OrbComboBox *combo = ComboOf(c);
+    combo->showPopup();
+    QTest::keyClick(combo->view(), Qt::Key_Down);
+    QCOMPARE(f.NumberOf(in), 1.0);
+    f.Destroy(c);
+    QCoreApplication::processEvents();
+    // What the user saw is kept, as one step, and nothing is left open.
+    QCOMPARE(f.NumberOf(in), 1.0);
+    QCOMPARE(f.doc.UndoDepth(), 0);
+    QCOMPARE(f.doc.UndoNames(), QStringList{"Change Mode"});
+    QVERIFY(f.doc.Undo());
+    QCOMPARE(f.NumberOf(in), 0.0);
+}
+
+void ComboControlTest::writesCarryItemTags_data()
+{
+    QTest::addColumn<int>("pick");
+    QTest::addColumn<int>("integer");
+    QTest::addColumn<bool>("pointer");
+    QTest::newRow("integer and pointer") << 0 << 7 << true;
+    QTest::newRow("neither") << 1 << 0 << false;
+    QTest::newRow("zero integer is left out") << 2 << 0 << true;
+}
+
+void ComboControlTest::writesCarryItemTags()
+{
+    QFETCH(int, pick);
+    QFETCH(int, integer);
+    QFETCH(bool, pointer);
+    static int anchor = 0;
+    void *const address = &anchor;
+    for (bool idVariant : {false, true}) {
+        ToolFixture f;
+        const TagList attrs{{kAddString, "A"}, {kItemInteger, 7}, {kItemPointer, address}, {kAddString, "B"},
+                            {kAddString, "C"}, {kItemInteger, 0}, {kItemPointer, address}};
+        Input *in =
+            idVariant ? AddID(f, "Mode", CLSID_DataType_ID, "none", attrs) : f.AddNumber("Mode", kNoItem, attrs);
+        InputControl *c = f.Create(idVariant ? CLSID_InputControl_ComboID : CLSID_InputControl_Combo, {in});
+        TagWatcher watcher(in);
+        Pick(ComboOf(c), pick);
+        QCOMPARE(watcher.calls, 1);
+        QCOMPARE(watcher.last.FindQuery(kWrittenInteger), integer != 0);
+        QCOMPARE(watcher.last.GetLong(kWrittenInteger, 0), int64(integer));
+        QCOMPARE(watcher.last.GetPtr(kWrittenPointer, nullptr), pointer ? address : nullptr);
+    }
+}
+
+void ComboControlTest::disconnectWrite_data()
+{
+    QTest::addColumn<bool>("animated");
+    QTest::addColumn<double>("stored");
+    QTest::addColumn<double>("after");
+    QTest::addColumn<int>("steps");
+    QTest::newRow("the shown item's value") << false << 1.4 << 1.0 << 1;
+    QTest::newRow("equal value") << false << 2.0 << 2.0 << 0;
+    QTest::newRow("no item: 0") << false << 5.0 << 0.0 << 1;
+    QTest::newRow("no key at the disconnect time") << true << 1.4 << 1.4 << 0;
+}
+
+void ComboControlTest::disconnectWrite()
+{
+    QFETCH(bool, animated);
+    QFETCH(double, stored);
+    QFETCH(double, after);
+    QFETCH(int, steps);
+    ToolFixture f;
+    Input *in = f.AddNumber("Mode", stored, ABC());
+    in->SetAnimated(animated);
+    InputControl *c = f.Create(CLSID_InputControl_Combo, {in});
+    f.Destroy(c);
+    QCOMPARE(f.NumberOf(in), after);
+    QCOMPARE(int(in->KeyTimes().size()), animated ? 1 : 0);
+    // Written through the control's own SetInputs, as an edit; never left open.
+    QCOMPARE(f.doc.UndoNames().size(), steps);
+    QCOMPARE(f.doc.UndoDepth(), 0);
+}
+
+void ComboControlTest::alphaSort_data()
+{
+    QTest::addColumn<TagList>("attrs");
+    QTest::addColumn<QStringList>("rows");
+    QTest::addColumn<QString>("pick");
+    QTest::addColumn<double>("value");
+    QTest::newRow("case does not matter")
+        << TagList{{kAlphaSort, 1}, {kAddString, "beta"}, {kAddString, "Alpha"}, {kAddString, "gamma"}}
+        << QStringList{"Alpha", "beta", "gamma"} << "gamma" << 2.0;
+    QTest::newRow("numbers by value") << TagList{{kAlphaSort, 1},
+                                                 {kAddString, "Layer 10"},
+                                                 {kAddString, "Layer 2"},
+                                                 {kAddString, "layer 1"}}
+                                      << QStringList{"layer 1", "Layer 2", "Layer 10"} << "Layer 10" << 0.0;
+    QTest::newRow("separators keep their groups") << TagList{{kAlphaSort, 1},     {kAddString, "b"}, {kAddString, "a"},
+                                                             {kAddSeparator, ""}, {kAddString, "d"}, {kAddString, "c"}}
+                                                  << QStringList{"a", "b", "-", "c", "d"} << "c" << 3.0;
+    QTest::newRow("unsorted") << TagList{{kAddString, "b"}, {kAddString, "a"}} << QStringList{"b", "a"} << "a" << 1.0;
+}
+
+void ComboControlTest::alphaSort()
+{
+    QFETCH(TagList, attrs);
+    QFETCH(QStringList, rows);
+    QFETCH(QString, pick);
+    QFETCH(double, value);
+    ToolFixture f;
+    Input *in = f.AddNumber("Mode", kNoItem, attrs);
+    InputControl *c = f.Create(CLSID_InputControl_Combo, {in});
+    OrbComboBox *combo = ComboOf(c);
+    QCOMPARE(RowTexts(combo), rows);
+    // A row still writes its own item's value, wherever sorting put it.
+    Pick(combo, rows.indexOf(pick));
+    QCOMPARE(f.NumberOf(in), value);
+    QCOMPARE(combo->currentText(), pick);
+}
+
+void ComboControlTest::labelPosition_data()
+{
+    QTest::addColumn<int>("position");
+    QTest::addColumn<bool>("beside");
+    QTest::newRow("Horizontal") << 0 << true;
+    QTest::newRow("Vertical") << 1 << false;
+}
+
+void ComboControlTest::labelPosition()
+{
+    QFETCH(int, position);
+    QFETCH(bool, beside);
+    ToolFixture f;
+    for (int i = 0; i < 3; ++i) {
+        Input *in = f.AddNumber(("Mode" + std::to_string(i)).c_str(), 0.0,
+                                ABC({{kLabelPosition, position}, {0x30040000, "Blend"}}));
+        InputControl *c = f.Create(CLSID_InputControl_Combo, {in});
+        const QRect label = LabelOf(c)->geometry(), combo = ComboOf(c)->geometry();
+        QCOMPARE(LabelOf(c)->text(), QString("Blend"));
+        QVERIFY(label.isValid() && combo.isValid());
+        if (beside) {
+            QVERIFY(label.right() < combo.left());
+            QVERIFY(label.intersects(QRect(0, combo.top(), 10000, combo.height())));
+        } else {
+            QVERIFY(label.bottom() < combo.top());
+            QCOMPARE(combo.width(), ToolFixture::kWidth);
+        }
+    }
+    const char *item = position ? "Controls.Combo.Layout.Vertical" : "Controls.Combo.Layout.Horizontal";
+    QCOMPARE(InputControl::LayoutReadCount(item), 1);
+}
+
+// Both registrations through the inspector, as a tool file names them.
+void ComboControlTest::inspectorBuildsBothVariants()
+{
+    ToolFixture f;
+    Input *number = f.AddNumber("Mode", 0.0, ABC({{INPA_InputControl, OrbID("ComboControl")}}));
+    Input *id = AddID(f, "Apply", CLSID_DataType_ID, "B", ABC({{INPA_InputControl, OrbID("ComboIDControl")}}));
+    InspectorPanel panel(&f.doc);
+    panel.resize(360, 400);
+    panel.show();
+    QVERIFY(QTest::qWaitForWindowExposed(&panel));
+    panel.ShowTool(f.tool);
+    QCOMPARE(panel.Controls().size(), std::size_t(2));
+    InputControl *numberControl = panel.ControlsOf(number).front();
+    InputControl *idControl = panel.ControlsOf(id).front();
+    QCOMPARE(numberControl->GetRegistry()->ClassID(), CLSID_InputControl_Combo);
+    QCOMPARE(idControl->GetRegistry()->ClassID(), CLSID_InputControl_ComboID);
+    QCOMPARE(ComboOf(idControl)->currentText(), QString("B"));
+    Pick(ComboOf(numberControl), 3);
+    Pick(ComboOf(idControl), 0);
+    QCOMPARE(f.NumberOf(number), 2.0);
+    QCOMPARE(QString::fromStdString(IDOf(f, id).str()), QString("A"));
+    QCOMPARE(f.doc.UndoNames().size(), 2);
+    // Leaving the inspector writes what each showed: the values stay.
+    panel.ShowTool(nullptr);
+    QCOMPARE(f.NumberOf(number), 2.0);
+    QCOMPARE(QString::fromStdString(IDOf(f, id).str()), QString("A"));
+    QCOMPARE(f.doc.UndoNames().size(), 2);
+}
+
+QTEST_MAIN(ComboControlTest)
+#include "ComboControlTest.moc"
