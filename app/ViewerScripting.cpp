@@ -75,16 +75,15 @@ int ViewerPress(lua_State *L)
 int ViewerMove(lua_State *L)
 {
     const UiGesture g = UiGesture::Read(L, 1);
-    SendMouse(gWindow->Viewer(), QEvent::MouseMove, Position(L, 1, gWindow->Viewer()), Qt::NoButton, g.button,
-              g.mods);
+    SendMouse(gWindow->Viewer(), QEvent::MouseMove, Position(L, 1, gWindow->Viewer()), Qt::NoButton, g.button, g.mods);
     return 0;
 }
 
 int ViewerRelease(lua_State *L)
 {
     const UiGesture g = UiGesture::Read(L, 1);
-    SendMouse(gWindow->Viewer(), QEvent::MouseButtonRelease, Position(L, 1, gWindow->Viewer()), g.button,
-              Qt::NoButton, g.mods);
+    SendMouse(gWindow->Viewer(), QEvent::MouseButtonRelease, Position(L, 1, gWindow->Viewer()), g.button, Qt::NoButton,
+              g.mods);
     return 0;
 }
 

@@ -14,6 +14,8 @@ enum PrefTag : Tag
     PREF_ExportSplineMode = MakeTag(TAGTYPE_Long, TAGGROUP_Prefs, 0),
     // Whether a selection rectangle may pick points of several polylines.
     PREF_SelectPointsFromMultiPolies = MakeTag(TAGTYPE_Long, TAGGROUP_Prefs, 1),
+    // The image file the viewer shows (a comp's `image`); none: a checkerboard.
+    PREF_ViewerImage = MakeTag(TAGTYPE_String, TAGGROUP_Prefs, 2),
 };
 
 } // namespace Orbane

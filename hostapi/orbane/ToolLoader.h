@@ -19,7 +19,9 @@ class ScriptVal;
 //         tags = { CBC_TriState = true },          -- named tags of the control and overlay classes
 //         attrs = { [0x10050001] = 1 } },          -- any further Input attributes by number;
 //                                                  -- { { 0x38040000, "A" }, { 0x38040001, "" } }
-//                                                  -- gives them in this order (repeated tags)
+//                                                  -- gives them in this order (repeated tags);
+//                                                  -- an object tag given stops { {pos, r, g, b [, a]}, ... }
+//                                                  -- holds a Gradient
 //       ... } }
 // Data types: "Number", "Point" (default {x, y}), "Text", "ID", "ScriptVal".
 // Named tags go through the same tag maps as orbane.Create, so a misspelt

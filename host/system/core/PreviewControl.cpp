@@ -19,7 +19,8 @@ const OrbID PreviewControl::ClassID("PreviewControl");
 
 PreviewControl::PreviewControl(const Registry *reg, const ScriptVal &args, const TagList &tags)
     : Object(reg, args, tags)
-{}
+{
+}
 
 PreviewControl::~PreviewControl()
 {
@@ -205,8 +206,7 @@ void PreviewControl::GetFullName(char *buffer, int32 size, Input *input, const T
     if (!in)
         std::snprintf(buffer, std::size_t(size), "%s", name);
     else
-        std::snprintf(buffer, std::size_t(size), "%s.%s (%s)", tool ? tool->GetName() : "", in->GetID().c_str(),
-                      name);
+        std::snprintf(buffer, std::size_t(size), "%s.%s (%s)", tool ? tool->GetName() : "", in->GetID().c_str(), name);
 }
 
 // --- what overlays use of the base ---
@@ -290,11 +290,16 @@ OrbPoint PreviewControl::NudgeOffset(uint64 key, float64 stepX, float64 stepY, Q
     if (mods & Qt::ControlModifier)
         factor /= 10.0;
     switch (key) {
-    case Qt::Key_Left: return {-stepX * factor, 0.0};
-    case Qt::Key_Right: return {stepX * factor, 0.0};
-    case Qt::Key_Up: return {0.0, stepY * factor};
-    case Qt::Key_Down: return {0.0, -stepY * factor};
-    default: return {};
+    case Qt::Key_Left:
+        return {-stepX * factor, 0.0};
+    case Qt::Key_Right:
+        return {stepX * factor, 0.0};
+    case Qt::Key_Up:
+        return {0.0, stepY * factor};
+    case Qt::Key_Down:
+        return {0.0, -stepY * factor};
+    default:
+        return {};
     }
 }
 

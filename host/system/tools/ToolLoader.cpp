@@ -1,6 +1,7 @@
 #include "orbane/ToolLoader.h"
 
 #include "orbane/AutoRef.h"
+#include "orbane/Gradient.h"
 #include "orbane/Input.h"
 #include "orbane/LuaRuntime.h"
 #include "orbane/Operator.h"
@@ -56,6 +57,27 @@ bool RunDescription(const std::string &path, ScriptVal &out, std::string *error)
     return true;
 }
 
+// An object-typed attribute given as a list of stops { pos, r, g, b [, a] }
+// is a colour ramp (a slider's track gradient).
+bool AddGradientAttr(Tag tag, const ScriptVal &stops, TagList &tags, std::string *error)
+{
+    AutoRef<Gradient> ramp(new Gradient);
+    for (int32 i = 1; i <= stops.Length(); ++i) {
+        const ScriptVal *stop = stops.FindKeyConst(ScriptVal(i));
+        if (!stop || !stop->IsTable() || stop->Length() < 4) {
+            *error = "attrs: a gradient stop is { pos, r, g, b [, a] }";
+            return false;
+        }
+        auto at = [stop](int32 k, float64 def) {
+            const ScriptVal *v = stop->FindKeyConst(ScriptVal(k));
+            return v && v->IsNumber() ? v->GetNumber() : def;
+        };
+        ramp->AddStop(at(1, 0.0), GradientColor{at(2, 0.0), at(3, 0.0), at(4, 0.0), at(5, 1.0)});
+    }
+    tags.Add(tag, static_cast<ScriptObject *>(ramp.get()));
+    return true;
+}
+
 bool AddNumberedAttr(const ScriptVal &key, const ScriptVal &value, TagList &tags, std::string *error)
 {
     const Tag tag = Tag(key.GetNumber());
@@ -64,6 +86,8 @@ bool AddNumberedAttr(const ScriptVal &key, const ScriptVal &value, TagList &tags
         *error = std::string("attrs: keys are tag ids, got ") + key.TypeName();
         return false;
     }
+    if (type == TAGTYPE_Object && value.IsTable())
+        return AddGradientAttr(tag, value, tags, error);
     if (value.IsString())
         type == TAGTYPE_ID ? tags.Add(tag, OrbID(value.GetString())) : tags.Add(tag, value.GetString());
     else if (type == TAGTYPE_Double)

@@ -1,0 +1,212 @@
+#include "overlays/PointControl.h"
+
+#include "framework/PointTags.h"
+
+#include "orbane/AutoParam.h"
+#include "orbane/ControlCommands.h"
+#include "orbane/GPainter.h"
+#include "orbane/Input.h"
+#include "orbane/Point.h"
+#include "orbane/PreviewInfo.h"
+
+#include <cmath>
+
+namespace Orbane {
+
+PointControl::PointControl(const Registry *reg, const ScriptVal &args, const TagList &tags)
+    : PreviewControl(reg, args, tags)
+{
+    // A script's creation tags: the previous point and the grab offset.
+    PointControl::SetAttrsTagList(nullptr, tags);
+}
+
+PointControl::~PointControl()
+{
+    DetachFromInput(mPrevInput);
+}
+
+bool PointControl::CopyAttr(Tag tag, void *out)
+{
+    if (!out || (tag != PCA_GrabOffsetX && tag != PCA_GrabOffsetY))
+        return PreviewControl::CopyAttr(tag, out);
+    *static_cast<float64 *>(out) = tag == PCA_GrabOffsetX ? mGrabOffset.x : mGrabOffset.y;
+    // False: the value was supplied.
+    return false;
+}
+
+bool PointControl::GetAttrsTagList(TagList &tags) const
+{
+    if (mPrevInput)
+        tags.Set(PCID_PrevPoint, mPrevInput->GetID());
+    tags.Set(PCD_SetPrevPointX, mPrevValue.x);
+    tags.Set(PCD_SetPrevPointY, mPrevValue.y);
+    return true;
+}
+
+bool PointControl::SetAttrsTagList(Input *input, const TagList &tags)
+{
+    const Input *main = GetMainInput();
+    const Input *before = mPrevInput;
+    AttachToInput(mPrevInput, main ? main->GetOperator() : nullptr, tags, PCP_PrevPoint, PCID_PrevPoint, ATTACH_Watch,
+                  ATTACH_Watch);
+    if (!mPrevInput) {
+        mPrevValue.x = tags.GetDouble(PCD_SetPrevPointX, mDrawnPrev.x);
+        mPrevValue.y = tags.GetDouble(PCD_SetPrevPointY, mDrawnPrev.y);
+    } else if (mPrevInput != before) {
+        // The line is drawn to the linked point as it is now, not as it
+        // will be after its next change.
+        const AutoParameter prev(mPrevInput->GetValue(GetCurrentTime()));
+        NotifyChanged(mPrevInput, prev.get(), nullptr);
+    }
+    mGrabOffset.x = tags.GetDouble(PCA_GrabOffsetX, mGrabOffset.x);
+    mGrabOffset.y = tags.GetDouble(PCA_GrabOffsetY, mGrabOffset.y);
+    UpdateDisplay(nullptr, nullptr);
+    return PreviewControl::SetAttrsTagList(input, tags);
+}
+
+bool PointControl::RemoveInput(Input *input, const TagList *tags)
+{
+    const bool wasPrev = input && input == mPrevInput;
+    if (wasPrev)
+        DetachFromInput(mPrevInput);
+    return PreviewControl::RemoveInput(input, tags) || wasPrev;
+}
+
+void PointControl::NotifyChanged(Input *input, Parameter *value, const TagList *tags)
+{
+    if (!value)
+        return;
+    bool moved = false;
+    if (input && input == mPrevInput)
+        moved = Store(mPrevValue, value);
+    if (input && input == GetMainInput())
+        moved = Store(mValue, value) || moved;
+    else if (input != mPrevInput)
+        moved = true;
+    if (moved)
+        PreviewControl::NotifyChanged(input, value, tags);
+}
+
+void PointControl::SetActive(int32 active, const TagList *tags)
+{
+    PreviewControl::SetActive(active, tags);
+    if (active)
+        ActivateOverlaysOf(mPrevInput);
+}
+
+void PointControl::DrawControls(PreviewInfo *info, const TagList *tags)
+{
+    mDrawnPoint = mValue;
+    mDrawnPrev = mPrevValue;
+    if (info->DrawPass == 3)
+        return;
+    if (Graphics::GPainter *p = info->GetPainter()) {
+        const OrbPoint at = info->TransformOut(mDrawnPoint);
+        const float64 s = info->HandleScale;
+        p->Color(info->GetColor(OrbColor()), info->GetShadow(OrbColor()));
+        p->PushMatrix();
+        p->Translate(at.x, at.y);
+        p->Scale(s, s);
+        p->Begin(Graphics::GP_LineLoop);
+        p->Vertex(-HalfSize, -HalfSize);
+        p->Vertex(HalfSize, -HalfSize);
+        p->Vertex(HalfSize, HalfSize);
+        p->Vertex(-HalfSize, HalfSize);
+        p->End();
+        p->PopMatrix();
+        // A previous point given by tags alone has no handle to join.
+        if (mPrevInput) {
+            const OrbPoint prev = info->TransformOut(mDrawnPrev);
+            p->Begin(Graphics::GP_Lines);
+            p->Vertex(at.x, at.y);
+            p->Vertex(prev.x, prev.y);
+            p->End();
+        }
+    }
+    PreviewControl::DrawControls(info, tags);
+}
+
+DragType PointControl::ControlDown(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
+{
+    if (info->HotControl) {
+        // Pressed on another overlay: linked when that one edits our
+        // previous point.
+        if (mPrevInput && info->HotControl->GetMainInput() == mPrevInput)
+            mDragType = DRAG_Linked;
+    } else {
+        const OrbPoint offset = HandleOffset(*info);
+        if (Hits(offset, info->PickTolerance)) {
+            mGrabOffset = offset;
+            mDragType = DRAG_Handle;
+        }
+    }
+    return PreviewControl::ControlDown(info, mouse, tags);
+}
+
+void PointControl::ControlMove(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
+{
+    PreviewControl::ControlMove(info, mouse, tags);
+    if (mDragType != DRAG_Handle)
+        return;
+    const OrbPoint to(mGrabOffset.x / info->ViewWidth + info->MouseX, mGrabOffset.y / info->ViewHeight + info->MouseY);
+    if (!Moved(to.x, mValue.x) && !Moved(to.y, mValue.y))
+        return;
+    AutoPoint value(to.x, to.y, 0.0);
+    SetInputs(value.get(), GetCurrentTime(), 0, nullptr);
+}
+
+void PointControl::ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
+{
+    PreviewControl::ControlUp(info, mouse, tags);
+}
+
+uint64 PointControl::ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags)
+{
+    if (command == CCMD_GetInputAt) {
+        if (GetMainInput() && Hits(HandleOffset(*info), info->PickTolerance))
+            return uint64(reinterpret_cast<uintptr_t>(GetMainInput()));
+    } else if (command == CCMD_NeedsKey) {
+        return IsArrowKey(data) ? 1 : 0;
+    } else if (command == CCMD_KeyDown) {
+        const bool arrow = IsArrowKey(data);
+        if (arrow)
+            Nudge(*info, data);
+        PreviewControl::ControlCommand(info, command, data, tags);
+        return arrow ? 1 : 0;
+    } else if (command == CCMD_KeyUpAll) {
+        ResetUndo(nullptr);
+    }
+    return PreviewControl::ControlCommand(info, command, data, tags);
+}
+
+bool PointControl::Hits(OrbPoint offset, int32 tolerance) noexcept
+{
+    return std::fabs(std::trunc(offset.x)) < tolerance && std::fabs(std::trunc(offset.y)) < tolerance;
+}
+
+OrbPoint PointControl::HandleOffset(const PreviewInfo &info) const
+{
+    return info.TransformOut(mValue) - info.TransformOut(info.MouseX, info.MouseY);
+}
+
+// One image pixel of the image's width on both axes: the same step size
+// whichever way the point goes.
+void PointControl::Nudge(const PreviewInfo &info, uint64 key)
+{
+    const float64 step = 1.0 / info.ImageWidth;
+    const OrbPoint to = mValue + NudgeOffset(key, step, step, KeyModifiers());
+    AutoPoint value(to.x, to.y, 0.0);
+    SetInputs(value.get(), GetCurrentTime(), 0, nullptr);
+}
+
+// Takes the point's X and Y when either moved beyond the threshold.
+bool PointControl::Store(OrbPoint &copy, const Parameter *value)
+{
+    const auto *point = dynamic_cast<const Point *>(value);
+    if (!point || (!Moved(point->X, copy.x) && !Moved(point->Y, copy.y)))
+        return false;
+    copy = OrbPoint(point->X, point->Y);
+    return true;
+}
+
+} // namespace Orbane

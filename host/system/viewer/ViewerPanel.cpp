@@ -1,0 +1,307 @@
+#include "orbane/ViewerPanel.h"
+
+#include "QtGPainter.h"
+#include "ViewerBackdrop.h"
+
+#include "orbane/AutoParam.h"
+#include "orbane/ControlCommands.h"
+#include "orbane/Input.h"
+#include "orbane/Operator.h"
+#include "orbane/OrbaneDoc.h"
+#include "orbane/Registry.h"
+#include "orbane/RegistryList.h"
+#include "orbane/ScriptVal.h"
+
+#include <QAction>
+#include <QPainter>
+#include <QToolBar>
+
+#include <algorithm>
+#include <cmath>
+
+namespace Orbane {
+
+namespace {
+
+const QColor kBackground(36, 36, 36);
+constexpr float64 kMinZoom = 1.0 / 64.0, kMaxZoom = 64.0;
+// A wheel notch is 120 eighths of a degree.
+constexpr float64 kNotch = 120.0, kNotchFactor = 1.25;
+
+} // namespace
+
+ViewerPanel::ViewerPanel(OrbaneDoc *doc, QWidget *parent)
+    : QWidget(parent), mDoc(doc), mBackdrop(std::make_unique<ViewerBackdrop>())
+{
+    setMouseTracking(true);
+    setFocusPolicy(Qt::StrongFocus);
+    setMinimumSize(64, 64);
+    mInfo.SetCursorHandler([this](const QCursor *cursor) {
+        if (cursor)
+            setCursor(*cursor);
+        else
+            unsetCursor();
+    });
+    mToolBar = new QToolBar(this);
+    mToolBar->hide();
+    connect(doc, SIGNAL(toolRemoving(Orbane::Operator *)), this, SLOT(OnToolRemoving(Orbane::Operator *)));
+    connect(doc, SIGNAL(prefChanged(uint32)), this, SLOT(OnPrefChanged(uint32)));
+    connect(doc, SIGNAL(currentTimeChanged(float64)), this, SLOT(OnTimeChanged(float64)));
+    OnPrefChanged(PREF_ViewerImage);
+    FitImage();
+}
+
+ViewerPanel::~ViewerPanel()
+{
+    Clear();
+}
+
+// --- the tool ---
+
+void ViewerPanel::ShowTool(Operator *tool)
+{
+    if (tool == mTool)
+        return;
+    Clear();
+    mTool = tool;
+    if (tool)
+        for (Input *input : tool->Inputs())
+            for (const TagItem *item = input->GetAttrs().Find(INPA_PreviewControl); item;
+                 item = input->GetAttrs().FindNext(item))
+                if (PreviewControl *overlay = CreateOverlay(input, item->id.c_str()))
+                    mOverlays.push_back(overlay);
+    for (PreviewControl *overlay : mOverlays)
+        overlay->SetActive(1, nullptr);
+    BuildToolBar();
+    RequestRedraw();
+    emit toolShown(tool);
+}
+
+std::vector<PreviewControl *> ViewerPanel::OverlaysOf(const Input *input) const
+{
+    std::vector<PreviewControl *> found;
+    for (PreviewControl *overlay : mOverlays)
+        if (overlay->GetMainInput() == input)
+            found.push_back(overlay);
+    return found;
+}
+
+PreviewControl *ViewerPanel::CreateOverlay(Input *input, const char *classID)
+{
+    const TagList &attrs = input->GetAttrs();
+    const Registry *reg = ClassRegistry.FindScriptName(classID);
+    ScriptObject *obj = reg ? reg->New(ScriptVal(), attrs) : nullptr;
+    auto *overlay = dynamic_cast<PreviewControl *>(obj);
+    if (!overlay) {
+        qWarning("viewer: Input \"%s\" of tool \"%s\" names overlay class \"%s\", which %s", input->GetName(),
+                 mTool->GetName(), classID, obj ? "is no overlay" : "is unknown");
+        if (obj)
+            obj->DecRef();
+        return nullptr;
+    }
+    overlay->SetRedrawHandler([this](PreviewControl *) { RequestRedraw(); });
+    overlay->AddInput(input, &attrs);
+    overlay->SetAttrsTagList(input, attrs);
+    overlay->SetView(&mInfo, nullptr);
+    const AutoParameter value(input->GetValue(mDoc->GetCurrentTime()));
+    overlay->NotifyChanged(input, value.get(), nullptr);
+    return overlay;
+}
+
+// Unbinds and lets go of every overlay. A script may still hold one: it
+// must no longer reach this panel.
+void ViewerPanel::Clear()
+{
+    EndKeys();
+    for (PreviewControl *overlay : mDragging)
+        overlay->ControlUp(&mInfo, OrbPointI(mInfo.MouseInViewer()), nullptr);
+    mDragging.clear();
+    mHot = mHover = mLastPressed = mFollower = nullptr;
+    mInfo.HotControl = nullptr;
+    for (PreviewControl *overlay : mOverlays) {
+        overlay->SetRedrawHandler(nullptr);
+        const std::vector<Input *> inputs = overlay->Inputs();
+        for (Input *in : inputs)
+            overlay->RemoveInput(in, nullptr);
+        overlay->DecRef();
+    }
+    mOverlays.clear();
+    mMenuOwners.clear();
+    mTool = nullptr;
+}
+
+void ViewerPanel::BuildToolBar()
+{
+    mToolBar->clear();
+    for (PreviewControl *overlay : mOverlays) {
+        std::vector<PreviewControl::ToolbarEvent> events;
+        overlay->GetAvailableEvents(events, nullptr);
+        for (const PreviewControl::ToolbarEvent &e : events) {
+            QAction *action = mToolBar->addAction(QString::fromUtf8(e.label.c_str()));
+            const OrbID id = e.id;
+            connect(action, &QAction::triggered, this, [this, overlay, id]() {
+                if (IsOverlay(overlay))
+                    overlay->HandleEvent(id, &mInfo, nullptr);
+            });
+        }
+    }
+    mToolBar->adjustSize();
+    mToolBar->setVisible(!mToolBar->actions().isEmpty());
+}
+
+void ViewerPanel::OnToolRemoving(Operator *tool)
+{
+    if (tool == mTool)
+        ShowTool(nullptr);
+}
+
+// --- the image ---
+
+bool ViewerPanel::LoadImage(const QString &path)
+{
+    if (!mBackdrop->Load(path))
+        return false;
+    SetImage(mBackdrop->Image());
+    return true;
+}
+
+void ViewerPanel::SetImage(const QImage &image)
+{
+    mBackdrop->SetImage(image);
+    mUserView = false;
+    FitImage();
+    SendAll(CCMD_ImageChanged, 0);
+}
+
+bool ViewerPanel::HasImage() const
+{
+    return mBackdrop->HasImage();
+}
+
+QSize ViewerPanel::ImageSize() const
+{
+    return QSize(mBackdrop->Width(), mBackdrop->Height());
+}
+
+void ViewerPanel::OnPrefChanged(uint32 pref)
+{
+    if (pref != PREF_ViewerImage)
+        return;
+    const char *path = mDoc->GetPrefs().GetString(PREF_ViewerImage, "");
+    if (*path && !LoadImage(QString::fromUtf8(path)))
+        qWarning("viewer: cannot read the image \"%s\"", path);
+}
+
+void ViewerPanel::OnTimeChanged(float64)
+{
+    SendAll(CCMD_TimeChanged, 0);
+}
+
+// --- the view ---
+
+void ViewerPanel::FitImage()
+{
+    mUserView = false;
+    SetMapping(ViewMapping::Fitted(mBackdrop->Width(), mBackdrop->Height(), 1.0, width(), height()));
+}
+
+void ViewerPanel::SetView(float64 zoom, OrbPoint pan)
+{
+    mUserView = true;
+    SetMapping(ViewMapping::Centered(mBackdrop->Width(), mBackdrop->Height(), 1.0, zoom, width(), height(), pan));
+}
+
+void ViewerPanel::ZoomAbout(float64 zoom, OrbPoint anchor)
+{
+    mUserView = true;
+    SetMapping(Mapping().ZoomedAbout(std::clamp(zoom, kMinZoom, kMaxZoom), anchor));
+}
+
+void ViewerPanel::PanBy(OrbPoint delta)
+{
+    const ViewMapping &m = Mapping();
+    mUserView = true;
+    SetMapping(ViewMapping(m.ImageWidth(), m.ImageHeight(), m.PixelAspect(), m.Zoom(), m.Origin() + delta,
+                           m.ViewportHeight()));
+}
+
+float64 ViewerPanel::WheelZoom(float64 zoom, int32 angleDelta) noexcept
+{
+    return std::clamp(zoom * std::pow(kNotchFactor, angleDelta / kNotch), kMinZoom, kMaxZoom);
+}
+
+OrbPoint ViewerPanel::WidgetToImage(QPointF widget) const
+{
+    return Mapping().ToImage(Mapping().WidgetToViewer({widget.x(), widget.y()}));
+}
+
+QPointF ViewerPanel::ImageToWidget(OrbPoint image) const
+{
+    const OrbPoint w = Mapping().ViewerToWidget(Mapping().ToViewer(image));
+    return QPointF(w.x, w.y);
+}
+
+void ViewerPanel::SetMapping(const ViewMapping &mapping)
+{
+    if (mapping == Mapping())
+        return;
+    mInfo.SetMapping(mapping);
+    for (PreviewControl *overlay : mOverlays)
+        overlay->SetView(&mInfo, nullptr);
+    RequestRedraw();
+}
+
+void ViewerPanel::resizeEvent(QResizeEvent *event)
+{
+    QWidget::resizeEvent(event);
+    if (mUserView)
+        SetMapping(Mapping().WithViewportHeight(height()));
+    else
+        FitImage();
+}
+
+// --- painting ---
+
+void ViewerPanel::SendAll(const OrbID &command, uint64 data)
+{
+    const std::vector<PreviewControl *> overlays = mOverlays;
+    for (PreviewControl *overlay : overlays)
+        overlay->ControlCommand(&mInfo, command, data, nullptr);
+}
+
+void ViewerPanel::RequestRedraw()
+{
+    mDirty = true;
+    update();
+}
+
+void ViewerPanel::paintEvent(QPaintEvent *)
+{
+    QPainter qp(this);
+    qp.fillRect(rect(), kBackground);
+    mBackdrop->Paint(qp, Mapping(), devicePixelRatioF());
+    // Whole viewer units fall on pixel centres, so one-pixel handle lines
+    // at whole positions are crisp rather than smeared over two pixels.
+    qp.translate(0.5, 0.5);
+    {
+        Graphics::QtGPainter painter(&qp, height());
+        mInfo.SetPainter(&painter);
+        mInfo.HotControl = mHot;
+        mInfo.ShowDrag = mDragging.empty() ? 0 : 1;
+        DrawPass(1, false);
+        DrawPass(2, true);
+        mInfo.SetPainter(nullptr);
+    }
+    mDirty = false;
+    ++mPaintCount;
+}
+
+void ViewerPanel::DrawPass(int32 pass, bool active)
+{
+    mInfo.DrawPass = pass;
+    for (PreviewControl *overlay : mOverlays)
+        if (overlay->IsActive() == active)
+            overlay->DrawControls(&mInfo, nullptr);
+}
+
+} // namespace Orbane

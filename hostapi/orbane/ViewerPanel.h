@@ -1,0 +1,180 @@
+#pragma once
+
+#include "orbane/PreviewControl.h"
+#include "orbane/PreviewInfo.h"
+#include "orbane/TagList.h"
+#include "orbane/ViewMapping.h"
+
+#include <QImage>
+#include <QPointer>
+#include <QWidget>
+
+#include <map>
+#include <memory>
+#include <set>
+#include <vector>
+
+class QAction;
+class QMenu;
+class QToolBar;
+
+namespace Orbane {
+
+class Input;
+class Operator;
+class OrbaneDoc;
+class ViewerBackdrop;
+
+// Shows an image (or a checkerboard) with the overlays of one tool over it.
+//
+// The view: the image is fitted to the widget until the user zooms (the
+// wheel, about the mouse) or pans (middle drag); from then on the view stays
+// where the user put it. Everything is in logical pixels, so handles keep
+// their size at any device pixel ratio.
+//
+// Overlays: ShowTool creates, for each Input, the overlay classes it names
+// (INPA_PreviewControl) through the class registry, binds them (AddInput,
+// SetAttrsTagList with the Input's attributes, the current value) and
+// switches them on. Overlays of later Inputs lie above earlier ones: they
+// draw later and are asked first. Pass 1 draws the overlays that are
+// switched off, pass 2 those that are on, above them.
+//
+// The mouse: hovering asks each overlay CCMD_HitTest (bit 0: claimed, bit 1:
+// redraw) and repaints only when one asks. A left press goes to the overlays
+// in turn until one answers a drag type: that one is the hot control; the
+// others are then told of it and join the drag where they answer a drag
+// type too (a linked handle). Moves and the release go to every overlay in
+// the drag. Keys go to the overlay under the mouse, else the one pressed
+// last, else the first that claims them (CCMD_NeedsKey); it keeps them until
+// every key is up, when it is sent CCMD_KeyUpAll.
+class ViewerPanel : public QWidget
+{
+    Q_OBJECT
+public:
+    explicit ViewerPanel(OrbaneDoc *doc, QWidget *parent = nullptr);
+    ~ViewerPanel() override;
+
+    // --- the tool ---
+    void ShowTool(Operator *tool);
+    Operator *GetTool() const { return mTool; }
+    // In creation order (Input order), one reference each.
+    const std::vector<PreviewControl *> &Overlays() const { return mOverlays; }
+    std::vector<PreviewControl *> OverlaysOf(const Input *input) const;
+
+    // --- the image ---
+    // False where the file cannot be read; what was shown stays.
+    bool LoadImage(const QString &path);
+    // A null image shows the checkerboard.
+    void SetImage(const QImage &image);
+    bool HasImage() const;
+    QSize ImageSize() const;
+
+    // --- the view ---
+    const ViewMapping &Mapping() const { return mInfo.Mapping(); }
+    // The whole image, as large as fits.
+    void FitImage();
+    // The image centred at `zoom` (viewer units per image pixel), moved by
+    // `pan` viewer units.
+    void SetView(float64 zoom, OrbPoint pan = {});
+    // A new zoom keeping the image point under `anchor` (viewer units) in place.
+    void ZoomAbout(float64 zoom, OrbPoint anchor);
+    void PanBy(OrbPoint delta);
+    // The next zoom for a wheel turn of `angleDelta` eighths of a degree:
+    // a factor of 1.25 per notch, kept within 1/64 and 64.
+    static float64 WheelZoom(float64 zoom, int32 angleDelta) noexcept;
+    OrbPoint WidgetToImage(QPointF widget) const;
+    QPointF ImageToWidget(OrbPoint image) const;
+
+    // What every overlay call is given: tolerance, colours, Highlight.
+    PreviewInfo &Info() { return mInfo; }
+    // PCA_EventFlags of each press: PEF_StartGrab echoes where a drag began.
+    void SetPressFlags(uint32 flags) { mPressFlags = flags; }
+
+    // --- interaction ---
+    PreviewControl *HotControl() const { return mHot; }
+    PreviewControl *HoverControl() const { return mHover; }
+    // The overlay that holds the keys until every key is up.
+    PreviewControl *KeyControl() const { return mKeyOwner; }
+    // The overlay's point follows the mouse until the next click: applies
+    // `attrs` with PCA_FollowCursor set, then CCMD_FollowCursor. False where
+    // the overlay is not one of this viewer's.
+    bool BeginFollowCursor(PreviewControl *overlay, const TagList &attrs);
+    PreviewControl *Follower() const { return mFollower; }
+    // Builds the context menu of the position last seen, and acts on one of
+    // its actions: what a right click does, without running the menu.
+    void FillContextMenu(QMenu *menu);
+    bool TriggerMenuAction(QAction *action);
+    QToolBar *OverlayToolBar() const { return mToolBar; }
+    // The tip the overlays give at `widget`; empty where none.
+    QString TipAt(QPointF widget);
+    // How often the panel has painted itself.
+    int32 PaintCount() const { return mPaintCount; }
+
+signals:
+    void toolShown(Orbane::Operator *tool);
+
+protected:
+    void paintEvent(QPaintEvent *event) override;
+    void resizeEvent(QResizeEvent *event) override;
+    void mousePressEvent(QMouseEvent *event) override;
+    void mouseMoveEvent(QMouseEvent *event) override;
+    void mouseReleaseEvent(QMouseEvent *event) override;
+    void wheelEvent(QWheelEvent *event) override;
+    void keyPressEvent(QKeyEvent *event) override;
+    void keyReleaseEvent(QKeyEvent *event) override;
+    void focusOutEvent(QFocusEvent *event) override;
+    void contextMenuEvent(QContextMenuEvent *event) override;
+    bool event(QEvent *event) override;
+
+private slots:
+    void OnToolRemoving(Orbane::Operator *tool);
+    void OnPrefChanged(uint32 pref);
+    void OnTimeChanged(float64 time);
+
+private:
+    // ViewerPanel.cpp: tool, image, view, painting.
+    PreviewControl *CreateOverlay(Input *input, const char *classID);
+    void Clear();
+    void BuildToolBar();
+    void SetMapping(const ViewMapping &mapping);
+    void SendAll(const OrbID &command, uint64 data);
+    void RequestRedraw();
+    void DrawPass(int32 pass, bool active);
+    // ViewerPanelInput.cpp: the mouse, keys, menus and tips.
+    OrbPointI SetMouse(QPointF widget);
+    std::vector<PreviewControl *> ByPriority() const;
+    bool IsOverlay(const PreviewControl *overlay) const;
+    void Hover();
+    void Press(const TagList &tags);
+    void Drag();
+    void Release();
+    PreviewControl *UnderMouse();
+    PreviewControl *KeyTarget(int key);
+    void EndKeys();
+
+    OrbaneDoc *mDoc;
+    Operator *mTool = nullptr;
+    std::vector<PreviewControl *> mOverlays; // one reference each
+    std::unique_ptr<ViewerBackdrop> mBackdrop;
+    PreviewInfo mInfo;
+    bool mUserView = false; // the user zoomed or panned: keep the view on resize
+    uint32 mPressFlags = 0;
+
+    PreviewControl *mHot = nullptr;
+    PreviewControl *mHover = nullptr;
+    PreviewControl *mLastPressed = nullptr;
+    PreviewControl *mKeyOwner = nullptr;
+    PreviewControl *mFollower = nullptr;
+    std::vector<PreviewControl *> mDragging; // the hot control first, then linked ones
+    std::set<int> mHeldKeys;
+    QPointF mLastMouse;
+    bool mPanning = false;
+    QPointF mPanFrom;
+
+    std::map<QAction *, PreviewControl *> mMenuOwners;
+    QToolBar *mToolBar = nullptr;
+    bool mDirty = true;
+    int32 mPaintCount = 0;
+};
+
+} // namespace Orbane
