@@ -44,7 +44,7 @@ bool FallbackControl::AddInput(Input *input, const TagList *tags)
 {
     if (!InputControl::AddInput(input, tags))
         return false;
-    mLabel->setText(QString::fromUtf8(input->GetName()));
+    mLabel->setText(QString::fromUtf8(LabelOf(input).c_str()));
     mValue->setText(ValueText());
     return true;
 }

@@ -13,7 +13,6 @@
 #include "orbane/ScriptVal.h"
 #include "orbane/TagList.h"
 
-#include <QLabel>
 
 #include <gtest/gtest.h>
 
@@ -123,17 +122,6 @@ TEST(Factory, EveryClassHasATypeOfItsOwn)
     }
     EXPECT_EQ(classes, 47u);
     EXPECT_EQ(types.size(), classes);
-}
-
-TEST(Factory, UnwrittenInspectorControlShowsItsClassNameReadOnly)
-{
-    Held obj = Create("MultiButtonIDControl");
-    auto *widget = dynamic_cast<QWidget *>(obj.get());
-    ASSERT_NE(widget, nullptr);
-    const auto labels = widget->findChildren<QLabel *>();
-    ASSERT_EQ(labels.size(), 1);
-    EXPECT_EQ(labels.front()->text(), QString("MultiButtonControl"));
-    EXPECT_EQ(labels.front()->textInteractionFlags(), Qt::NoTextInteraction);
 }
 
 } // namespace

@@ -13,6 +13,7 @@
 #include "orbane/ScriptVal.h"
 #include "orbane/ToolLoader.h"
 
+#include <QLabel>
 #include <QRegularExpression>
 #include <QTest>
 
@@ -113,6 +114,27 @@ private slots:
         QCOMPARE(fallback->ValueText(), QString("0.25"));
         tool->FindInput("Gain")->SetValue(AutoNumber(0.5).get(), 0.0);
         QCOMPARE(fallback->ValueText(), QString("0.5"));
+    }
+
+    // A registered class whose control is not written yet still shows its
+    // Input read-only, without a warning: the class is known.
+    void unwrittenControlShowsItsInputReadOnly()
+    {
+        OrbaneDoc doc;
+        std::string why;
+        Operator *tool = AddTool(doc, R"(return { inputs = {
+            { id = "Mode", name = "Blend Mode", type = "Number", default = 3, control = "MultiButtonControl" } }})",
+                                 "Tool1", &why);
+        QVERIFY2(tool, why.c_str());
+        InspectorPanel panel(&doc);
+        panel.ShowTool(tool);
+        auto *fallback = dynamic_cast<FallbackControl *>(panel.Controls().front());
+        QVERIFY(fallback);
+        QCOMPARE(fallback->ScriptTypeName(), "MultiButtonControl");
+        QCOMPARE(fallback->ValueText(), QString("3"));
+        const auto labels = fallback->findChildren<QLabel *>();
+        QCOMPARE(labels.size(), 2);
+        QCOMPARE(labels.front()->text(), QString("Blend Mode"));
     }
 
     // Removing the tool unbinds every control: nothing watches its Inputs.
