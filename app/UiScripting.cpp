@@ -212,9 +212,12 @@ int Move(lua_State *L)
 {
     QWidget *w = TargetOrRaise(L, 1);
     const UiGesture g = UiGesture::Read(L, 2);
-    lua_getfield(L, 2, "button");
-    const bool hover = lua_isstring(L, -1) && QByteArray(lua_tostring(L, -1)) == "none";
-    lua_pop(L, 1);
+    bool hover = false;
+    if (lua_istable(L, 2)) {
+        lua_getfield(L, 2, "button");
+        hover = lua_isstring(L, -1) && QByteArray(lua_tostring(L, -1)) == "none";
+        lua_pop(L, 1);
+    }
     SendMouse(w, QEvent::MouseMove, g.At(w), Qt::NoButton, hover ? Qt::NoButton : g.button, g.mods);
     return 0;
 }
@@ -233,9 +236,12 @@ int Drag(lua_State *L)
 {
     QWidget *w = TargetOrRaise(L, 1);
     const UiGesture from = UiGesture::Read(L, 2), to = UiGesture::Read(L, 3), opts = UiGesture::Read(L, 4);
-    lua_getfield(L, 4, "steps");
-    const int steps = lua_isnumber(L, -1) ? qMax(1, int(lua_tointeger(L, -1))) : 10;
-    lua_pop(L, 1);
+    int steps = 10;
+    if (lua_istable(L, 4)) {
+        lua_getfield(L, 4, "steps");
+        steps = lua_isnumber(L, -1) ? qMax(1, int(lua_tointeger(L, -1))) : steps;
+        lua_pop(L, 1);
+    }
     const QPoint a = from.At(w), b = to.At(w);
     SendMouse(w, QEvent::MouseButtonPress, a, opts.button, opts.button, opts.mods);
     for (int i = 1; i <= steps; ++i)

@@ -7,6 +7,7 @@
 #include "inputcontrols/CheckBoxControl.h"
 #include "inputcontrols/ComboControl.h"
 #include "inputcontrols/ScriptValListControl.h"
+#include "inputcontrols/SliderControl.h"
 #include "overlays/CrosshairControl.h"
 #include "overlays/PointControl.h"
 
@@ -66,7 +67,6 @@ ORBANE_PENDING_PREVIEW(PositionerControl);
 ORBANE_PENDING_INPUT(RangeControl);
 ORBANE_PENDING_PREVIEW(RectangleControl);
 ORBANE_PENDING_INPUT(ScrewControl);
-ORBANE_PENDING_INPUT(SliderControl);
 ORBANE_PENDING_DERIVED(SliderOverlay, OverlayControl);
 ORBANE_PENDING_INPUT(SplineControl);
 ORBANE_PENDING_PREVIEW(TrackerControl);

@@ -371,9 +371,10 @@ void CustomSlider::PaintTrack(QPainter &painter, int32 knobY)
         StoreImage(mTrack, nullptr);
         mTrack = new DIB(key.width, image->Height(), key.ratio);
         mTrack->FillStretched(*image, QMargins((image->Width() - 2) / 2, 0, (image->Width() - 2) / 2, 0));
+        // The gradient reads its pixel range from the key: store it first.
+        mTrackKey = key;
         if (mGradient)
             PaintGradient(*mTrack);
-        mTrackKey = key;
     }
     const int32 knobHeight = mKnobImage ? mKnobImage->Height() : 0;
     const int32 y = knobY + (knobHeight - mTrack->Height()) / 2;

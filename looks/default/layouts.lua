@@ -97,9 +97,11 @@ return {
         { kind = "vbox", spacing = 1,
             { kind = "hbox", spacing = 6,
                 { name = "label", stretch = 1 },
-                { name = "edit", width = 72 },
+                -- Room for a time code, "00:00:01:12".
+                { name = "edit", width = 84 },
             },
-            { name = "slider" },
+            -- The knob (14) over the reset marker (5), with a row to spare.
+            { name = "slider", height = 20 },
             { kind = "grid", hspacing = 4, vspacing = 0, colstretch = { 1, 1, 1 },
                 { name = "minlabel", row = 1, col = 1, align = "left|vcenter" },
                 { name = "midlabel", row = 1, col = 2, align = "hcenter|vcenter" },
