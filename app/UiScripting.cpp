@@ -1,6 +1,7 @@
 #include "UiScripting.h"
 
 #include "MainWindow.h"
+#include "ScriptHands.h"
 #include "UiTarget.h"
 #include "ViewerScripting.h"
 
@@ -30,23 +31,16 @@ namespace Orbane {
 
 namespace {
 
+using Hands = ScriptHands;
+
 OrbaneDoc *gDoc = nullptr;
 MainWindow *gWindow = nullptr;
-
-// Raises a Lua error with the script's file and line.
-int Raise(lua_State *L, const QString &message)
-{
-    luaL_where(L, 1);
-    lua_pushstring(L, message.toUtf8().constData());
-    lua_concat(L, 2);
-    return lua_error(L);
-}
 
 QWidget *TargetOrRaise(lua_State *L, int idx, InputControl **control = nullptr)
 {
     UiTarget t = UiTarget::Resolve(L, idx, gWindow);
     if (!t.widget)
-        Raise(L, t.error);
+        Hands::Raise(L, t.error);
     if (control)
         *control = t.control;
     return t.widget;
@@ -56,10 +50,10 @@ Input *InputOrRaise(lua_State *L)
 {
     Operator *tool = gDoc->FindTool(luaL_checkstring(L, 1));
     if (!tool)
-        Raise(L, QString("no tool \"%1\"").arg(lua_tostring(L, 1)));
+        Hands::Raise(L, QString("no tool \"%1\"").arg(lua_tostring(L, 1)));
     Input *input = tool->FindInput(OrbID(luaL_checkstring(L, 2)));
     if (!input)
-        Raise(L, QString("tool \"%1\" has no Input \"%2\"").arg(lua_tostring(L, 1), lua_tostring(L, 2)));
+        Hands::Raise(L, QString("tool \"%1\" has no Input \"%2\"").arg(lua_tostring(L, 1), lua_tostring(L, 2)));
     return input;
 }
 
@@ -83,7 +77,7 @@ int LoadComp(lua_State *L)
 {
     std::string why;
     if (!ToolLoader::LoadComp(*gDoc, luaL_checkstring(L, 1), &why))
-        return Raise(L, QString::fromStdString(why));
+        return Hands::Raise(L, QString::fromStdString(why));
     if (!gDoc->Tools().empty())
         gWindow->ShowTool(QString::fromUtf8(gDoc->Tools().front()->GetName()));
     return 0;
@@ -94,9 +88,9 @@ int LoadTool(lua_State *L)
     std::string why;
     AutoRef<Operator> tool(ToolLoader::LoadTool(luaL_checkstring(L, 1), luaL_checkstring(L, 2), &why));
     if (!tool)
-        return Raise(L, QString::fromStdString(why));
+        return Hands::Raise(L, QString::fromStdString(why));
     if (!gDoc->AddTool(tool.get()))
-        return Raise(L, QString("a tool named \"%1\" exists already").arg(lua_tostring(L, 2)));
+        return Hands::Raise(L, QString("a tool named \"%1\" exists already").arg(lua_tostring(L, 2)));
     return 0;
 }
 
@@ -112,7 +106,7 @@ int Tools(lua_State *L)
 int ShowTool(lua_State *L)
 {
     if (!gWindow->ShowTool(QString::fromUtf8(luaL_checkstring(L, 1))))
-        return Raise(L, QString("no tool \"%1\"").arg(lua_tostring(L, 1)));
+        return Hands::Raise(L, QString("no tool \"%1\"").arg(lua_tostring(L, 1)));
     return 0;
 }
 
@@ -131,9 +125,9 @@ int SetValue(lua_State *L)
     std::string why;
     AutoParameter value(ParameterScript::FromScript(input->GetDataType(), LuaRuntime::ToScriptVal(L, 3), &why));
     if (!value)
-        return Raise(L, QString("Input \"%1\": %2").arg(input->GetName(), QString::fromStdString(why)));
+        return Hands::Raise(L, QString("Input \"%1\": %2").arg(input->GetName(), QString::fromStdString(why)));
     if (!input->SetValue(value.get(), TimeArg(L, 4), 0, nullptr) && HasScriptError())
-        return Raise(L, QString::fromStdString(TakeScriptError()));
+        return Hands::Raise(L, QString::fromStdString(TakeScriptError()));
     return 0;
 }
 
@@ -184,18 +178,11 @@ int Control(lua_State *L)
 
 // --- a person's hands ---
 
-void SendMouse(QWidget *w, QEvent::Type type, QPoint pos, Qt::MouseButton button, Qt::MouseButtons held,
-               Qt::KeyboardModifiers mods)
-{
-    QMouseEvent event(type, pos, w->mapToGlobal(pos), button, held, mods);
-    QApplication::sendEvent(w, &event);
-}
-
 int Press(lua_State *L)
 {
     QWidget *w = TargetOrRaise(L, 1);
     const UiGesture g = UiGesture::Read(L, 2);
-    SendMouse(w, QEvent::MouseButtonPress, g.At(w), g.button, g.button, g.mods);
+    Hands::SendMouse(w, QEvent::MouseButtonPress, g.At(w), g.button, g.button, g.mods);
     return 0;
 }
 
@@ -203,7 +190,7 @@ int Release(lua_State *L)
 {
     QWidget *w = TargetOrRaise(L, 1);
     const UiGesture g = UiGesture::Read(L, 2);
-    SendMouse(w, QEvent::MouseButtonRelease, g.At(w), g.button, Qt::NoButton, g.mods);
+    Hands::SendMouse(w, QEvent::MouseButtonRelease, g.At(w), g.button, Qt::NoButton, g.mods);
     return 0;
 }
 
@@ -218,7 +205,7 @@ int Move(lua_State *L)
         hover = lua_isstring(L, -1) && QByteArray(lua_tostring(L, -1)) == "none";
         lua_pop(L, 1);
     }
-    SendMouse(w, QEvent::MouseMove, g.At(w), Qt::NoButton, hover ? Qt::NoButton : g.button, g.mods);
+    Hands::SendMouse(w, QEvent::MouseMove, g.At(w), Qt::NoButton, hover ? Qt::NoButton : g.button, g.mods);
     return 0;
 }
 
@@ -243,28 +230,18 @@ int Drag(lua_State *L)
         lua_pop(L, 1);
     }
     const QPoint a = from.At(w), b = to.At(w);
-    SendMouse(w, QEvent::MouseButtonPress, a, opts.button, opts.button, opts.mods);
+    Hands::SendMouse(w, QEvent::MouseButtonPress, a, opts.button, opts.button, opts.mods);
     for (int i = 1; i <= steps; ++i)
-        SendMouse(w, QEvent::MouseMove, a + (b - a) * i / steps, Qt::NoButton, opts.button, opts.mods);
-    SendMouse(w, QEvent::MouseButtonRelease, b, opts.button, Qt::NoButton, opts.mods);
+        Hands::SendMouse(w, QEvent::MouseMove, a + (b - a) * i / steps, Qt::NoButton, opts.button, opts.mods);
+    Hands::SendMouse(w, QEvent::MouseButtonRelease, b, opts.button, Qt::NoButton, opts.mods);
     return 0;
-}
-
-int KeyCode(lua_State *L, int idx)
-{
-    if (lua_isnumber(L, idx))
-        return int(lua_tointeger(L, idx));
-    const QKeySequence seq = QKeySequence::fromString(QString::fromUtf8(luaL_checkstring(L, idx)));
-    if (seq.isEmpty())
-        return Raise(L, QString("unknown key \"%1\"").arg(lua_tostring(L, idx)));
-    return seq[0] & ~Qt::KeyboardModifierMask;
 }
 
 // Key(target, "Left", "shift"[, "press"|"release"]).
 int Key(lua_State *L)
 {
     QWidget *w = TargetOrRaise(L, 1);
-    const int key = KeyCode(L, 2);
+    const int key = Hands::KeyCode(L, 2);
     const Qt::KeyboardModifiers mods = UiGesture::Modifiers(QString::fromUtf8(luaL_optstring(L, 3, "")));
     const QByteArray phase = luaL_optstring(L, 4, "click");
     if (phase != "release")
@@ -286,7 +263,7 @@ int Grab(lua_State *L)
     QWidget *w = TargetOrRaise(L, 1);
     const char *path = luaL_checkstring(L, 2);
     if (!w->grab().save(QString::fromUtf8(path)))
-        return Raise(L, QString("cannot write %1").arg(path));
+        return Hands::Raise(L, QString("cannot write %1").arg(path));
     return 0;
 }
 
@@ -346,13 +323,14 @@ void UiScripting::Install(OrbaneDoc *doc, MainWindow *window)
     gDoc = doc;
     gWindow = window;
     const std::pair<const char *, lua_CFunction> functions[] = {
-        {"LoadComp", LoadComp}, {"LoadTool", LoadTool},   {"Tools", Tools},         {"ShowTool", ShowTool},
-        {"GetValue", GetValue}, {"SetValue", SetValue},   {"GetTime", GetTime},     {"SetTime", SetTime},
-        {"Undo", Undo},         {"Redo", Redo},           {"UndoNames", UndoNames}, {"RedoNames", RedoNames},
-        {"Control", Control},   {"Press", Press},         {"Release", Release},     {"Move", Move},
-        {"Click", Click},       {"Drag", Drag},           {"Key", Key},             {"Type", Type},
-        {"Grab", Grab},         {"State", State},         {"Process", Process},
-        {"Clipboard", Clipboard},
+        {"LoadComp", LoadComp}, {"LoadTool", LoadTool},   {"Tools", Tools},
+        {"ShowTool", ShowTool}, {"GetValue", GetValue},   {"SetValue", SetValue},
+        {"GetTime", GetTime},   {"SetTime", SetTime},     {"Undo", Undo},
+        {"Redo", Redo},         {"UndoNames", UndoNames}, {"RedoNames", RedoNames},
+        {"Control", Control},   {"Press", Press},         {"Release", Release},
+        {"Move", Move},         {"Click", Click},         {"Drag", Drag},
+        {"Key", Key},           {"Type", Type},           {"Grab", Grab},
+        {"State", State},       {"Process", Process},     {"Clipboard", Clipboard},
     };
     for (const auto &[name, fn] : functions)
         LuaRuntime::Instance().AddModuleFunction(name, fn);

@@ -1,6 +1,7 @@
 #include "ViewerScripting.h"
 
 #include "MainWindow.h"
+#include "ScriptHands.h"
 #include "UiTarget.h"
 
 #include "orbane/LuaRuntime.h"
@@ -18,15 +19,9 @@ namespace Orbane {
 
 namespace {
 
-MainWindow *gWindow = nullptr;
+using Hands = ScriptHands;
 
-int Raise(lua_State *L, const QString &message)
-{
-    luaL_where(L, 1);
-    lua_pushstring(L, message.toUtf8().constData());
-    lua_concat(L, 2);
-    return lua_error(L);
-}
+MainWindow *gWindow = nullptr;
 
 bool Number(lua_State *L, int idx, const char *key, double &out)
 {
@@ -56,18 +51,11 @@ QPoint Position(lua_State *L, int idx, const ViewerPanel *viewer)
     return QPoint(int(std::lround(at.x() + dx)), int(std::lround(at.y() + dy)));
 }
 
-void SendMouse(ViewerPanel *viewer, QEvent::Type type, QPoint pos, Qt::MouseButton button, Qt::MouseButtons held,
-               Qt::KeyboardModifiers mods)
-{
-    QMouseEvent event(type, pos, viewer->mapToGlobal(pos), button, held, mods);
-    QApplication::sendEvent(viewer, &event);
-}
-
 int ViewerPress(lua_State *L)
 {
     const UiGesture g = UiGesture::Read(L, 1);
-    SendMouse(gWindow->Viewer(), QEvent::MouseButtonPress, Position(L, 1, gWindow->Viewer()), g.button, g.button,
-              g.mods);
+    Hands::SendMouse(gWindow->Viewer(), QEvent::MouseButtonPress, Position(L, 1, gWindow->Viewer()), g.button, g.button,
+                     g.mods);
     return 0;
 }
 
@@ -75,34 +63,25 @@ int ViewerPress(lua_State *L)
 int ViewerMove(lua_State *L)
 {
     const UiGesture g = UiGesture::Read(L, 1);
-    SendMouse(gWindow->Viewer(), QEvent::MouseMove, Position(L, 1, gWindow->Viewer()), Qt::NoButton, g.button, g.mods);
+    Hands::SendMouse(gWindow->Viewer(), QEvent::MouseMove, Position(L, 1, gWindow->Viewer()), Qt::NoButton, g.button,
+                     g.mods);
     return 0;
 }
 
 int ViewerRelease(lua_State *L)
 {
     const UiGesture g = UiGesture::Read(L, 1);
-    SendMouse(gWindow->Viewer(), QEvent::MouseButtonRelease, Position(L, 1, gWindow->Viewer()), g.button, Qt::NoButton,
-              g.mods);
+    Hands::SendMouse(gWindow->Viewer(), QEvent::MouseButtonRelease, Position(L, 1, gWindow->Viewer()), g.button,
+                     Qt::NoButton, g.mods);
     return 0;
 }
 
 int ViewerHover(lua_State *L)
 {
     const UiGesture g = UiGesture::Read(L, 1);
-    SendMouse(gWindow->Viewer(), QEvent::MouseMove, Position(L, 1, gWindow->Viewer()), Qt::NoButton, Qt::NoButton,
-              g.mods);
+    Hands::SendMouse(gWindow->Viewer(), QEvent::MouseMove, Position(L, 1, gWindow->Viewer()), Qt::NoButton,
+                     Qt::NoButton, g.mods);
     return 0;
-}
-
-int KeyCode(lua_State *L, int idx)
-{
-    if (lua_isnumber(L, idx))
-        return int(lua_tointeger(L, idx));
-    const QKeySequence seq = QKeySequence::fromString(QString::fromUtf8(luaL_checkstring(L, idx)));
-    if (seq.isEmpty())
-        return Raise(L, QString("unknown key \"%1\"").arg(lua_tostring(L, idx)));
-    return seq[0] & ~Qt::KeyboardModifierMask;
 }
 
 // ViewerKey("Left", "shift"[, "press"|"release"|"click"]). The modifier keys
@@ -110,11 +89,12 @@ int KeyCode(lua_State *L, int idx)
 int ViewerKey(lua_State *L)
 {
     ViewerPanel *viewer = gWindow->Viewer();
-    const int key = KeyCode(L, 1);
+    const int key = Hands::KeyCode(L, 1);
     const Qt::KeyboardModifiers mods = UiGesture::Modifiers(QString::fromUtf8(luaL_optstring(L, 2, "")));
     const QByteArray phase = luaL_optstring(L, 3, "click");
     if (phase != "click" && phase != "press" && phase != "release")
-        return Raise(L, QString("unknown key phase \"%1\"; expected click, press or release").arg(phase.constData()));
+        return Hands::Raise(
+            L, QString("unknown key phase \"%1\"; expected click, press or release").arg(phase.constData()));
     if (phase != "release")
         QTest::keyPress(viewer, Qt::Key(key), mods);
     if (phase != "press")
@@ -126,7 +106,7 @@ int ViewerGrab(lua_State *L)
 {
     const char *path = luaL_checkstring(L, 1);
     if (!gWindow->Viewer()->grab().save(QString::fromUtf8(path)))
-        return Raise(L, QString("cannot write %1").arg(path));
+        return Hands::Raise(L, QString("cannot write %1").arg(path));
     return 0;
 }
 
@@ -134,7 +114,7 @@ int ViewerImage(lua_State *L)
 {
     const char *path = luaL_checkstring(L, 1);
     if (!gWindow->Viewer()->LoadImage(QString::fromUtf8(path)))
-        return Raise(L, QString("cannot read the image %1").arg(path));
+        return Hands::Raise(L, QString("cannot read the image %1").arg(path));
     return 0;
 }
 
