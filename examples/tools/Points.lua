@@ -1,20 +1,22 @@
 -- Viewer overlays: the tool's centre as an axis crosshair (drag its arms to
 -- move along one axis), and a path of points along the ridge of the demo
 -- image, each joined by a line to the point before it (PCID_PrevPoint).
+-- The inspector shows each point's value read-only (the offset control that
+-- will edit it there is not built yet) and follows every drag in the viewer.
 return {
   type = "Points",
   inputs = {
     { id = "Center", name = "Center", type = "Point", default = { 0.5, 0.5 },
-      overlay = "CrosshairControl", tags = { CHC_Style = 0 } },
+      control = "OffsetControl", overlay = "CrosshairControl", tags = { CHC_Style = 0 } },
     { id = "Ridge1", name = "Ridge 1", type = "Point", default = { 0.172, 0.431 },
-      overlay = "PointControl" },
+      control = "OffsetControl", overlay = "PointControl" },
     { id = "Ridge2", name = "Ridge 2", type = "Point", default = { 0.359, 0.272 },
-      overlay = "PointControl", tags = { PCID_PrevPoint = "Ridge1" } },
+      control = "OffsetControl", overlay = "PointControl", tags = { PCID_PrevPoint = "Ridge1" } },
     { id = "Ridge3", name = "Ridge 3", type = "Point", default = { 0.547, 0.406 },
-      overlay = "PointControl", tags = { PCID_PrevPoint = "Ridge2" } },
+      control = "OffsetControl", overlay = "PointControl", tags = { PCID_PrevPoint = "Ridge2" } },
     { id = "Ridge4", name = "Ridge 4", type = "Point", default = { 0.734, 0.283 },
-      overlay = "PointControl", tags = { PCID_PrevPoint = "Ridge3" } },
+      control = "OffsetControl", overlay = "PointControl", tags = { PCID_PrevPoint = "Ridge3" } },
     { id = "Ridge5", name = "Ridge 5", type = "Point", default = { 0.875, 0.372 },
-      overlay = "PointControl", tags = { PCID_PrevPoint = "Ridge4" } },
+      control = "OffsetControl", overlay = "PointControl", tags = { PCID_PrevPoint = "Ridge4" } },
   },
 }

@@ -13,6 +13,13 @@
 
 namespace Orbane {
 
+namespace {
+
+// Room at the panel's sides, so edit boxes and captions do not touch its edges.
+constexpr int32 kSideMargin = 6;
+
+} // namespace
+
 InspectorPanel::InspectorPanel(OrbaneDoc *doc, QWidget *parent) : QScrollArea(parent), mDoc(doc)
 {
     setWidgetResizable(false);
@@ -85,15 +92,16 @@ void InspectorPanel::LayOut()
     if (width == mLaidOutWidth || !widget())
         return;
     mLaidOutWidth = width;
-    int32 y = 0;
+    const int32 inner = qMax(1, width - 2 * kSideMargin);
+    int32 y = kSideMargin;
     for (InputControl *c : mControls) {
-        int32 w = width, h = 0;
+        int32 w = inner, h = 0;
         c->SetSize(w, h, nullptr);
-        c->setGeometry(0, y, width, h);
+        c->setGeometry(kSideMargin, y, inner, h);
         c->show();
         y += h;
     }
-    widget()->resize(width, y);
+    widget()->resize(width, y + kSideMargin);
 }
 
 void InspectorPanel::resizeEvent(QResizeEvent *event)

@@ -78,7 +78,7 @@ private slots:
         QCOMPARE(classes, QStringList({"CheckboxControl", "CheckboxControl", "CheckboxControl", "ButtonControl"}));
     }
 
-    // Every control follows the panel's width, without a horizontal scroll.
+    // Every control follows the panel's width, inside it, without a horizontal scroll.
     void sizesAgainOnWidthChange()
     {
         OrbaneDoc doc;
@@ -92,8 +92,10 @@ private slots:
         for (int width : {240, 520}) {
             panel.resize(width, 400);
             QCoreApplication::processEvents();
-            for (InputControl *c : panel.Controls())
-                QCOMPARE(c->width(), panel.viewport()->width());
+            for (InputControl *c : panel.Controls()) {
+                QVERIFY(c->width() > panel.viewport()->width() - 20);
+                QVERIFY(c->geometry().right() < panel.viewport()->width());
+            }
         }
     }
 
