@@ -247,11 +247,10 @@ bool InputControl::UpdateDisplay(Input *, const TagList *)
 {
     if (mOpen)
         setEnabled(!mDisabled);
-    // Opaque children are not repainted with their parent: ask each.
+    // Children repaint themselves when a control hands them a new value; the
+    // base repaints only the control's own face. Repainting every child here
+    // cost most of a slider drag's time.
     update();
-    for (const Layout::WidgetMap::Entry &child : mChildren.Entries())
-        if (child.second)
-            child.second->update();
     return true;
 }
 

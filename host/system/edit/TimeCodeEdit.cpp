@@ -5,6 +5,7 @@
 #include <QKeyEvent>
 #include <QLocale>
 #include <QMouseEvent>
+#include <QPainter>
 
 #include <algorithm>
 #include <cmath>
@@ -47,7 +48,19 @@ void RegisterSignalTypes()
 TimeCodeEdit::TimeCodeEdit(QWidget *parent) : QLineEdit(parent)
 {
     RegisterSignalTypes();
+    // The style's framed panel cost most of a slider drag's repaint; the edit
+    // draws its own one-pixel frame instead.
+    setFrame(false);
+    setTextMargins(1, 0, 1, 0);
     setText(Format(mValue));
+}
+
+void TimeCodeEdit::paintEvent(QPaintEvent *event)
+{
+    QLineEdit::paintEvent(event);
+    QPainter p(this);
+    p.setPen(palette().color(hasFocus() ? QPalette::Highlight : QPalette::Mid));
+    p.drawRect(QRectF(rect()).adjusted(0.5, 0.5, -0.5, -0.5));
 }
 
 TimeCodeEdit::~TimeCodeEdit() = default;
@@ -117,7 +130,9 @@ void TimeCodeEdit::SetValue(float64 value, int32 decimals)
 {
     mValue = value;
     mDecimals = decimals;
-    setText(Format(value));
+    const QString formatted = Format(value);
+    if (formatted != text())
+        setText(formatted);
 }
 
 bool TimeCodeEdit::EvaluateText(const QString &text, float64 *value) const
