@@ -83,13 +83,6 @@ float64 SliderControl::RoundToStep(float64 value, float64 step)
     return std::floor((value + step * 0.5) / step) * step;
 }
 
-bool SliderControl::HasValueChanged(bool integer, float64 value, float64 current, float64 tolerance)
-{
-    if (integer)
-        return std::floor(value + 0.5) != std::floor(current + 0.5);
-    return std::fabs(value - current) > tolerance;
-}
-
 const char *SliderControl::KnobImageName(int32 style, bool held)
 {
     static const char *const kColourKnobs[4][2] = {

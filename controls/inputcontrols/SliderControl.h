@@ -76,9 +76,6 @@ public:
     static float64 StepFor(int32 places);
     // Rounds halves up onto the step's grid.
     static float64 RoundToStep(float64 value, float64 step);
-    // Does `value` differ from `current` by more than `tolerance` (or, with
-    // `integer`, round to another integer)?
-    static bool HasValueChanged(bool integer, float64 value, float64 current, float64 tolerance);
     // The look-pack names of the knob pair a knob style uses.
     static const char *KnobImageName(int32 style, bool held);
 

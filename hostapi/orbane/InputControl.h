@@ -164,6 +164,14 @@ public:
     // process: tests check that a class reads its description once.
     static int32 LayoutReadCount(const char *itemName);
 
+    // Does a notified value differ from the one shown? With integer display
+    // two values that round to the same integer are the same; otherwise they
+    // must differ by more than `tolerance`.
+    static bool HasValueChanged(bool integer, float64 value, float64 current, float64 tolerance);
+    // The disabled state a tag list gives the control (ICA_Disabled), or
+    // `current` where the list says nothing of it.
+    static bool GetDisabledTags(const TagList &tags, bool current);
+
     // The label rule: tag 0x30040000 of the Input's attributes, else
     // 0x30020014, else the Input's identifier.
     static OrbString LabelOf(const Input *input);

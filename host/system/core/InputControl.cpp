@@ -13,6 +13,7 @@
 #include <QResizeEvent>
 
 #include <algorithm>
+#include <cmath>
 #include <map>
 #include <mutex>
 #include <string>
@@ -45,7 +46,7 @@ _InputControl::~_InputControl() = default;
 InputControl::InputControl(const Registry *reg, const ScriptVal &args, const TagList &tags)
     : _InputControl(reg, args, tags), mControlFont(Theme::ControlFont())
 {
-    mDisabled = tags.GetBool(ICA_Disabled, false);
+    mDisabled = GetDisabledTags(tags, false);
 }
 
 InputControl::~InputControl()
@@ -87,8 +88,7 @@ QList<Input *> InputControl::GetInputsAt(const QPoint &pos) const
 
 bool InputControl::SetAttrsTagList(Input *, const TagList &tags)
 {
-    if (tags.FindQuery(ICA_Disabled))
-        SetDisabled(tags.GetBool(ICA_Disabled, mDisabled));
+    SetDisabled(GetDisabledTags(tags, mDisabled));
     return true;
 }
 
@@ -328,6 +328,18 @@ int32 InputControl::LayoutReadCount(const char *itemName)
     std::lock_guard<std::mutex> lock(gReadLock);
     const auto it = gLayoutReads.find(itemName ? itemName : "");
     return it == gLayoutReads.end() ? 0 : it->second;
+}
+
+bool InputControl::HasValueChanged(bool integer, float64 value, float64 current, float64 tolerance)
+{
+    if (integer)
+        return std::floor(value + 0.5) != std::floor(current + 0.5);
+    return std::fabs(value - current) > tolerance;
+}
+
+bool InputControl::GetDisabledTags(const TagList &tags, bool current)
+{
+    return tags.GetBool(ICA_Disabled, current);
 }
 
 OrbString InputControl::LabelOf(const Input *input)
