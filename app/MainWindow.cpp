@@ -9,6 +9,7 @@
 #include <QDockWidget>
 #include <QLabel>
 #include <QSlider>
+#include <QStatusBar>
 #include <QToolBar>
 #include <QUndoStack>
 #include <QVBoxLayout>
@@ -29,10 +30,13 @@ MainWindow::MainWindow(OrbaneDoc *doc, QWidget *parent) : QMainWindow(parent), m
     addDockWidget(Qt::RightDockWidgetArea, dock);
     resizeDocks({dock}, {380}, Qt::Horizontal);
     BuildToolBar();
+    BuildStatusBar();
 
     connect(doc, SIGNAL(toolAdded(Orbane::Operator *)), this, SLOT(OnToolAdded(Orbane::Operator *)));
     connect(doc, SIGNAL(toolRemoving(Orbane::Operator *)), this, SLOT(OnToolRemoving(Orbane::Operator *)));
     connect(doc, SIGNAL(currentTimeChanged(float64)), this, SLOT(OnTimeChanged(double)));
+    connect(doc, SIGNAL(syncRenderRequested()), this, SLOT(OnRenderRequested()));
+    connect(doc, SIGNAL(autoProxyChanged(bool)), this, SLOT(OnAutoProxyChanged(bool)));
     for (Operator *tool : doc->Tools())
         OnToolAdded(tool);
 }
@@ -75,6 +79,22 @@ QSlider *MainWindow::BuildTimeSlider()
     mTimeSlider->setMinimumWidth(300);
     connect(mTimeSlider, &QSlider::valueChanged, this, [this](int frame) { mDoc->SetCurrentTime(frame); });
     return mTimeSlider;
+}
+
+void MainWindow::BuildStatusBar()
+{
+    mProxyState = new QLabel;
+    statusBar()->addPermanentWidget(mProxyState);
+}
+
+void MainWindow::OnRenderRequested()
+{
+    statusBar()->showMessage(QString("Render %1 of frame %2").arg(++mRenders).arg(mDoc->GetCurrentTime()), 2000);
+}
+
+void MainWindow::OnAutoProxyChanged(bool on)
+{
+    mProxyState->setText(on ? "Proxy" : QString());
 }
 
 bool MainWindow::ShowTool(const QString &name)

@@ -6,6 +6,7 @@
 #include <QMainWindow>
 
 class QComboBox;
+class QLabel;
 class QSlider;
 
 namespace Orbane {
@@ -32,10 +33,15 @@ private slots:
     void OnToolRemoving(Orbane::Operator *tool);
     void OnToolChosen(int index);
     void OnTimeChanged(double time);
+    // The document's render hooks: this host has no renderer, so the window
+    // says what a renderer would have been asked to do.
+    void OnRenderRequested();
+    void OnAutoProxyChanged(bool on);
 
 private:
     QWidget *BuildInspectorDock();
     void BuildToolBar();
+    void BuildStatusBar();
     QSlider *BuildTimeSlider();
 
     OrbaneDoc *mDoc;
@@ -43,6 +49,8 @@ private:
     ViewerPanel *mViewer = nullptr;
     QComboBox *mToolChooser = nullptr;
     QSlider *mTimeSlider = nullptr;
+    QLabel *mProxyState = nullptr;
+    int mRenders = 0;
 };
 
 } // namespace Orbane
