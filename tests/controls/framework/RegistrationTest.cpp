@@ -1,27 +1,57 @@
-// The class registry side of the library's registrations, row by row against
-// the published class table.
+// The library's registrations row by row against the published class table:
+// what the class registry holds, and what each factory makes.
 
 #include "ControlModule.h"
 #include "ExpectedClasses.h"
 
 #include "orbane/ClassIDs.h"
+#include "orbane/InputControl.h"
 #include "orbane/Object.h"
+#include "orbane/OverlayControl.h"
 #include "orbane/PreviewControl.h"
 #include "orbane/Registry.h"
 #include "orbane/RegistryList.h"
+#include "orbane/Reuser.h"
 #include "orbane/ScriptInfo.h"
+#include "orbane/ScriptVal.h"
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+#include <memory>
 #include <regex>
 #include <set>
 #include <string>
+#include <typeindex>
 
 namespace Orbane {
 namespace Test {
 namespace {
 
 const std::set<std::string> kOwnCleanup = {"AngleControl", "EllipseControl", "FontfileControl", "SplineControl"};
+
+struct Release
+{
+    void operator()(ScriptObject *obj) const { obj->DecRef(); }
+};
+using Held = std::unique_ptr<ScriptObject, Release>;
+
+Held Create(const char *classID)
+{
+    return Held(ClassRegistry.New(OrbID(classID), ScriptVal(), TagList()));
+}
+
+// The tags every registration gives, in the host's order, then the row's
+// extras and the hook.
+std::vector<Tag> ExpectedTagIds(const ExpectedClass &row)
+{
+    std::vector<Tag> ids = {REG_ClassInit,   REG_ClassCleanup, REG_Kind, REG_FormatLevel, REG_BuildStamp,
+                            REG_BaseClassID, REG_ScriptInfo,   REG_Name, REG_Factory};
+    ids.insert(ids.end(), row.extras.begin(), row.extras.end());
+    if (row.hook)
+        ids.push_back(REG_TagMapHook);
+    return ids;
+}
 
 std::vector<Tag> TagIds(const TagList &tags)
 {
@@ -31,170 +61,150 @@ std::vector<Tag> TagIds(const TagList &tags)
     return ids;
 }
 
-class RegistrationTable : public testing::TestWithParam<ExpectedClass>
+void ExpectExtraValues(const ExpectedClass &row, const TagList &tags)
 {
-protected:
-    const Registry *Reg() const { return ClassRegistry.Find(OrbID(GetParam().classID)); }
-};
-
-TEST_P(RegistrationTable, IsRegisteredUnderItsClassIDWithItsNameBaseAndKind)
-{
-    const ExpectedClass &row = GetParam();
-    const Registry *reg = Reg();
-    ASSERT_NE(reg, nullptr);
-    EXPECT_STREQ(reg->Name(), row.name);
-    EXPECT_STREQ(reg->BaseClassID().c_str(), row.baseID);
-    EXPECT_EQ(reg->Kind(), row.family == Family::Input ? REGKIND_InputControl : REGKIND_PreviewControl);
-}
-
-TEST_P(RegistrationTable, GivesItsRegistrationTagsInTheHostOrder)
-{
-    const ExpectedClass &row = GetParam();
-    std::vector<Tag> expected = {REG_ClassInit,   REG_ClassCleanup, REG_Kind, REG_FormatLevel, REG_BuildStamp,
-                                 REG_BaseClassID, REG_ScriptInfo,   REG_Name, REG_Factory};
-    expected.insert(expected.end(), row.extras.begin(), row.extras.end());
-    if (row.hook)
-        expected.push_back(REG_TagMapHook);
-    ASSERT_NE(Reg(), nullptr);
-    EXPECT_EQ(TagIds(Reg()->Tags()), expected);
-    EXPECT_EQ(Reg()->MapHook() != nullptr, row.hook);
-}
-
-TEST_P(RegistrationTable, CarriesFormatLevelInitHookAndBaseByAddress)
-{
-    const Registry *reg = Reg();
-    ASSERT_NE(reg, nullptr);
-    EXPECT_EQ(reg->Tags().GetInt(REG_FormatLevel), 7);
-    EXPECT_EQ(reg->Tags().GetPtr(REG_ClassInit), reinterpret_cast<void *>(&Object::RegInit));
-    const auto *base = static_cast<const OrbID *>(reg->Tags().GetPtr(REG_BaseClassID));
-    ASSERT_NE(base, nullptr);
-    EXPECT_STREQ(base->c_str(), GetParam().baseID);
-    ASSERT_NE(reg->Factory(), nullptr);
-}
-
-TEST_P(RegistrationTable, HasScriptInfoOfVersionOneNamingItsClassID)
-{
-    const Registry *reg = Reg();
-    ASSERT_NE(reg, nullptr);
-    const ScriptInfo *info = reg->GetScriptInfo();
-    ASSERT_NE(info, nullptr);
-    EXPECT_EQ(info->Version(), 1);
-    EXPECT_STREQ(info->ClassID(), GetParam().classID);
-}
-
-TEST_P(RegistrationTable, ExtraTagsHoldTheirValues)
-{
-    const Registry *reg = Reg();
-    ASSERT_NE(reg, nullptr);
-    for (Tag tag : GetParam().extras) {
+    for (Tag tag : row.extras) {
         SCOPED_TRACE(tag);
         if (tag == REG_ClassFamily)
-            EXPECT_STREQ(static_cast<const char *>(reg->Tags().GetPtr(tag)), "OverlayControl");
+            EXPECT_STREQ(static_cast<const char *>(tags.GetPtr(tag)), "OverlayControl");
         else if (tag == REG_DisplayName)
-            EXPECT_STREQ(reg->Tags().GetString(tag), "Spline Control");
+            EXPECT_STREQ(tags.GetString(tag), "Spline Control");
         else if (tag == REG_MenuPath)
-            EXPECT_STREQ(reg->Tags().GetString(tag), "Controls\\Spline");
+            EXPECT_STREQ(tags.GetString(tag), "Controls\\Spline");
         else
-            EXPECT_EQ(reg->Tags().GetLong(tag), 1);
+            EXPECT_EQ(tags.GetLong(tag), 1);
     }
 }
 
-TEST_P(RegistrationTable, CleansUpThroughItsFamilyOrItsOwnHook)
+const std::type_info &FamilyType(const std::string &baseID)
+{
+    if (baseID == "InputControl")
+        return typeid(InputControl);
+    return baseID == "OverlayControl" ? typeid(OverlayControl) : typeid(PreviewControl);
+}
+
+class ClassTable : public testing::TestWithParam<ExpectedClass>
+{
+};
+
+TEST_P(ClassTable, RegistrationHoldsTheRowsColumns)
 {
     const ExpectedClass &row = GetParam();
-    ASSERT_NE(Reg(), nullptr);
-    const ClassHook cleanup = reinterpret_cast<ClassHook>(Reg()->Tags().GetPtr(REG_ClassCleanup));
-    ASSERT_NE(cleanup, nullptr);
+    const Registry *reg = ClassRegistry.Find(OrbID(row.classID));
+    ASSERT_NE(reg, nullptr);
+    const TagList &tags = reg->Tags();
+    EXPECT_STREQ(reg->Name(), row.name);
+    EXPECT_EQ(reg->Kind(), row.family == Family::Input ? REGKIND_InputControl : REGKIND_PreviewControl);
+    EXPECT_EQ(TagIds(tags), ExpectedTagIds(row));
+    EXPECT_EQ(reg->MapHook() != nullptr, row.hook);
+    EXPECT_EQ(tags.GetInt(REG_FormatLevel), 7);
+    EXPECT_EQ(tags.GetPtr(REG_ClassInit), reinterpret_cast<void *>(&Object::RegInit));
+    const auto *base = static_cast<const OrbID *>(tags.GetPtr(REG_BaseClassID));
+    ASSERT_NE(base, nullptr) << "the base is given by address";
+    EXPECT_STREQ(base->c_str(), row.baseID);
+    ASSERT_NE(reg->GetScriptInfo(), nullptr);
+    EXPECT_EQ(reg->GetScriptInfo()->Version(), 1);
+    EXPECT_STREQ(reg->GetScriptInfo()->ClassID(), row.classID);
+    ExpectExtraValues(row, tags);
+
+    const void *cleanup = tags.GetPtr(REG_ClassCleanup);
     const ClassHook family = row.family == Family::Input ? &Object::RegCleanup : &PreviewControl::RegCleanup;
-    if (kOwnCleanup.count(row.name))
-        EXPECT_NE(cleanup, family);
-    else
-        EXPECT_EQ(cleanup, family);
+    ASSERT_NE(cleanup, nullptr);
+    EXPECT_EQ(cleanup == reinterpret_cast<void *>(family), kOwnCleanup.count(row.name) == 0);
+
+    const std::regex date(R"(Built: (Jan|Feb|Mar|Apr|May|Jun|Jul|Aug|Sep|Oct|Nov|Dec) [ 123]\d \d{4})");
+    const char *stamp = tags.GetString(REG_BuildStamp, "");
+    EXPECT_TRUE(std::regex_match(stamp, date)) << stamp;
+    EXPECT_STREQ(stamp, ClassRegistry.Find(OrbID("AngleControl"))->Tags().GetString(REG_BuildStamp)) << "one build";
+
+    if (row.IsVariant()) {
+        const Registry *primary = ClassRegistry.Find(OrbID(row.baseID));
+        ASSERT_NE(primary, nullptr);
+        EXPECT_EQ(reg->Base(), primary);
+        EXPECT_EQ(reg->FindMapHook(), primary->MapHook());
+        EXPECT_EQ(reg->Factory(), primary->Factory());
+    }
 }
 
-std::string RowName(const testing::TestParamInfo<ExpectedClass> &info)
+TEST_P(ClassTable, FactoryMakesAPooledObjectOfItsFamilyAndBase)
 {
-    return info.param.classID;
+    const ExpectedClass &row = GetParam();
+    Held obj = Create(row.classID);
+    ASSERT_NE(obj, nullptr);
+    EXPECT_EQ(obj->GetRegistry(), ClassRegistry.Find(OrbID(row.classID)));
+    if (row.family == Family::Input)
+        EXPECT_NE(dynamic_cast<InputControl *>(obj.get()), nullptr);
+    else
+        EXPECT_NE(dynamic_cast<PreviewControl *>(obj.get()), nullptr);
+
+    const std::type_info *base = GetBaseTypeInfo(typeid(*obj));
+    ASSERT_NE(base, nullptr);
+    Held parent = Create(row.baseID); // none where the base is a family
+    if (row.IsVariant()) {
+        ASSERT_NE(parent, nullptr);
+        EXPECT_EQ(typeid(*obj), typeid(*parent)) << "a variant makes its primary's class";
+        EXPECT_EQ(*base, typeid(InputControl));
+    } else {
+        EXPECT_EQ(*base, parent ? typeid(*parent) : FamilyType(row.baseID));
+    }
+
+    const std::size_t size = dynamic_cast<Object &>(*obj).SizeOf();
+    EXPECT_GE(size, row.family == Family::Input ? sizeof(InputControl) : sizeof(PreviewControl));
+    ASSERT_NE(Reuser::ClassSize(size), 0u) << "small enough to be pooled";
+    void *address = obj.get();
+    const std::size_t waiting = Reuser::FreeBlocks(size);
+    obj.reset();
+    EXPECT_EQ(Reuser::FreeBlocks(size), waiting + 1);
+    EXPECT_EQ(static_cast<void *>(Create(row.classID).get()), address) << "served from the freed block";
 }
 
-INSTANTIATE_TEST_SUITE_P(Library, RegistrationTable, testing::ValuesIn(ExpectedClasses()), RowName);
+INSTANTIATE_TEST_SUITE_P(Library, ClassTable, testing::ValuesIn(ExpectedClasses()),
+                         [](const auto &info) { return std::string(info.param.classID); });
 
-TEST(Registration, LibraryAddsOneRegistrationPerTableRow)
+// The exported casts tell classes apart by their run-time types.
+TEST(Registration, LibraryAddsOneRegistrationPerRowOneTypePerClassAndFortyFiveCastPairs)
 {
     EXPECT_EQ(ExpectedClasses().size(), 53u);
     EXPECT_EQ(ControlModule::AddedRegistrations(), ExpectedClasses().size());
     std::set<std::string> ids;
-    for (const ExpectedClass &row : ExpectedClasses())
-        ids.insert(row.classID);
-    EXPECT_EQ(ids.size(), ExpectedClasses().size());
-}
-
-TEST(Registration, BuildStampNamesTheBuildDateAlike)
-{
-    const std::regex stamp(R"(Built: (Jan|Feb|Mar|Apr|May|Jun|Jul|Aug|Sep|Oct|Nov|Dec) [ 123]\d \d{4})");
-    std::set<std::string> stamps;
+    std::set<std::type_index> types;
+    std::size_t classes = 0;
+    int exported = 0;
     for (const ExpectedClass &row : ExpectedClasses()) {
-        const Registry *reg = ClassRegistry.Find(OrbID(row.classID));
-        ASSERT_NE(reg, nullptr) << row.classID;
-        const char *text = reg->Tags().GetString(REG_BuildStamp, "");
-        EXPECT_TRUE(std::regex_match(text, stamp)) << text;
-        stamps.insert(text);
+        ids.insert(row.classID);
+        if (row.IsVariant())
+            continue;
+        ++classes;
+        Held obj = Create(row.classID);
+        ASSERT_NE(obj, nullptr) << row.classID;
+        types.insert(std::type_index(typeid(*obj)));
+        const std::string name = row.name;
+        exported += ControlModule::Symbol("ffi_" + name + "_cast") && ControlModule::Symbol("ffi_" + name + "_uncast");
     }
-    EXPECT_EQ(stamps.size(), 1u);
+    EXPECT_EQ(ids.size(), ExpectedClasses().size());
+    EXPECT_EQ(classes, 47u);
+    EXPECT_EQ(types.size(), classes);
+    EXPECT_EQ(exported, 45);
 }
 
-struct HostConstant
+// Each constant names a row of the table, whose class it finds.
+TEST(Registration, HostClassIDConstantsAndScriptNamesLeadToTheirClasses)
 {
-    const OrbID &id;
-    const char *name;
-};
-
-TEST(Registration, HostClassIDConstantsLeadToTheirClasses)
-{
-    const HostConstant constants[] = {
-        {CLSID_InputControl_Checkbox, "CheckBoxControl"},
-        {CLSID_InputControl_Combo, "ComboControl"},
-        {CLSID_InputControl_ComboID, "ComboControl"},
-        {CLSID_InputControl_Label, "LabelControl"},
-        {CLSID_InputControl_Nest, "LabelControl"},
-        {CLSID_InputControl_Separator, "LabelControl"},
-        {CLSID_InputControl_Spacer, "LabelControl"},
-        {CLSID_InputControl_List, "ListControl"},
-        {CLSID_InputControl_ListID, "ListControl"},
-        {CLSID_InputControl_MultiButton, "MultiButtonControl"},
-        {CLSID_InputControl_MultiButtonID, "MultiButtonControl"},
-        {CLSID_InputControl_Slider, "SliderControl"},
-        {CLSID_PreviewControl_Crop, "CropControl"},
-    };
-    for (const HostConstant &c : constants) {
-        const Registry *reg = ClassRegistry.Find(c.id);
-        ASSERT_NE(reg, nullptr) << c.id.c_str();
-        EXPECT_STREQ(reg->Name(), c.name) << c.id.c_str();
+    for (const OrbID &id :
+         {CLSID_InputControl_Checkbox, CLSID_InputControl_Combo, CLSID_InputControl_ComboID, CLSID_InputControl_Label,
+          CLSID_InputControl_Nest, CLSID_InputControl_Separator, CLSID_InputControl_Spacer, CLSID_InputControl_List,
+          CLSID_InputControl_ListID, CLSID_InputControl_MultiButton, CLSID_InputControl_MultiButtonID,
+          CLSID_InputControl_Slider, CLSID_PreviewControl_Crop}) {
+        const auto &rows = ExpectedClasses();
+        const auto row = std::find_if(rows.begin(), rows.end(), [&](const auto &r) { return id == r.classID; });
+        ASSERT_NE(row, rows.end()) << id.c_str();
+        ASSERT_NE(ClassRegistry.Find(id), nullptr) << id.c_str();
+        EXPECT_STREQ(ClassRegistry.Find(id)->Name(), row->name);
     }
-}
-
-TEST(Registration, CheckboxScriptNameLeadsToTheCheckBoxButItsNativeNameDoesNot)
-{
-    const Registry *byScript = ClassRegistry.FindScriptName("CheckboxControl");
-    ASSERT_NE(byScript, nullptr);
-    EXPECT_EQ(byScript, ClassRegistry.Find(CLSID_InputControl_Checkbox));
+    // The check box's script name differs from its native name in case.
+    EXPECT_EQ(ClassRegistry.FindScriptName("CheckboxControl"), ClassRegistry.Find(CLSID_InputControl_Checkbox));
     EXPECT_EQ(ClassRegistry.Find(OrbID("CheckBoxControl")), nullptr);
     EXPECT_EQ(ClassRegistry.FindScriptName("CheckBoxControl"), nullptr);
-}
-
-TEST(Registration, VariantsFindTheirPrimarysHook)
-{
-    for (const ExpectedClass &row : ExpectedClasses()) {
-        if (!row.IsVariant())
-            continue;
-        const Registry *variant = ClassRegistry.Find(OrbID(row.classID));
-        const Registry *primary = ClassRegistry.Find(OrbID(row.baseID));
-        ASSERT_NE(variant, nullptr) << row.classID;
-        ASSERT_NE(primary, nullptr) << row.baseID;
-        EXPECT_EQ(variant->Base(), primary) << row.classID;
-        EXPECT_EQ(variant->FindMapHook(), primary->MapHook()) << row.classID;
-        EXPECT_EQ(variant->Factory(), primary->Factory()) << row.classID;
-    }
 }
 
 } // namespace

@@ -1,5 +1,5 @@
 // The script side of the registrations: script types, tag maps and the
-// declarations of the exported cast pairs, row by row.
+// exported cast pairs, called directly and through LuaJIT's ffi.
 
 #include "ControlModule.h"
 #include "ExpectedClasses.h"
@@ -7,14 +7,40 @@
 #include "orbane/FFIFunc.h"
 #include "orbane/FFITagMap.h"
 #include "orbane/FFIType.h"
+#include "orbane/LuaRuntime.h"
+#include "orbane/RegistryList.h"
+#include "orbane/ScriptObject.h"
+#include "orbane/ScriptVal.h"
+#include "orbane/TagList.h"
+#include "orbane/TagMapEntry.h"
 
 #include <gtest/gtest.h>
 
+#include <cstdio>
+#include <set>
 #include <string>
 
 namespace Orbane {
 namespace Test {
 namespace {
+
+using CastFn = void *(*)(void *);
+using UncastFn = ScriptObject *(*)(void *);
+
+CastFn Cast(const std::string &name)
+{
+    return reinterpret_cast<CastFn>(ControlModule::Symbol("ffi_" + name + "_cast"));
+}
+
+UncastFn Uncast(const std::string &name)
+{
+    return reinterpret_cast<UncastFn>(ControlModule::Symbol("ffi_" + name + "_uncast"));
+}
+
+ScriptObject *Create(const char *classID)
+{
+    return ClassRegistry.New(OrbID(classID), ScriptVal(), TagList());
+}
 
 const FFIFunc *FindFunc(const std::string &symbol)
 {
@@ -24,13 +50,39 @@ const FFIFunc *FindFunc(const std::string &symbol)
     return nullptr;
 }
 
-class ScriptBindingTable : public testing::TestWithParam<ExpectedClass>
+// Each row's kind agrees with its tag's type bits and carries the extra it needs.
+void ExpectRowsWellFormed(const TagMapEntry *table)
 {
-};
+    std::set<std::string> names;
+    for (const TagMapEntry *row = table; row->name; ++row) {
+        SCOPED_TRACE(row->name);
+        EXPECT_TRUE(names.insert(row->name).second) << "named twice";
+        EXPECT_LE(row->tag, 0xFFFFFFFFull);
+        EXPECT_EQ(row->reserved, nullptr);
+        const uint32 type = TagTypeOf(Tag(row->tag));
+        switch (row->kind) {
+        case TMK_Boolean:
+        case TMK_Color:
+            EXPECT_EQ(type, TAGTYPE_Long);
+            EXPECT_EQ(row->extra, nullptr);
+            break;
+        case TMK_Enumeration:
+            EXPECT_EQ(type, TAGTYPE_Long);
+            EXPECT_NE(row->extra, nullptr);
+            break;
+        case TMK_Object:
+            EXPECT_TRUE(type == TAGTYPE_Object || type == TAGTYPE_Ptr);
+            EXPECT_STREQ(static_cast<const char *>(row->extra), "Input");
+            break;
+        default:
+            EXPECT_EQ(row->kind, TMK_Plain);
+            EXPECT_EQ(row->extra, nullptr);
+        }
+    }
+}
 
-TEST_P(ScriptBindingTable, ScriptTypeNamesItsNativeTypeAndBase)
+void ExpectScriptTypeAndTagMap(const ExpectedClass &row)
 {
-    const ExpectedClass &row = GetParam();
     if (!row.script) {
         if (!row.IsVariant()) { // the label's variants share its type
             EXPECT_EQ(FFIType::FindScriptName(row.name), nullptr);
@@ -43,14 +95,7 @@ TEST_P(ScriptBindingTable, ScriptTypeNamesItsNativeTypeAndBase)
     // An ID variant's type names itself as its native type.
     EXPECT_STREQ(type->NativeName(), row.IsVariant() ? row.script : row.name);
     EXPECT_STREQ(type->BaseName(), row.scriptBase);
-}
-
-TEST_P(ScriptBindingTable, HasTheCreateTagMapWhereItsNamesArePublished)
-{
-    const ExpectedClass &row = GetParam();
-    if (!row.script)
-        return;
-    const FFITagMap *map = FFITagMap::ForType(FFIType::FindScriptName(row.script));
+    const FFITagMap *map = FFITagMap::ForType(type);
     if (!row.tagNamesKnown || row.tags == 0) {
         EXPECT_EQ(map, nullptr);
         return;
@@ -59,68 +104,99 @@ TEST_P(ScriptBindingTable, HasTheCreateTagMapWhereItsNamesArePublished)
     EXPECT_EQ(map->Count(), row.tags);
     EXPECT_STREQ(map->Method(), "Create");
     EXPECT_STREQ(map->MapName(), row.MapName());
+    ExpectRowsWellFormed(map->Table());
 }
 
-TEST_P(ScriptBindingTable, DeclaresItsCastPairForTheScriptLayer)
+void ExpectCastPair(const ExpectedClass &row)
 {
-    const ExpectedClass &row = GetParam();
     const std::string name = row.name;
     const FFIFunc *cast = FindFunc("ffi_" + name + "_cast");
     const FFIFunc *uncast = FindFunc("ffi_" + name + "_uncast");
+    EXPECT_EQ(cast != nullptr, row.HasCasts());
+    EXPECT_EQ(uncast != nullptr, row.HasCasts());
+    EXPECT_EQ(Cast(name) != nullptr, row.HasCasts()) << "exported where declared";
+    EXPECT_EQ(Uncast(name) != nullptr, row.HasCasts());
+    if (!row.HasCasts())
+        return;
+    ASSERT_NE(cast, nullptr);
+    ASSERT_NE(uncast, nullptr);
+    EXPECT_STREQ(cast->Declaration(), (name + " * ffi_" + name + "_cast(void * obj)").c_str());
+    EXPECT_STREQ(uncast->Declaration(), ("ScriptObject * ffi_" + name + "_uncast(" + name + " * self)").c_str());
+    EXPECT_STREQ(cast->Type().ScriptName(), row.script);
+    EXPECT_EQ(&uncast->Type(), &cast->Type());
+
+    EXPECT_EQ(Cast(name)(nullptr), nullptr);
+    ScriptObject *obj = Create(row.classID);
+    ASSERT_NE(obj, nullptr);
+    void *typed = Cast(name)(obj);
+    EXPECT_EQ(typed, static_cast<void *>(obj));
+    EXPECT_EQ(Uncast(name)(typed), obj);
+    obj->DecRef();
+}
+
+class ScriptTable : public testing::TestWithParam<ExpectedClass>
+{
+};
+
+TEST_P(ScriptTable, ScriptTypeTagMapAndCastPairMatchTheRow)
+{
+    const ExpectedClass &row = GetParam();
+    ExpectScriptTypeAndTagMap(row);
     if (row.IsVariant()) {
         // The variant's class is the primary's, whose pair it does not repeat.
         EXPECT_EQ(FindFunc(std::string("ffi_") + row.classID + "_cast"), nullptr);
+        EXPECT_EQ(Cast(row.classID), nullptr);
         return;
     }
-    if (!row.HasCasts()) {
-        EXPECT_EQ(cast, nullptr);
-        EXPECT_EQ(uncast, nullptr);
-        return;
-    }
-    ASSERT_NE(cast, nullptr);
-    ASSERT_NE(uncast, nullptr);
-    EXPECT_STREQ(cast->Name(), "_cast");
-    EXPECT_STREQ(cast->Declaration(), (name + " * ffi_" + name + "_cast(void * obj)").c_str());
-    EXPECT_STREQ(cast->ArgNames(), "obj");
-    EXPECT_STREQ(cast->ResultType(), (name + " *").c_str());
-    EXPECT_STREQ(uncast->Name(), "_uncast");
-    EXPECT_STREQ(uncast->Declaration(), ("ScriptObject * ffi_" + name + "_uncast(" + name + " * self)").c_str());
-    EXPECT_STREQ(uncast->ArgNames(), "self");
-    EXPECT_STREQ(uncast->ResultType(), "ScriptObject *");
-    EXPECT_STREQ(cast->Type().ScriptName(), row.script);
-    EXPECT_EQ(&uncast->Type(), &cast->Type());
+    ExpectCastPair(row);
 }
 
-TEST_P(ScriptBindingTable, ExportsItsCastPairExactlyWhereScriptable)
+INSTANTIATE_TEST_SUITE_P(Library, ScriptTable, testing::ValuesIn(ExpectedClasses()),
+                         [](const auto &info) { return std::string(info.param.classID); });
+
+struct CastCase
 {
-    const ExpectedClass &row = GetParam();
-    if (row.IsVariant()) {
-        EXPECT_EQ(ControlModule::Symbol(std::string("ffi_") + row.classID + "_cast"), nullptr);
-        return;
-    }
-    const std::string name = row.name;
-    EXPECT_EQ(ControlModule::Symbol("ffi_" + name + "_cast") != nullptr, row.HasCasts());
-    EXPECT_EQ(ControlModule::Symbol("ffi_" + name + "_uncast") != nullptr, row.HasCasts());
-}
+    const char *castTo;   // native name of the cast
+    const char *objectID; // class ID of the object cast
+    bool sameObject;      // the cast yields the object; otherwise nil
+};
 
-std::string RowName(const testing::TestParamInfo<ExpectedClass> &info)
+using LuaCasts = testing::TestWithParam<CastCase>;
+
+// As scripts call them, through LuaJIT's ffi: nil casts to nil, and an object
+// casts (and uncasts back) only where it is of the class.
+TEST_P(LuaCasts, CastYieldsTheObjectOnlyWhereItIsOfTheClass)
 {
-    return info.param.classID;
+    std::string error;
+    ASSERT_TRUE(LuaRuntime::Instance().DeclareFFI(&error)) << error;
+    const CastCase &c = GetParam();
+    char code[512];
+    std::snprintf(code, sizeof code, R"(
+        local ffi = require('ffi')
+        local obj = orbane.Create('%s')
+        local typed = ffi.C.ffi_%s_cast(obj)
+        assert(ffi.C.ffi_%s_cast(nil) == nil, 'nil casts to nil')
+        assert((typed ~= nil) == %s, 'cast')
+        assert(typed == nil or ffi.C.ffi_%s_uncast(typed) == obj, 'uncast gives the object back'))",
+                  c.objectID, c.castTo, c.castTo, c.sameObject ? "true" : "false", c.castTo);
+    EXPECT_TRUE(LuaRuntime::Instance().RunString(code, "LuaCast", &error)) << error;
+    LuaRuntime::Instance().RunString("collectgarbage(); collectgarbage()", "LuaCast");
 }
 
-INSTANTIATE_TEST_SUITE_P(Library, ScriptBindingTable, testing::ValuesIn(ExpectedClasses()), RowName);
-
-TEST(ScriptBinding, FortyFiveClassesExportACastPair)
-{
-    int exported = 0;
-    for (const ExpectedClass &row : ExpectedClasses()) {
-        const std::string name = row.name;
-        if (!row.IsVariant() && ControlModule::Symbol("ffi_" + name + "_cast") &&
-            ControlModule::Symbol("ffi_" + name + "_uncast"))
-            ++exported;
-    }
-    EXPECT_EQ(exported, 45);
-}
+// clang-format off
+INSTANTIATE_TEST_SUITE_P(Library, LuaCasts,
+                         testing::Values(CastCase{"CheckBoxControl", "CheckboxControl", true},
+                                         CastCase{"CheckBoxControl", "ButtonControl", false},
+                                         CastCase{"ComboControl", "ComboIDControl", true},
+                                         CastCase{"LabelControl", "SpacerControl", true},
+                                         CastCase{"PolyLineControl", "PolylineControl", true},
+                                         CastCase{"TransformControl", "CameraControl", true},
+                                         CastCase{"CameraControl", "TransformControl", false},
+                                         CastCase{"CameraControl", "LightControl", false},
+                                         CastCase{"SliderControl", "SliderOverlay", false},
+                                         CastCase{"PointControl", "CropControl", false}),
+                         [](const auto &info) { return std::string(info.param.castTo) + "_" + info.param.objectID; });
+// clang-format on
 
 } // namespace
 } // namespace Test

@@ -1,14 +1,21 @@
-// The tag-mapping hooks: which script methods they translate, and that each
-// class translates by its own tag table.
+// The published "Create" tag tables and the hooks that map by them: which
+// script methods a hook translates, and that each class maps by its own table.
 
+#include "ExpectedClasses.h"
+
+#include "orbane/FFITagMap.h"
+#include "orbane/FFIType.h"
 #include "orbane/Registry.h"
 #include "orbane/RegistryList.h"
 #include "orbane/ScriptError.h"
 #include "orbane/ScriptVal.h"
-#include "orbane/TagList.h"
+#include "orbane/TagMapEntry.h"
 #include "orbane/TagMapping.h"
 
 #include <gtest/gtest.h>
+
+#include <string>
+#include <vector>
 
 namespace Orbane {
 namespace Test {
@@ -27,15 +34,27 @@ ScriptVal Table(const char *key, const ScriptVal &value)
     return table;
 }
 
+const TagMapEntry *TableOf(const char *scriptType)
+{
+    const FFITagMap *map = FFITagMap::ForType(FFIType::FindScriptName(scriptType));
+    return map ? map->Table() : nullptr;
+}
+
+const TagMapEntry *Row(const char *scriptType, const std::string &name)
+{
+    for (const TagMapEntry *row = TableOf(scriptType); row && row->name; ++row)
+        if (name == row->name)
+            return row;
+    return nullptr;
+}
+
 struct MethodCase
 {
     const char *method;
     bool translated;
 };
 
-class HookMethods : public testing::TestWithParam<MethodCase>
-{
-};
+using HookMethods = testing::TestWithParam<MethodCase>;
 
 TEST_P(HookMethods, TranslatesOnlyTheTagMethods)
 {
@@ -53,81 +72,97 @@ INSTANTIATE_TEST_SUITE_P(Library, HookMethods,
                                          MethodCase{"create", false}, MethodCase{"Destroy", false},
                                          MethodCase{"", false}));
 
-struct MappingCase
+struct RowCase
 {
     const char *classID;
     const char *name;
     ScriptVal value;
     Tag tag;
-    int64 expected;
 };
 
-class HookMappings : public testing::TestWithParam<MappingCase>
-{
-};
+using PublishedRows = testing::TestWithParam<RowCase>;
 
-TEST_P(HookMappings, MapsByTheClasssOwnTable)
+// A published name maps to its tag and, read back, gives the value again: the
+// tag id and the row's kind (plain, boolean, enumeration) both show.
+TEST_P(PublishedRows, MapToTheirTagAndBack)
 {
-    const MappingCase &c = GetParam();
+    const RowCase &c = GetParam();
     const TagMapHook hook = HookOf(c.classID);
     ASSERT_NE(hook, nullptr);
     ScriptVal args = Table(c.name, c.value);
     TagList tags;
     ASSERT_TRUE(hook(OrbID("Create"), MAP_ToTags, args, tags)) << TakeScriptError();
-    EXPECT_EQ(tags.GetLong(c.tag, -1), c.expected);
+    ASSERT_EQ(tags.Count(), 1);
+    EXPECT_EQ(tags.First()->tag, c.tag);
+    ScriptVal attrs;
+    ASSERT_TRUE(hook(OrbID("GetAttrs"), MAP_FromTags, attrs, tags));
+    ASSERT_NE(attrs.FindKeyConst(c.name), nullptr);
+    const ScriptVal &back = *attrs.FindKeyConst(c.name);
+    EXPECT_EQ(TagIsRepeatable(c.tag) ? *back.FindKeyConst(1) : back, c.value);
 }
 
-INSTANTIATE_TEST_SUITE_P(Library, HookMappings,
-                         testing::Values(MappingCase{"ButtonControl", "BTNC_Align", "CenteredRight", 0x10050000, 3},
-                                         MappingCase{"ComboControl", "CC_LabelPosition", "Vertical", 0x10050000, 1},
-                                         // The ID variant maps through its primary's hook.
-                                         MappingCase{"ComboIDControl", "CC_AlphaSort", true, 0x10050001, 1},
-                                         MappingCase{"ListIDControl", "LC_Rows", 9, 0x10050000, 9},
-                                         MappingCase{"ScriptValListControl", "LC_Rows", 12, 0x10050000, 12},
-                                         MappingCase{"SliderControl", "IC_TickFreq", 5, 0x10050000, 5},
-                                         MappingCase{"CrosshairControl", "CHC_Style", 3, 0x10058000, 3},
-                                         MappingCase{"RectangleControl", "RC_DoLockAspect", false, 0x10058001, 0},
-                                         MappingCase{"PolylineControl", "PLC_DrawStyle", 5, 0x10058010, 5}));
+// ID variants map through their primary's hook.
+INSTANTIATE_TEST_SUITE_P(Library, PublishedRows,
+                         testing::Values(RowCase{"CheckboxControl", "CBC_TriState", true, 0x10050000},
+                                         RowCase{"ButtonControl", "BTNC_Align", "CenteredRight", 0x10050000},
+                                         RowCase{"ButtonControl", "BTNCS_Execute", "print(1)", 0x30050000},
+                                         RowCase{"ComboControl", "CC_LabelPosition", "Vertical", 0x10050000},
+                                         RowCase{"ComboControl", "CCS_AddString", "One", 0x38040000},
+                                         RowCase{"ComboIDControl", "CC_AlphaSort", true, 0x10050001},
+                                         RowCase{"ComboIDControl", "CCID_AddID", "One", 0x88030000},
+                                         RowCase{"ListIDControl", "LC_Rows", 9, 0x10050000},
+                                         RowCase{"ScriptValListControl", "LC_AlphaSort", false, 0x10050001},
+                                         RowCase{"SliderControl", "SLCS_HighName", "High", 0x30050002},
+                                         RowCase{"PointControl", "PCID_PrevPoint", "Prev", 0x80058000},
+                                         RowCase{"PointControl", "PCD_SetPrevPointY", 0.25, 0x20058001},
+                                         RowCase{"CrosshairControl", "CHC_Style", 3, 0x10058000},
+                                         RowCase{"RectangleControl", "RC_DoLockAspect", true, 0x10058001},
+                                         RowCase{"RectangleControl", "RCID_AxisY", "Y", 0x8005800a},
+                                         RowCase{"AngleControl", "ACD_CurrentAngle", 45.5, 0x20058005},
+                                         RowCase{"PolylineControl", "PLC_ShowKeyPoints", true, 0x10058009},
+                                         RowCase{"PolylineControl", "PLC_DrawStyle", 5, 0x10058010}),
+                         [](const auto &info) { return std::string(info.param.name); });
 
-TEST(Hooks, ClassRejectsAnotherClasssTag)
+TEST(Hooks, AClassRejectsNamesNotInItsTable)
 {
-    const TagMapHook hook = HookOf("CheckboxControl");
-    ASSERT_NE(hook, nullptr);
-    ScriptVal args = Table("BTNC_Align", "Center");
+    ASSERT_NE(HookOf("CheckboxControl"), nullptr);
+    ASSERT_NE(HookOf("CameraControl"), nullptr);
+    ScriptVal other = Table("BTNC_Align", "Center");
     TagList tags;
-    EXPECT_FALSE(hook(OrbID("Create"), MAP_ToTags, args, tags));
-    EXPECT_TRUE(tags.IsEmpty());
+    EXPECT_FALSE(HookOf("CheckboxControl")(OrbID("Create"), MAP_ToTags, other, tags));
     EXPECT_NE(TakeScriptError().find("BTNC_Align"), std::string::npos);
-}
-
-TEST(Hooks, ClassWithoutPublishedNamesMapsByAnEmptyTable)
-{
-    const TagMapHook hook = HookOf("CameraControl");
-    ASSERT_NE(hook, nullptr);
-    ScriptVal none = ScriptVal::NewTable();
-    TagList tags;
-    EXPECT_TRUE(hook(OrbID("Create"), MAP_ToTags, none, tags));
-    EXPECT_TRUE(tags.IsEmpty());
+    ScriptVal none = ScriptVal::NewTable(); // no names are published for the camera
+    EXPECT_TRUE(HookOf("CameraControl")(OrbID("Create"), MAP_ToTags, none, tags));
     ScriptVal some = Table("CC_AlphaSort", true);
-    EXPECT_FALSE(hook(OrbID("Create"), MAP_ToTags, some, tags));
-    EXPECT_TRUE(tags.IsEmpty());
+    EXPECT_FALSE(HookOf("CameraControl")(OrbID("Create"), MAP_ToTags, some, tags));
     TakeScriptError();
+    EXPECT_TRUE(tags.IsEmpty());
 }
 
-TEST(Hooks, GetAttrsTurnsTagsBackIntoNames)
+TEST(TagTables, EnumerationsNameEveryValueInOrder)
 {
-    const TagMapHook hook = HookOf("ButtonControl");
-    ASSERT_NE(hook, nullptr);
-    ScriptVal args;
-    TagList tags{{0x10050000, 4}, {0x30050000, "print(1)"}};
-    ASSERT_TRUE(hook(OrbID("GetAttrs"), MAP_FromTags, args, tags));
-    ASSERT_TRUE(args.IsTable());
-    const ScriptVal *align = args.FindKeyConst("BTNC_Align");
-    const ScriptVal *execute = args.FindKeyConst("BTNCS_Execute");
-    ASSERT_NE(align, nullptr);
-    ASSERT_NE(execute, nullptr);
-    EXPECT_STREQ(align->GetString(), "Right");
-    EXPECT_STREQ(execute->GetString(), "print(1)");
+    const std::pair<const TagMapEntry *, std::vector<std::string>> cases[] = {
+        {Row("ButtonControl", "BTNC_Align"), {"Align", "Left", "CenteredLeft", "Center", "CenteredRight", "Right"}},
+        {Row("ComboControl", "CC_LabelPosition"), {"LabelPosition", "Horizontal", "Vertical"}},
+    };
+    for (const auto &[row, expected] : cases) {
+        ASSERT_NE(row, nullptr);
+        const auto *entry = static_cast<const EnumEntry *>(row->extra);
+        ASSERT_NE(entry, nullptr);
+        std::vector<std::string> names;
+        for (; entry->name; ++entry) {
+            EXPECT_EQ(entry->value, names.empty() ? ENUM_NameRow : int64(names.size() - 1)) << entry->name;
+            names.push_back(entry->name);
+        }
+        EXPECT_EQ(names, expected);
+    }
+}
+
+TEST(TagTables, VariantsShareTheirPrimarysTable)
+{
+    EXPECT_EQ(TableOf("ComboIDControl"), TableOf("ComboControl"));
+    EXPECT_EQ(TableOf("ListIDControl"), TableOf("ListControl"));
+    EXPECT_EQ(TableOf("ScriptValListControl"), TableOf("ListControl"));
 }
 
 } // namespace

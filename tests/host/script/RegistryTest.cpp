@@ -1,6 +1,7 @@
 #include "Counted.h"
 #include "TestClasses.h"
 
+#include "orbane/FFIType.h"
 #include "orbane/Registry.h"
 #include "orbane/RegistryList.h"
 #include "orbane/ScriptInfo.h"
@@ -13,11 +14,7 @@
 
 namespace Orbane {
 
-using TestKit::GadgetClassID;
-using TestKit::TestGadget;
-using TestKit::TestWidget;
-using TestKit::WidgetClassID;
-using TestKit::WidgetIDClassID;
+using namespace Orbane::TestKit;
 
 namespace {
 
@@ -28,89 +25,28 @@ struct Release
 };
 using ObjectPtr = std::unique_ptr<ScriptObject, Release>;
 
-ObjectPtr Create(const OrbID &classID, const TagList &tags = {})
-{
-    return ObjectPtr(ClassRegistry.New(classID, ScriptVal::NewTable(), tags));
-}
-
-// Hooks that count their calls, for registrations made inside one test.
 int gInits = 0;
 int gCleanups = 0;
-bool CountInit(Registry *)
-{
-    ++gInits;
-    return true;
-}
-bool CountCleanup(Registry *)
-{
-    ++gCleanups;
-    return true;
-}
-bool NoMapping(OrbID, int32, ScriptVal &, TagList &)
-{
-    return true;
-}
-ScriptObject *MakeCounted(const Registry *, const ScriptVal &, const TagList &)
-{
+const ClassHook kCountInit = [](Registry *) { return ++gInits > 0; };
+const ClassHook kCountCleanup = [](Registry *) { return ++gCleanups > 0; };
+const TagMapHook kNoMapping = [](OrbID, int32, ScriptVal &, TagList &) { return true; };
+const FactoryFunc kMakeCounted = [](const Registry *, const ScriptVal &, const TagList &) -> ScriptObject * {
     static int deaths = 0;
-    return new TestKit::Counted(&deaths);
-}
+    return new Counted(&deaths);
+};
+
+struct Root
+{
+    virtual ~Root() = default;
+};
+struct Middle : Root
+{
+};
+struct Leaf : Middle
+{
+};
 
 } // namespace
-
-TEST(ClassRegistry, FindsClassesByClassID)
-{
-    const Registry *reg = ClassRegistry.Find(WidgetClassID);
-    ASSERT_NE(reg, nullptr);
-    EXPECT_EQ(reg->ClassID(), OrbID("WidgetControl"));
-    EXPECT_STREQ(reg->Name(), "TestWidget");
-    EXPECT_EQ(reg->Kind(), REGKIND_InputControl);
-    EXPECT_EQ(reg->BaseClassID(), OrbID("TestRoot"));
-    ASSERT_NE(reg->GetScriptInfo(), nullptr);
-    EXPECT_EQ(reg->GetScriptInfo()->NativeType(), typeid(TestWidget));
-    EXPECT_STREQ(reg->GetScriptInfo()->ClassID(), "WidgetControl");
-    EXPECT_NE(reg->Factory(), nullptr);
-    EXPECT_NE(reg->MapHook(), nullptr);
-    EXPECT_EQ(reg->Tags().GetInt(REG_FormatLevel), 7) << "the registration tags stay readable";
-    EXPECT_EQ(ClassRegistry.Find(OrbID("NoSuchControl")), nullptr);
-    EXPECT_EQ(ClassRegistry.Find(OrbID()), nullptr);
-}
-
-TEST(ClassRegistry, FindsByScriptNameButNotByNativeName)
-{
-    const Registry *widget = ClassRegistry.Find(WidgetClassID);
-    EXPECT_EQ(ClassRegistry.FindScriptName("WidgetControl"), widget) << "a class ID is a script name";
-    EXPECT_EQ(ClassRegistry.FindScriptName("ScriptWidget"), widget) << "the bound script type";
-    EXPECT_EQ(ClassRegistry.FindScriptName("WidgetIDControl"), ClassRegistry.Find(WidgetIDClassID));
-    EXPECT_EQ(ClassRegistry.FindScriptName("TestWidget"), nullptr) << "the native name is neither";
-    EXPECT_EQ(ClassRegistry.FindScriptName(""), nullptr);
-    EXPECT_EQ(ClassRegistry.FindScriptName(nullptr), nullptr);
-    EXPECT_EQ(ClassRegistry.FindNativeName("TestWidget"), widget) << "the registration with the hook wins";
-}
-
-TEST(ClassRegistry, KeepsRegistrationOrder)
-{
-    const auto &all = ClassRegistry.All();
-    const auto at = [&](const OrbID &id) { return std::find(all.begin(), all.end(), ClassRegistry.Find(id)); };
-    EXPECT_LT(at(WidgetClassID), at(WidgetIDClassID));
-    EXPECT_LT(at(WidgetIDClassID), at(GadgetClassID));
-}
-
-TEST(ClassRegistry, CreatesThroughTheFactory)
-{
-    const int alive = TestWidget::sAlive;
-    {
-        ObjectPtr obj = Create(WidgetClassID, {{TestKit::WGT_Count, 3}});
-        ASSERT_NE(obj, nullptr);
-        auto *widget = dynamic_cast<TestWidget *>(obj.get());
-        ASSERT_NE(widget, nullptr);
-        EXPECT_EQ(widget->Count(), 3);
-        EXPECT_EQ(obj->GetRegistry(), ClassRegistry.Find(WidgetClassID));
-        EXPECT_EQ(TestWidget::sAlive, alive + 1);
-    }
-    EXPECT_EQ(TestWidget::sAlive, alive);
-    EXPECT_EQ(ClassRegistry.New(OrbID("NoSuchControl"), ScriptVal(), TagList()), nullptr);
-}
 
 // The variant shares the primary's factory: the object is of the primary
 // class, and it keeps the variant's registry, which tells the two apart.
@@ -120,71 +56,55 @@ TEST(ClassRegistry, AnIDVariantCreatesItsPrimaryClass)
     ASSERT_NE(variant, nullptr);
     EXPECT_EQ(variant->Base(), ClassRegistry.Find(WidgetClassID));
     EXPECT_EQ(variant->MapHook(), nullptr);
-    ObjectPtr obj = Create(WidgetIDClassID);
+    EXPECT_EQ(variant->FindMapHook(), ClassRegistry.Find(WidgetClassID)->MapHook());
+    ObjectPtr obj(ClassRegistry.New(WidgetIDClassID, ScriptVal(), TagList()));
     ASSERT_NE(obj, nullptr);
     EXPECT_EQ(typeid(*obj), typeid(TestWidget));
     EXPECT_EQ(obj->GetRegistry(), variant);
 }
 
-TEST(ClassRegistry, MapHooksAreInheritedAlongTheBaseChain)
-{
-    const Registry *widget = ClassRegistry.Find(WidgetClassID);
-    const Registry *variant = ClassRegistry.Find(WidgetIDClassID);
-    const Registry *gadget = ClassRegistry.Find(GadgetClassID);
-    EXPECT_EQ(variant->FindMapHook(), widget->MapHook());
-    EXPECT_EQ(gadget->FindMapHook(), widget->MapHook());
-    EXPECT_TRUE(gadget->IsA(WidgetClassID));
-    EXPECT_TRUE(gadget->IsA(OrbID("TestRoot")));
-    EXPECT_FALSE(widget->IsA(GadgetClassID));
-    ObjectPtr obj = Create(GadgetClassID);
-    EXPECT_NE(dynamic_cast<TestGadget *>(obj.get()), nullptr);
-}
-
 TEST(Registry, InitEntersTheListAndTheDestructorLeavesIt)
 {
-    RegistryList list;
+    RegistryList list, other;
     gInits = gCleanups = 0;
     {
         Registry reg;
         EXPECT_TRUE(
             reg._Init(list, OrbID("Local"),
-                      {{REG_ClassInit, &CountInit}, {REG_ClassCleanup, &CountCleanup}, {REG_Factory, &MakeCounted}}));
+                      {{REG_ClassInit, kCountInit}, {REG_ClassCleanup, kCountCleanup}, {REG_Factory, kMakeCounted}}));
         EXPECT_EQ(gInits, 1);
         EXPECT_EQ(list.Find(OrbID("Local")), &reg);
         EXPECT_STREQ(reg.Name(), "Local") << "without a registry name the class ID stands in";
-        ObjectPtr obj(list.New(OrbID("Local"), ScriptVal(), TagList()));
-        EXPECT_STREQ(obj->ScriptTypeName(), "Counted");
+        EXPECT_STREQ(ObjectPtr(list.New(OrbID("Local"), ScriptVal(), TagList()))->ScriptTypeName(), "Counted");
         EXPECT_EQ(gCleanups, 0);
+        Registry moving;
+        moving._Init(list, OrbID("Moving"), {});
+        moving._Init(other, OrbID("Moving"), {});
+        EXPECT_EQ(list.All().size(), 1u) << "a second _Init moves to the new list";
+        EXPECT_EQ(other.Find(OrbID("Moving")), &moving);
     }
     EXPECT_EQ(gCleanups, 1);
     EXPECT_TRUE(list.All().empty());
+    EXPECT_TRUE(other.All().empty());
 }
 
 // The base is given as the address of a static ID that another source file
 // may construct later; it is read when asked for, not copied at _Init.
-TEST(Registry, BaseClassIDIsReadThroughItsAddress)
+TEST(Registry, BaseClassIDIsReadThroughItsAddressOrGivenAsAValue)
 {
     RegistryList list;
     OrbID late;
-    Registry base, derived;
-    base._Init(list, OrbID("Base"), {{REG_TagMapHook, &NoMapping}});
+    Registry base, derived, variant;
+    base._Init(list, OrbID("Base"), {{REG_TagMapHook, kNoMapping}, {REG_Factory, kMakeCounted}});
     derived._Init(list, OrbID("Derived"), {{REG_BaseClassID, static_cast<const void *>(&late)}});
     EXPECT_EQ(derived.Base(), nullptr);
     late = OrbID("Base");
-    EXPECT_EQ(derived.BaseClassID(), OrbID("Base"));
     EXPECT_EQ(derived.Base(), &base);
-    EXPECT_EQ(derived.FindMapHook(), &NoMapping);
-}
-
-TEST(Registry, BaseClassIDMayBeAnIdentifierValue)
-{
-    RegistryList list;
-    Registry base, derived;
-    base._Init(list, OrbID("Base"), {{REG_Factory, &MakeCounted}});
-    derived._Init(list, OrbID("Derived"), {{REG_BaseClassID, OrbID("Base")}});
-    EXPECT_EQ(derived.Base(), &base);
-    ObjectPtr obj(derived.New(ScriptVal(), TagList()));
-    EXPECT_NE(obj, nullptr) << "a variant without a factory borrows its base's";
+    EXPECT_EQ(derived.FindMapHook(), kNoMapping);
+    EXPECT_TRUE(derived.IsA(OrbID("Base")));
+    variant._Init(list, OrbID("Variant"), {{REG_BaseClassID, OrbID("Base")}});
+    EXPECT_EQ(variant.Base(), &base);
+    EXPECT_NE(ObjectPtr(variant.New(ScriptVal(), TagList())), nullptr) << "a variant borrows its base's factory";
 }
 
 TEST(Registry, BaseLoopsEndWithoutAHook)
@@ -199,14 +119,22 @@ TEST(Registry, BaseLoopsEndWithoutAHook)
     EXPECT_FALSE(ra.IsA(OrbID("Elsewhere")));
 }
 
-TEST(Registry, ReinitMovesToTheNewList)
+TEST(FFIType, GetFFITypeFallsBackAlongTypeInfoBases)
 {
-    RegistryList first, second;
-    Registry reg;
-    reg._Init(first, OrbID("Moving"), {});
-    reg._Init(second, OrbID("Moving"), {});
-    EXPECT_TRUE(first.All().empty());
-    EXPECT_EQ(second.All().size(), 1u);
+    FFITypeT<Root> rootType("RootScript", "Root", "", -1, 0, nullptr);
+    SetTypeInfo(typeid(Middle), typeid(Root));
+    SetTypeInfo(typeid(Leaf), typeid(Middle));
+    EXPECT_EQ(GetFFIType(typeid(Leaf)), nullptr) << "nothing bound yet";
+    SetFFIType(typeid(Root), &rootType);
+    EXPECT_EQ(GetFFIType(typeid(Leaf)), &rootType);
+    {
+        FFITypeT<Middle> middleType("MiddleScript", "Middle", "RootScript", -1, 0, nullptr);
+        SetFFIType(typeid(Middle), &middleType);
+        EXPECT_EQ(GetFFIType(typeid(Leaf)), &middleType) << "the nearest base wins";
+        EXPECT_EQ(FFIType::FindScriptName("MiddleScript"), &middleType);
+    }
+    EXPECT_EQ(GetFFIType(typeid(Leaf)), &rootType) << "a destroyed type is unbound";
+    EXPECT_EQ(FFIType::FindScriptName("MiddleScript"), nullptr);
 }
 
 } // namespace Orbane

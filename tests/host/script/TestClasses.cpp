@@ -52,13 +52,6 @@ TestWidget::~TestWidget()
     --sAlive;
 }
 
-void *TestWidget::operator new(std::size_t size)
-{
-    if (void *block = Reuser::operator new(size))
-        return block;
-    throw std::bad_alloc();
-}
-
 void TestWidget::operator delete(void *block, std::size_t size) noexcept
 {
     Reuser::operator delete(block, size);
@@ -108,27 +101,11 @@ bool WidgetHook(OrbID method, int32 direction, ScriptVal &args, TagList &tags)
     return true;
 }
 
-bool ClassInit(Registry *)
-{
-    return true;
-}
-
-bool ClassCleanup(Registry *)
-{
-    return true;
-}
-
 const OrbID RootClassID("TestRoot");
 
 TagList Registration(const OrbID *base, ScriptInfo *info, const char *name, FactoryFunc factory, TagMapHook hook)
 {
-    TagList tags{
-        {REG_ClassInit, &ClassInit},      {REG_ClassCleanup, &ClassCleanup},
-        {REG_Kind, REGKIND_InputControl}, {REG_FormatLevel, 7},
-        {REG_BuildStamp, "Built: today"}, {REG_BaseClassID, base},
-        {REG_ScriptInfo, info},           {REG_Name, name},
-        {REG_Factory, factory},
-    };
+    TagList tags{{REG_BaseClassID, base}, {REG_ScriptInfo, info}, {REG_Name, name}, {REG_Factory, factory}};
     if (hook)
         tags.Add(REG_TagMapHook, hook);
     return tags;
@@ -136,19 +113,23 @@ TagList Registration(const OrbID *base, ScriptInfo *info, const char *name, Fact
 
 } // namespace
 
-// The order of a control library's initialisers: type info, class ID,
-// registry, script info, the functions, then the type they belong to.
-
+// Ordered as a control library's initialisers: type info, class ID, registry,
+// script info, the functions, then the type they belong to. The ID variant
+// binds its own script type to the widget's class after the primary's; the
+// gadget derives from the widget and inherits its hook through the base ID.
 const bool kWidgetTypeInfo = (SetTypeInfo(typeid(TestWidget), typeid(RefObject)), true);
+const bool kGadgetTypeInfo = (SetTypeInfo(typeid(TestGadget), typeid(TestWidget)), true);
 const OrbID WidgetClassID("WidgetControl");
+const OrbID WidgetIDClassID("WidgetIDControl");
+const OrbID GadgetClassID("GadgetControl");
 
 namespace {
 
 extern FFITypeT<TestWidget> WidgetType;
-extern FFITypeT<TestWidget> WidgetIDType;
-extern FFITypeT<TestGadget> GadgetType;
-
 extern ScriptInfoT<TestWidget> WidgetInfo;
+extern ScriptInfoT<TestWidget> WidgetIDInfo;
+extern ScriptInfoT<TestGadget> GadgetInfo;
+
 Registry WidgetReg;
 const bool kWidgetRegistered =
     WidgetReg._Init(ClassRegistry, WidgetClassID,
@@ -158,21 +139,10 @@ FFIFunc WidgetCast(WidgetType, "_cast", "_cast", "ffi_TestWidget_cast", "TestWid
                    "obj", nullptr, "TestWidget *", 0);
 FFIFunc WidgetUncast(WidgetType, "_uncast", "_uncast", "ffi_TestWidget_uncast",
                      "ScriptObject * ffi_TestWidget_uncast(TestWidget * self)", "self", nullptr, "ScriptObject *", 0);
-FFIFunc WidgetCount(WidgetType, "count", "count", "test_TestWidget_count",
-                    "int test_TestWidget_count(TestWidget * self)", "self", nullptr, "int", 0);
 FFITypeT<TestWidget> WidgetType("ScriptWidget", "TestWidget", "InputControl", -1, 0, nullptr);
 const bool kWidgetBound = (SetFFIType(typeid(TestWidget), &WidgetType), true);
 FFITagMap WidgetMap(WidgetType, "Create", "InputControl.Create", WidgetTags);
 
-} // namespace
-
-// The ID variant: same factory and registry name, no hook, a script type of
-// its own bound to the same class after the primary's.
-const OrbID WidgetIDClassID("WidgetIDControl");
-
-namespace {
-
-extern ScriptInfoT<TestWidget> WidgetIDInfo;
 Registry WidgetIDReg;
 const bool kWidgetIDRegistered =
     WidgetIDReg._Init(ClassRegistry, WidgetIDClassID,
@@ -182,25 +152,11 @@ FFITypeT<TestWidget> WidgetIDType("WidgetIDControl", "WidgetIDControl", "InputCo
 const bool kWidgetIDBound = (SetFFIType(typeid(TestWidget), &WidgetIDType), true);
 FFITagMap WidgetIDMap(WidgetIDType, "Create", "InputControl.Create", WidgetTags);
 
-} // namespace
-
-// A derived class with a factory of its own but no hook: it inherits the
-// widget's tag translation through its base class ID.
-const bool kGadgetTypeInfo = (SetTypeInfo(typeid(TestGadget), typeid(TestWidget)), true);
-const OrbID GadgetClassID("GadgetControl");
-
-namespace {
-
-extern ScriptInfoT<TestGadget> GadgetInfo;
 Registry GadgetReg;
 const bool kGadgetRegistered =
     GadgetReg._Init(ClassRegistry, GadgetClassID,
                     Registration(&WidgetClassID, &GadgetInfo, "TestGadget", &Factory<TestGadget>, nullptr));
 ScriptInfoT<TestGadget> GadgetInfo(1, "GadgetControl", "", "");
-FFIFunc GadgetCast(GadgetType, "_cast", "_cast", "ffi_TestGadget_cast", "TestGadget * ffi_TestGadget_cast(void * obj)",
-                   "obj", nullptr, "TestGadget *", 0);
-FFIFunc GadgetUncast(GadgetType, "_uncast", "_uncast", "ffi_TestGadget_uncast",
-                     "ScriptObject * ffi_TestGadget_uncast(TestGadget * self)", "self", nullptr, "ScriptObject *", 0);
 FFITypeT<TestGadget> GadgetType("GadgetControl", "TestGadget", "ScriptWidget", -1, 0, nullptr);
 const bool kGadgetBound = (SetFFIType(typeid(TestGadget), &GadgetType), true);
 
@@ -209,7 +165,6 @@ const bool kGadgetBound = (SetFFIType(typeid(TestGadget), &GadgetType), true);
 } // namespace Orbane::TestKit
 
 using Orbane::ScriptObject;
-using Orbane::TestKit::TestGadget;
 using Orbane::TestKit::TestWidget;
 
 // Exported for ffi.C, as the control library exports its casts.
@@ -223,21 +178,6 @@ TestWidget *ffi_TestWidget_cast(void *obj)
 ScriptObject *ffi_TestWidget_uncast(TestWidget *self)
 {
     return self;
-}
-
-TestGadget *ffi_TestGadget_cast(void *obj)
-{
-    return dynamic_cast<TestGadget *>(static_cast<ScriptObject *>(obj));
-}
-
-ScriptObject *ffi_TestGadget_uncast(TestGadget *self)
-{
-    return self;
-}
-
-int test_TestWidget_count(TestWidget *self)
-{
-    return self ? int(self->Count()) : -1;
 }
 
 } // extern "C"

@@ -30,7 +30,6 @@ enum WidgetTag : Tag
 };
 
 extern const TagMapEntry WidgetTags[];
-constexpr int kWidgetTagCount = 10;
 
 // Registered the way the control library registers a control: class ID
 // "WidgetControl", registry and native name "TestWidget", script type
@@ -47,7 +46,6 @@ public:
     TestWidget(const Registry *reg, const ScriptVal &args, const TagList &tags);
     ~TestWidget() override;
 
-    static void *operator new(std::size_t size);
     static void operator delete(void *block, std::size_t size) noexcept;
 
     const Registry *GetRegistry() const override { return mRegistry; }
@@ -55,7 +53,6 @@ public:
     bool GetAttrsTagList(TagList &tags) const override;
     bool SetAttrsTagList(const TagList &tags) override;
 
-    const TagList &Tags() const noexcept { return mTags; }
     int64 Count() const { return mTags.GetLong(WGT_Count); }
 
     // Widgets alive right now.
