@@ -70,15 +70,10 @@ private slots:
     void textsRule();
     void disconnectWrite_data();
     void disconnectWrite();
-    void layoutReadOnce();
     void clicksWrite_data();
     void clicksWrite();
-    void mixedValueShowsThirdState();
-    void triStateSwitchAtOnce();
     void wrapping_data();
     void wrapping();
-    void copyAttr_data();
-    void copyAttr();
     void undoRenotifiesEveryControl();
 };
 
@@ -91,34 +86,29 @@ void CheckBoxControlTest::initTestCase()
 void CheckBoxControlTest::labelRule_data()
 {
     QTest::addColumn<TagList>("attrs");
-    QTest::addColumn<QString>("label");
-    QTest::addColumn<QString>("second");
-    QTest::newRow("label text") << TagList{{0x30040000, "Invert"}, {0x30020014, "Invert Name"}} << "Invert"
-                                << "";
-    QTest::newRow("Input name") << TagList{{0x30020014, "Invert Name"}} << "Invert Name"
-                                << "";
-    QTest::newRow("identifier") << TagList{} << "InvertID"
-                                << "";
-    QTest::newRow("second text") << TagList{{0x30040000, "Red"}, {0x30040001, "Channels"}} << "Red"
-                                 << "Channels";
+    QTest::addColumn<QStringList>("texts"); // the box's label, the second text
+    QTest::newRow("label text") << TagList{{0x30040000, "Invert"}, {0x30020014, "Invert Name"}}
+                                << QStringList{"Invert", ""};
+    QTest::newRow("Input name") << TagList{{0x30020014, "Invert Name"}} << QStringList{"Invert Name", ""};
+    QTest::newRow("identifier") << TagList{} << QStringList{"InvertID", ""};
+    QTest::newRow("second text") << TagList{{0x30040000, "Red"}, {0x30040001, "Channels"}}
+                                 << QStringList{"Red", "Channels"};
 }
 
 void CheckBoxControlTest::labelRule()
 {
     QFETCH(TagList, attrs);
-    QFETCH(QString, label);
-    QFETCH(QString, second);
+    QFETCH(QStringList, texts);
     ToolFixture f;
     InputControl *c = CheckBox(f, {f.AddNumber("InvertID", 0.0, attrs)});
     QVERIFY(c);
-    QCOMPARE(BoxOf(c)->GetLabel(), label);
-    QCOMPARE(LabelOf(c)->text(), second);
-    QCOMPARE(LabelOf(c)->isHidden(), second.isEmpty());
-    QCOMPARE(LabelOf(c)->elideMode(), int(ElideLabel::Elide_Right));
+    QCOMPARE(BoxOf(c)->GetLabel(), texts[0]);
+    QCOMPARE(LabelOf(c)->text(), texts[1]);
+    QCOMPARE(LabelOf(c)->isHidden(), texts[1].isEmpty());
     QCOMPARE(LabelOf(c)->focusProxy(), BoxOf(c));
     TagList got;
     c->GetAttrsTagList(got);
-    QCOMPARE(QString(got.GetString(0x30040000, "")), label);
+    QCOMPARE(QString(got.GetString(0x30040000, "")), texts[0]);
 }
 
 void CheckBoxControlTest::notifyGate_data()
@@ -162,28 +152,23 @@ void CheckBoxControlTest::notifyGate()
 void CheckBoxControlTest::textsRule_data()
 {
     QTest::addColumn<TagList>("tags");
-    QTest::addColumn<QString>("label");
-    QTest::addColumn<QString>("second");
+    QTest::addColumn<QStringList>("texts"); // label and second text after
     QTest::addColumn<bool>("changed");
-    QTest::newRow("no text tags") << TagList{{kTriState, 0}} << "Invert"
-                                  << "Opt" << false;
-    QTest::newRow("same text") << TagList{{0x30040000, "Invert"}} << "Invert"
-                               << "Opt" << false;
-    QTest::newRow("same texts") << TagList{{0x30040000, "Invert"}, {0x30040001, "Opt"}} << "Invert"
-                                << "Opt" << false;
-    QTest::newRow("new label") << TagList{{0x30040000, "Flip"}} << "Flip"
-                               << "Opt" << true;
-    QTest::newRow("Input name") << TagList{{0x30020014, "Named"}} << "Named"
-                                << "Opt" << true;
-    QTest::newRow("new second") << TagList{{0x30040001, "More"}} << "Invert"
-                                << "More" << true;
+    QTest::newRow("no text tags") << TagList{{kTriState, 0}} << QStringList{"Invert", "Opt"} << false;
+    QTest::newRow("same texts") << TagList{{0x30040000, "Invert"}, {0x30040001, "Opt"}} << QStringList{"Invert", "Opt"}
+                                << false;
+    QTest::newRow("new label") << TagList{{0x30040000, "Flip"}} << QStringList{"Flip", "Opt"} << true;
+    QTest::newRow("Input name") << TagList{{0x30020014, "Named"}} << QStringList{"Named", "Opt"} << true;
+    QTest::newRow("new second") << TagList{{0x30040001, "More"}} << QStringList{"Invert", "More"} << true;
+    QTest::newRow("label before name") << TagList{{0x30020014, "Named"}, {0x30040000, "Invert"}}
+                                       << QStringList{"Invert", "Opt"} << false;
+    QTest::newRow("second cleared") << TagList{{0x30040001, ""}} << QStringList{"Invert", ""} << true;
 }
 
 void CheckBoxControlTest::textsRule()
 {
     QFETCH(TagList, tags);
-    QFETCH(QString, label);
-    QFETCH(QString, second);
+    QFETCH(QStringList, texts);
     QFETCH(bool, changed);
     ToolFixture f;
     Input *in = f.AddNumber("Invert", 0.0, TagList{{0x30040000, "Invert"}, {0x30040001, "Opt"}});
@@ -193,13 +178,12 @@ void CheckBoxControlTest::textsRule()
     QVERIFY(c->SetAttrsTagList(in, tags));
     TagList got;
     c->GetAttrsTagList(got);
-    QCOMPARE(QString(got.GetString(0x30040000, "")), label);
-    QCOMPARE(QString(got.GetString(0x30040001, "")), second);
+    QCOMPARE((QStringList{got.GetString(0x30040000, ""), got.GetString(0x30040001, "")}), texts);
     // Texts changed after Open wait for the next redisplay.
     QCOMPARE(BoxOf(c)->GetLabel(), QString("shown"));
     c->UpdateDisplay(nullptr, nullptr);
-    QCOMPARE(BoxOf(c)->GetLabel(), changed ? label : QString("shown"));
-    QCOMPARE(LabelOf(c)->text(), second);
+    QCOMPARE(BoxOf(c)->GetLabel(), changed ? texts[0] : QString("shown"));
+    QCOMPARE(LabelOf(c)->text(), texts[1]);
 }
 
 void CheckBoxControlTest::disconnectWrite_data()
@@ -231,32 +215,40 @@ void CheckBoxControlTest::disconnectWrite()
     QVERIFY(f.doc.UndoNames().isEmpty());
 }
 
-void CheckBoxControlTest::layoutReadOnce()
-{
-    ToolFixture f;
-    for (int i = 0; i < 4; ++i)
-        QVERIFY(CheckBox(f, {f.AddNumber(("In" + std::to_string(i)).c_str(), 0.0)}));
-    QCOMPARE(InputControl::LayoutReadCount("Controls.CheckBox.Layout"), 1);
-}
-
 void CheckBoxControlTest::clicksWrite_data()
 {
-    QTest::addColumn<bool>("triState");
+    QTest::addColumn<bool>("triState"); // as declared
+    QTest::addColumn<int>("switchTo");  // the tri-state tag set after Open, or -1
     QTest::addColumn<QList<double>>("values");
     QTest::addColumn<QList<int>>("states");
-    QTest::newRow("two states") << false << QList<double>{1, 0, 1, 0} << QList<int>{1, 0, 1, 0};
-    QTest::newRow("three states") << true << QList<double>{1, -1, 0, 1} << QList<int>{1, 2, 0, 1};
+    QTest::newRow("two states") << false << -1 << QList<double>{1, 0, 1, 0} << QList<int>{1, 0, 1, 0};
+    QTest::newRow("three states") << true << -1 << QList<double>{1, -1, 0, 1} << QList<int>{1, 2, 0, 1};
+    QTest::newRow("switched to two states") << true << 0 << QList<double>{1, 0} << QList<int>{1, 0};
+    QTest::newRow("switched to three states") << false << 1 << QList<double>{1, -1} << QList<int>{1, 2};
 }
 
 void CheckBoxControlTest::clicksWrite()
 {
     QFETCH(bool, triState);
+    QFETCH(int, switchTo);
     QFETCH(QList<double>, values);
     QFETCH(QList<int>, states);
     ToolFixture f;
     Input *in = f.AddNumber("Invert", 0.0, TagList{{kTriState, triState}});
     InputControl *c = CheckBox(f, {in});
-    QCOMPARE(BoxOf(c)->GetStyle(), triState ? 2 : 1);
+    // CopyAttr is false where it supplied a value.
+    int32 out = 77;
+    QCOMPARE(c->CopyAttr(kTriState, &out), false);
+    QCOMPARE(out, int32(triState));
+    out = 77;
+    QCOMPARE(c->CopyAttr(kAllowWrap, &out), true);
+    QCOMPARE(out, 77);
+    // A switch applies at once; a list without the tag keeps the style.
+    if (switchTo >= 0)
+        QVERIFY(c->SetAttrsTagList(TagList{{kTriState, switchTo}}));
+    QVERIFY(c->SetAttrsTagList(in, TagList{{0x30040000, "Invert"}}));
+    const bool three = switchTo < 0 ? triState : switchTo == 1;
+    QCOMPARE(BoxOf(c)->GetStyle(), three ? 2 : 1);
     for (int i = 0; i < values.size(); ++i) {
         Click(c);
         QCOMPARE(f.NumberOf(in), values[i]);
@@ -265,41 +257,6 @@ void CheckBoxControlTest::clicksWrite()
         QVERIFY(!c->IsUndoOpen());
     }
     QCOMPARE(f.doc.UndoNames().first(), QString("Change Invert"));
-}
-
-void CheckBoxControlTest::mixedValueShowsThirdState()
-{
-    ToolFixture f;
-    Input *in = f.AddNumber("Invert", -1.0, TagList{{kTriState, 1}});
-    InputControl *c = CheckBox(f, {in});
-    QCOMPARE(BoxOf(c)->GetCheck(), 2);
-    const AutoNumber one(1.0);
-    QVERIFY(in->SetValue(one, 0.0));
-    QCOMPARE(BoxOf(c)->GetCheck(), 1);
-    const AutoNumber mixed(-1.0);
-    QVERIFY(in->SetValue(mixed, 0.0));
-    QCOMPARE(BoxOf(c)->GetCheck(), 2);
-}
-
-void CheckBoxControlTest::triStateSwitchAtOnce()
-{
-    ToolFixture f;
-    Input *in = f.AddNumber("Invert", 0.0, TagList{{kTriState, 1}});
-    InputControl *c = CheckBox(f, {in});
-    QCOMPARE(BoxOf(c)->GetStyle(), 2);
-    QVERIFY(c->SetAttrsTagList(in, TagList{{kTriState, 0}}));
-    QCOMPARE(BoxOf(c)->GetStyle(), 1);
-    int32 tri = -5;
-    c->CopyAttr(kTriState, &tri);
-    QCOMPARE(tri, 0);
-    Click(c);
-    Click(c);
-    QCOMPARE(f.NumberOf(in), 0.0);
-    // A list without the tag keeps the style.
-    QVERIFY(c->SetAttrsTagList(in, TagList{{0x30040000, "Invert"}}));
-    QCOMPARE(BoxOf(c)->GetStyle(), 1);
-    QVERIFY(c->SetAttrsTagList(TagList{{kTriState, 1}}));
-    QCOMPARE(BoxOf(c)->GetStyle(), 2);
 }
 
 void CheckBoxControlTest::wrapping_data()
@@ -321,42 +278,17 @@ void CheckBoxControlTest::wrapping()
     Input *wrapping = f.AddNumber("Wrapping", 0.0, TagList{{0x30040000, label.constData()}, {kAllowWrap, 1}});
     InputControl *one = CheckBox(f, {plain}, 240);
     InputControl *many = CheckBox(f, {wrapping}, 240);
-    QVERIFY(BoxOf(many)->IsWrapAllowed());
-    QVERIFY(!BoxOf(one)->IsWrapAllowed());
+    QVERIFY(BoxOf(many)->IsWrapAllowed() && !BoxOf(one)->IsWrapAllowed());
     if (grows) {
-        QVERIFY(many->height() > one->height());
         QVERIFY(BoxOf(many)->height() > BoxOf(one)->height());
         // Wider, it needs fewer lines.
         const int32 narrow = many->height();
+        QVERIFY(narrow > one->height());
         QVERIFY(f.Resize(many, 900) < narrow);
     } else {
         QCOMPARE(many->height(), one->height());
         QCOMPARE(f.Resize(many, 900), one->height());
     }
-}
-
-void CheckBoxControlTest::copyAttr_data()
-{
-    QTest::addColumn<bool>("triState");
-    QTest::newRow("two states") << false;
-    QTest::newRow("three states") << true;
-}
-
-void CheckBoxControlTest::copyAttr()
-{
-    QFETCH(bool, triState);
-    ToolFixture f;
-    InputControl *c = CheckBox(f, {f.AddNumber("Invert", 0.0, TagList{{kTriState, triState}})});
-    int32 out = 77;
-    // False: a value was supplied.
-    QCOMPARE(c->CopyAttr(kTriState, &out), false);
-    QCOMPARE(out, int32(triState));
-    out = 77;
-    QCOMPARE(c->CopyAttr(kAllowWrap, &out), true);
-    QCOMPARE(out, 77);
-    TagList got;
-    c->GetAttrsTagList(got);
-    QCOMPARE(got.GetBool(kTriState, !triState), triState);
 }
 
 void CheckBoxControlTest::undoRenotifiesEveryControl()
@@ -365,6 +297,8 @@ void CheckBoxControlTest::undoRenotifiesEveryControl()
     Input *in = f.AddNumber("Invert", 0.0);
     InputControl *first = CheckBox(f, {in});
     InputControl *second = CheckBox(f, {in});
+    // However many controls, the layout description is read once.
+    QCOMPARE(InputControl::LayoutReadCount("Controls.CheckBox.Layout"), 1);
     Click(first);
     QCOMPARE(f.NumberOf(in), 1.0);
     QCOMPARE(BoxOf(second)->GetCheck(), 1);

@@ -52,9 +52,8 @@ class PickButtonTest : public QObject
 private slots:
     void saveRestore_data();
     void saveRestore();
-    void failedPickRestores();
-    void pickOverWidgetNotifiesIt();
-    void disabledPickIsAPlainButton();
+    void pick_data();
+    void pick();
     void attachedObjectHeld();
 };
 
@@ -66,8 +65,6 @@ void PickButtonTest::saveRestore_data()
     QTest::newRow("slot 0") << TagList{{kSaveIndex, 0}} << false << 0;
     QTest::newRow("slot 31") << TagList{{kSaveIndex, 31}} << false << 31;
     QTest::newRow("slot 32 skipped") << TagList{{kSaveIndex, 32}} << false << -1;
-    QTest::newRow("negative skipped") << TagList{{kSaveIndex, -1}} << false << -1;
-    QTest::newRow("no index skipped") << TagList{} << false << -1;
     QTest::newRow("point skipped") << TagList{{kSaveIndex, 3}} << true << -1;
 }
 
@@ -96,31 +93,19 @@ void PickButtonTest::saveRestore()
     QCOMPARE(f.doc.UndoNames().size(), steps);
 }
 
-void PickButtonTest::failedPickRestores()
+void PickButtonTest::pick_data()
 {
-    ToolFixture f;
-    Input *gain = f.AddNumber("Gain", 1.5, TagList{{kSaveIndex, 2}});
-    auto *owner = static_cast<TestControl *>(f.Bind(new TestControl, {gain}));
-    PickButton button(&f.page);
-    button.setGeometry(10, 200, 60, 24);
-    button.show();
-    button.SetOwner(owner);
-    button.SetPickEnabled(true);
-    QSignalSpy picked(&button, SIGNAL(Picked(QWidget *, QPoint)));
-    QTest::mousePress(&button, Qt::LeftButton, Qt::NoModifier, QPoint(5, 5));
-    QVERIFY(button.IsPicking());
-    QCOMPARE(button.cursor().shape(), Qt::CrossCursor);
-    Set(gain, 7.0);
-    // Released far outside every window of the application.
-    QTest::mouseRelease(&button, Qt::LeftButton, Qt::NoModifier, QPoint(-5000, -5000));
-    QVERIFY(!button.IsPicking());
-    QVERIFY(!button.testAttribute(Qt::WA_SetCursor));
-    QCOMPARE(f.NumberOf(gain), 1.5);
-    QCOMPARE(picked.count(), 0);
+    QTest::addColumn<bool>("enabled");
+    QTest::addColumn<bool>("overTarget");
+    QTest::newRow("released over a widget") << true << true;
+    QTest::newRow("released outside every window") << true << false;
+    QTest::newRow("picking off: a plain button") << false << true;
 }
 
-void PickButtonTest::pickOverWidgetNotifiesIt()
+void PickButtonTest::pick()
 {
+    QFETCH(bool, enabled);
+    QFETCH(bool, overTarget);
     ToolFixture f;
     Input *gain = f.AddNumber("Gain", 1.5, TagList{{kSaveIndex, 2}});
     auto *owner = static_cast<TestControl *>(f.Bind(new TestControl, {gain}));
@@ -131,44 +116,43 @@ void PickButtonTest::pickOverWidgetNotifiesIt()
     button.setGeometry(10, 200, 60, 24);
     button.show();
     button.SetOwner(owner);
-    button.SetPickEnabled(true);
+    button.SetPickEnabled(enabled);
     QSignalSpy picked(&button, SIGNAL(Picked(QWidget *, QPoint)));
+    QSignalSpy pressed(&button, SIGNAL(ButtonPressed(uint64, bool)));
     QTest::mousePress(&button, Qt::LeftButton, Qt::NoModifier, QPoint(5, 5));
+    QCOMPARE(button.IsPicking(), enabled);
+    QCOMPARE(button.cursor().shape() == Qt::CrossCursor, enabled);
     Set(gain, 7.0);
     const QPoint over = button.mapFrom(&f.page, target.geometry().topLeft() + QPoint(30, 20));
-    QTest::mouseRelease(&button, Qt::LeftButton, Qt::NoModifier, over);
-    QCOMPARE(picked.count(), 1);
+    QTest::mouseRelease(&button, Qt::LeftButton, Qt::NoModifier,
+                        !enabled     ? QPoint(5, 5)
+                        : overTarget ? over
+                                     : QPoint(-5000, -5000));
+    QVERIFY(!button.IsPicking());
+    QVERIFY(!button.testAttribute(Qt::WA_SetCursor));
+    // A pick that found its widget keeps what the pick did; a failed one restores.
+    QCOMPARE(f.NumberOf(gain), enabled && !overTarget ? 1.5 : 7.0);
+    if (!enabled)
+        QCOMPARE(pressed.count(), 1);
+    QCOMPARE(picked.count(), int(enabled && overTarget));
+    if (picked.isEmpty())
+        return;
     QCOMPARE(picked.first().at(0).value<QWidget *>(), static_cast<QWidget *>(&target));
     QCOMPARE(picked.first().at(1).toPoint(), QPoint(30, 20));
     QTRY_COMPARE(target.notes.size(), 1);
     QCOMPARE(target.notes.first().first, CCPickButton::kPickEvent);
     QCOMPARE(target.notes.first().second, uint64(30) | uint64(20) << 16);
-    // A pick that found its widget keeps what the pick did.
-    QCOMPARE(f.NumberOf(gain), 7.0);
-}
-
-void PickButtonTest::disabledPickIsAPlainButton()
-{
-    PickButton button;
-    button.resize(60, 24);
-    QSignalSpy pressed(&button, SIGNAL(ButtonPressed(uint64, bool)));
-    QTest::mousePress(&button, Qt::LeftButton, Qt::NoModifier, QPoint(5, 5));
-    QVERIFY(!button.IsPicking());
-    QTest::mouseRelease(&button, Qt::LeftButton, Qt::NoModifier, QPoint(5, 5));
-    QCOMPARE(pressed.count(), 1);
 }
 
 void PickButtonTest::attachedObjectHeld()
 {
-    Operator *tool = new Operator("Held", "TestTool");
+    AutoRef<Operator> tool(new Operator("Held", "TestTool"));
     {
         PickButton button;
         button.Attach(tool);
         QCOMPARE(tool->RefCount(), 2);
-        QCOMPARE(button.GetAttached(), static_cast<ScriptObject *>(tool));
     }
     QCOMPARE(tool->RefCount(), 1);
-    tool->DecRef();
 }
 
 QTEST_MAIN(PickButtonTest)

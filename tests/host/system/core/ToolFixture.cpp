@@ -33,14 +33,12 @@ ToolFixture::~ToolFixture()
 
 Input *ToolFixture::AddNumber(const char *id, float64 value, const TagList &attrs)
 {
-    const AutoNumber def(value);
-    return tool->AddInput(OrbID(id), id, CLSID_DataType_Number, attrs, def);
+    return tool->AddInput(OrbID(id), id, CLSID_DataType_Number, attrs, AutoNumber(value));
 }
 
 Input *ToolFixture::AddPoint(const char *id, float64 x, float64 y, const TagList &attrs)
 {
-    const AutoPoint def(x, y);
-    return tool->AddInput(OrbID(id), id, CLSID_DataType_Point, attrs, def);
+    return tool->AddInput(OrbID(id), id, CLSID_DataType_Point, attrs, AutoPoint(x, y));
 }
 
 InputControl *ToolFixture::Bind(InputControl *control, const std::vector<Input *> &inputs, int32 width)
@@ -90,8 +88,7 @@ void ToolFixture::Destroy(InputControl *control)
     if (it == mControls.end())
         return;
     mControls.erase(it);
-    const std::vector<Input *> inputs = control->Inputs();
-    for (Input *in : inputs)
+    for (Input *in : std::vector<Input *>(control->Inputs()))
         control->OnDisconnect(in, nullptr);
     control->setParent(nullptr);
     control->DecRef();

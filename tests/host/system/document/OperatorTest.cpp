@@ -13,20 +13,8 @@ class OperatorTest : public testing::Test
 protected:
     void SetUp() override { TakeScriptError(); }
 
-    AutoRef<Operator> tool{new Operator("Merge1", "Merge", {{0x10050000, 1}})};
+    AutoRef<Operator> tool{new Operator("Merge1", "Merge")};
 };
-
-TEST_F(OperatorTest, KeepsNamesAndAttributes)
-{
-    EXPECT_STREQ(tool->GetName(), "Merge1");
-    EXPECT_STREQ(tool->GetTypeName(), "Merge");
-    EXPECT_STREQ(tool->ScriptTypeName(), "Tool");
-    EXPECT_EQ(tool->GetAttrs().GetInt(0x10050000), 1);
-    EXPECT_EQ(tool->GetDoc(), nullptr);
-    EXPECT_FALSE(tool->IsLocked());
-    tool->SetLocked(true);
-    EXPECT_TRUE(tool->IsLocked());
-}
 
 TEST_F(OperatorTest, InputsStayInDeclarationOrder)
 {
@@ -72,19 +60,6 @@ INSTANTIATE_TEST_SUITE_P(Cases, BadInputTest,
                                          BadInputCase{"DefaultOfOtherType", "Size", [] { return new Point(1, 1); },
                                                       "Input \"Size\" of tool \"Merge1\" takes Number, not Point"}),
                          [](const auto &info) { return std::string(info.param.name); });
-
-TEST_F(OperatorTest, InputOutlivingItsToolForgetsIt)
-{
-    Input *in = tool->AddInput("Blend", "Blend", CLSID_DataType_Number, {}, AutoNumber(0.5));
-    AutoRef<Input> kept = AutoRef<Input>::Share(in);
-    tool.Reset();
-    EXPECT_EQ(kept->GetOperator(), nullptr);
-    EXPECT_EQ(kept->GetDoc(), nullptr);
-    EXPECT_TRUE(kept->SetValue(AutoNumber(0.7), 0.0));
-    EXPECT_EQ(AutoNumber(kept, 0.0)->Value, 0.7);
-    EXPECT_FALSE(kept->SetValue(AutoText("x"), 0.0));
-    EXPECT_EQ(TakeScriptError(), "Input \"Blend\" takes Number, not Text");
-}
 
 } // namespace
 } // namespace Orbane

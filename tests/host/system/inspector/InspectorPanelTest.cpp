@@ -169,9 +169,11 @@ private slots:
         QTest::newRow("wrong tag type") << R"(return { inputs = { { id = "A", control = "CheckboxControl",
             tags = { CBC_TriState = "yes" } } } })"
                                         << R"(tool "T": Input "A": CBC_TriState: expected a boolean, got string)";
-        QTest::newRow("default of another type") << R"(return { inputs = { { id = "A", default = "x" } } })"
-                                                 << R"(tool "T": Input "A": default: expected a value of type Number, got string)";
-        QTest::newRow("no id") << R"(return { inputs = { { name = "A" } } })" << R"(tool "T": an Input needs an id)";
+        QTest::newRow("default of another type")
+            << R"(return { inputs = { { id = "A", default = "x" } } })"
+            << R"(tool "T": Input "A": default: expected a value of type Number, got string)";
+        QTest::newRow("no id") << R"(return { inputs = { { name = "A" } } })"
+                               << R"(tool "T": an Input needs an id)";
     }
 
     void badDescriptionsFailWithClearMessages()

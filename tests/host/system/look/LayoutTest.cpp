@@ -9,7 +9,6 @@
 #include <QtTest>
 
 #include <map>
-#include <memory>
 
 using namespace Orbane;
 using Layout::Container;
@@ -18,17 +17,14 @@ using Layout::WidgetMap;
 
 namespace {
 
-// A child that asks for a known size, so that expected rectangles can be
-// worked out by hand.
+// A child that asks for 20 x 10, so that expected rectangles can be worked
+// out by hand.
 class HintWidget : public QWidget
 {
 public:
-    explicit HintWidget(QWidget *parent, QSize hint = QSize(20, 10)) : QWidget(parent), mHint(hint) {}
-    QSize sizeHint() const override { return mHint; }
+    using QWidget::QWidget;
+    QSize sizeHint() const override { return QSize(20, 10); }
     QSize minimumSizeHint() const override { return QSize(0, 0); }
-
-private:
-    QSize mHint;
 };
 
 // A description written in Lua, as look files write them.
@@ -56,9 +52,9 @@ struct Owner
     WidgetMap map;
     std::map<QString, QWidget *> children;
 
-    template <class W = HintWidget, class... A> W *Add(const QString &name, A &&...args)
+    template <class W = HintWidget> W *Add(const QString &name)
     {
-        auto *w = new W(&widget, std::forward<A>(args)...);
+        auto *w = new W(&widget);
         w->show();
         children[name] = w;
         map.Register(OrbID(name.toStdString()), w);
@@ -77,67 +73,47 @@ private slots:
     void lookDescriptionsPlaceChildren();
     void checkBoxLayout();
     void heightOverrideByTag();
-    void expressionFilledLater();
     void descriptionFormat_data();
     void descriptionFormat();
     void missingDescriptionUsesDefault();
-    void hiddenChildTakesNoRoom();
-    void deletedChildIsSafe();
+    void hiddenOrDeletedChildTakesNoRoom();
 };
 
 void LayoutTest::lookDescriptionsPlaceChildren_data()
 {
-    // Relations: "a<b" a left of b on the same row, "a^b" a above b.
+    // "a<b": a left of b on the same row; "a^b": a above b.
     QTest::addColumn<QString>("item");
-    QTest::addColumn<QStringList>("children");
     QTest::addColumn<QStringList>("relations");
-
-    QTest::newRow("check box") << "Controls.CheckBox.Layout" << QStringList{"label", "checkbox"}
-                               << QStringList{"label<checkbox"};
-    QTest::newRow("button") << "Controls.Button.Layout" << QStringList{"label", "button"}
-                            << QStringList{"label<button"};
-    QTest::newRow("combo horizontal") << "Controls.Combo.Layout.Horizontal" << QStringList{"label", "combo"}
-                                      << QStringList{"label<combo"};
-    QTest::newRow("combo vertical") << "Controls.Combo.Layout.Vertical" << QStringList{"label", "combo"}
-                                    << QStringList{"label^combo"};
+    QTest::newRow("check box") << "Controls.CheckBox.Layout" << QStringList{"label<checkbox"};
+    QTest::newRow("button") << "Controls.Button.Layout" << QStringList{"label<button"};
+    QTest::newRow("combo horizontal") << "Controls.Combo.Layout.Horizontal" << QStringList{"label<combo"};
+    QTest::newRow("combo vertical") << "Controls.Combo.Layout.Vertical" << QStringList{"label^combo"};
     QTest::newRow("slider") << "Controls.Slider.Layout"
-                            << QStringList{"slider", "edit", "label", "minlabel", "midlabel", "maxlabel"}
                             << QStringList{"label<edit", "label^slider", "slider^minlabel", "minlabel<midlabel",
                                            "midlabel<maxlabel"};
-    QTest::newRow("script value list") << "Controls.ScriptValList.Layout" << QStringList{"label", "list"}
-                                       << QStringList{"label^list"};
+    QTest::newRow("script value list") << "Controls.ScriptValList.Layout" << QStringList{"label^list"};
 }
 
 void LayoutTest::lookDescriptionsPlaceChildren()
 {
     QFETCH(QString, item);
-    QFETCH(QStringList, children);
     QFETCH(QStringList, relations);
-
     Owner owner;
-    for (const QString &name : children)
-        owner.Add(name);
+    for (const QString &relation : relations)
+        for (const QString &name : relation.split(QRegularExpression("[<^]")))
+            if (!owner.children.count(name))
+                owner.Add(name);
     auto root = Container::Create(Description(item.toUtf8().constData()), owner.map);
     const int height = root->Arrange(300);
-    QVERIFY(height > 0);
-
-    for (const QString &name : children) {
-        const QRect r = owner.Rect(name);
-        QVERIFY2(r.width() > 0 && QRect(0, 0, 300, height).contains(r),
-                 qPrintable(QStringLiteral("%1 at %2,%3 %4x%5 in height %6")
-                                .arg(name)
-                                .arg(r.x())
-                                .arg(r.y())
-                                .arg(r.width())
-                                .arg(r.height())
-                                .arg(height)));
+    for (const auto &[name, child] : owner.children) {
+        const QRect r = child->geometry();
+        QVERIFY2(r.width() > 0 && QRect(0, 0, 300, height).contains(r), qPrintable(name));
         QVERIFY(root->Find(OrbID(name.toStdString())));
     }
     for (const QString &relation : relations) {
         const bool leftOf = relation.contains('<');
         const QStringList pair = relation.split(leftOf ? '<' : '^');
-        const QRect a = owner.Rect(pair[0]);
-        const QRect b = owner.Rect(pair[1]);
+        const QRect a = owner.Rect(pair[0]), b = owner.Rect(pair[1]);
         if (leftOf) {
             QVERIFY2(a.right() < b.left(), qPrintable(relation));
             QVERIFY2(a.top() < b.bottom() && b.top() < a.bottom(), qPrintable(relation));
@@ -161,15 +137,18 @@ void LayoutTest::checkBoxLayout()
     QVERIFY(label->geometry().right() < box->geometry().left());
     QCOMPARE(box->geometry().right(), 249); // the box takes the rest of the row
     QCOMPARE(box->height(), box->sizeHint().height());
-
-    LayoutObj *expression = root->Find("expression");
-    QVERIFY(expression);
-    QVERIFY(expression->AsContainer());
-    QVERIFY(expression->isEmpty());
-    QVERIFY(expression->GetRect().top() > box->geometry().bottom());
     // An empty expression container adds neither room nor spacing.
     QCOMPARE(height, std::max(label->geometry().bottom(), box->geometry().bottom()) + 1);
     QVERIFY(!root->Find("nothing"));
+
+    // Filled later, it takes a full-width row below the box.
+    auto *edit = new QLineEdit(&owner.widget);
+    edit->show();
+    QVERIFY(root->Find("expression")->AsContainer()->AddWidget("edit", edit));
+    QVERIFY(root->Arrange(250) >= height + edit->sizeHint().height());
+    QVERIFY(edit->geometry().top() > box->geometry().bottom());
+    QCOMPARE(edit->geometry().width(), 250);
+    QCOMPARE(root->Find("edit")->GetWidget(), edit);
 }
 
 void LayoutTest::heightOverrideByTag()
@@ -183,11 +162,8 @@ void LayoutTest::heightOverrideByTag()
 
     LayoutObj *obj = root->Find("checkbox");
     QVERIFY(obj);
-    QCOMPARE(obj->GetHeight(), rowHeight);
     QVERIFY(obj->SetAttrs(TagList{{INPA_LayoutHeight, rowHeight + 37}}));
-    QCOMPARE(obj->GetHeightOverride(), rowHeight + 37);
     QCOMPARE(obj->GetHeight(), rowHeight + 37);
-
     QCOMPARE(root->Arrange(250), before + 37);
     QCOMPARE(box->height(), rowHeight + 37);
 
@@ -199,26 +175,6 @@ void LayoutTest::heightOverrideByTag()
     QCOMPARE(box->height(), rowHeight);
 }
 
-void LayoutTest::expressionFilledLater()
-{
-    Owner owner;
-    owner.Add<ElideLabel>("label");
-    auto *box = owner.Add<CustomCheckBox>("checkbox");
-    auto root = Container::Create(Description("Controls.CheckBox.Layout"), owner.map);
-    const int before = root->Arrange(250);
-
-    auto *edit = new QLineEdit(&owner.widget);
-    edit->show();
-    Container *expression = root->Find("expression")->AsContainer();
-    QVERIFY(expression->AddWidget("edit", edit));
-    const int after = root->Arrange(250);
-
-    QVERIFY(after >= before + edit->sizeHint().height());
-    QVERIFY(edit->geometry().top() > box->geometry().bottom());
-    QCOMPARE(edit->geometry().width(), 250);
-    QCOMPARE(root->Find("edit")->GetWidget(), edit);
-}
-
 void LayoutTest::descriptionFormat_data()
 {
     // Children a, b and c ask for 20 x 10 each.
@@ -228,47 +184,28 @@ void LayoutTest::descriptionFormat_data()
     QTest::addColumn<QRect>("expected");
 
     const QString fixed = R"({ kind = "hbox", spacing = 0, { name = "a", width = 50 }, { name = "b", stretch = 1 } })";
-    QTest::newRow("fixed width a") << fixed << 200 << "a" << QRect(0, 0, 50, 10);
     QTest::newRow("fixed width b") << fixed << 200 << "b" << QRect(50, 0, 150, 10);
-
-    const QString ratio = R"({ kind = "hbox", spacing = 0, { name = "a", stretch = 1 }, { name = "b", stretch = 3 } })";
-    QTest::newRow("stretch 1:3 a") << ratio << 200 << "a" << QRect(0, 0, 50, 10);
-    QTest::newRow("stretch 1:3 b") << ratio << 200 << "b" << QRect(50, 0, 150, 10);
 
     QTest::newRow("shorthand names and spacing")
         << R"({ kind = "hbox", spacing = 10, "a", "b" })" << 50 << "b" << QRect(30, 0, 20, 10);
     QTest::newRow("margins") << R"({ kind = "hbox", margins = { 5, 6, 7, 8 }, "a" })" << 100 << "a"
                              << QRect(5, 6, 88, 10);
-    QTest::newRow("uniform margins") << R"({ kind = "vbox", margins = 3, "a" })" << 100 << "a" << QRect(3, 3, 94, 10);
     QTest::newRow("vbox rows") << R"({ spacing = 2, "a", "b", "c" })" << 100 << "c" << QRect(0, 24, 100, 10);
     QTest::newRow("fixed height") << R"({ spacing = 0, { name = "a", height = 33 }, "b" })" << 100 << "b"
                                   << QRect(0, 33, 100, 10);
-    QTest::newRow("min height") << R"({ spacing = 0, { name = "a", minheight = 15 }, "b" })" << 100 << "b"
-                                << QRect(0, 15, 100, 10);
-    QTest::newRow("max width")
-        << R"({ kind = "hbox", spacing = 0, { name = "a", maxwidth = 30, stretch = 1 }, { name = "b", stretch = 1 } })"
-        << 200 << "a" << QRect(0, 0, 30, 10);
-    QTest::newRow("fixed gap") << R"({ kind = "hbox", spacing = 0, { kind = "space", width = 20 }, "a" })" << 100 << "a"
-                               << QRect(20, 0, 80, 10);
     QTest::newRow("stretch gap")
         << R"({ kind = "hbox", spacing = 0, { kind = "stretch" }, { name = "a", width = 40 } })" << 200 << "a"
         << QRect(160, 0, 40, 10);
-    QTest::newRow("align right") << R"({ kind = "hbox", { name = "a", align = "right" } })" << 200 << "a"
-                                 << QRect(180, 0, 20, 10);
-    QTest::newRow("align centre") << R"({ kind = "hbox", { name = "a", align = "hcenter|vcenter" } })" << 200 << "a"
-                                  << QRect(90, 0, 20, 10);
     QTest::newRow("nested rows") << R"({ spacing = 0, { kind = "hbox", spacing = 0, "a", "b" }, "c" })" << 100 << "c"
                                  << QRect(0, 10, 100, 10);
     const QString grid = R"({ kind = "grid", hspacing = 0, vspacing = 5, colstretch = { 1, 1 },
         { name = "a", row = 1, col = 1 }, { name = "b", row = 1, col = 2 }, { name = "c", row = 2, col = 1, colspan = 2 } })";
-    QTest::newRow("grid cell") << grid << 200 << "b" << QRect(100, 0, 100, 10);
     QTest::newRow("grid span") << grid << 200 << "c" << QRect(0, 15, 200, 10);
     QTest::newRow("unregistered name left out")
         << R"({ kind = "hbox", spacing = 0, "nosuch", "a" })" << 100 << "a" << QRect(0, 0, 100, 10);
     QTest::newRow("rest in registration order")
         << R"({ kind = "hbox", spacing = 0, { name = "c", width = 10 }, { kind = "rest" } })" << 50 << "b"
         << QRect(30, 0, 20, 10);
-    QTest::newRow("a name placed once") << R"({ spacing = 0, "a", "a", "b" })" << 100 << "b" << QRect(0, 10, 100, 10);
 }
 
 void LayoutTest::descriptionFormat()
@@ -301,14 +238,13 @@ void LayoutTest::missingDescriptionUsesDefault()
     QVERIFY(owner.Rect("first").right() < owner.Rect("second").left());
     QVERIFY(owner.Rect("second").right() < owner.Rect("third").left());
     QCOMPARE(owner.Rect("first").top(), owner.Rect("third").top());
-    QVERIFY(root->Find("expression"));
-    QVERIFY(root->Find("expression")->AsContainer());
+    QVERIFY(root->Find("expression") && root->Find("expression")->AsContainer());
 }
 
-void LayoutTest::hiddenChildTakesNoRoom()
+void LayoutTest::hiddenOrDeletedChildTakesNoRoom()
 {
     Owner owner;
-    auto *label = owner.Add("label");
+    QWidget *label = owner.Add("label");
     owner.Add("button");
     auto root = Container::Create(Description("Controls.Button.Layout"), owner.map);
     root->Arrange(200);
@@ -317,21 +253,14 @@ void LayoutTest::hiddenChildTakesNoRoom()
     label->hide();
     root->Arrange(200);
     QCOMPARE(owner.Rect("button"), QRect(0, 0, 200, 10));
-}
-
-void LayoutTest::deletedChildIsSafe()
-{
-    Owner owner;
-    QWidget *label = owner.Add("label");
-    owner.Add("button");
-    auto root = Container::Create(Description("Controls.Button.Layout"), owner.map);
+    label->show();
     root->Arrange(200);
+    QVERIFY(owner.Rect("button").left() > 0);
 
     delete label;
     QVERIFY(!root->Find("label")->GetWidget());
-    QVERIFY(root->Find("label")->isEmpty());
     root->Arrange(200);
-    QCOMPARE(owner.Rect("button").left(), 0);
+    QCOMPARE(owner.Rect("button"), QRect(0, 0, 200, 10));
 }
 
 QTEST_MAIN(LayoutTest)

@@ -25,7 +25,6 @@ private slots:
     void skinImages();
     void sharedPerProcess();
     void missingImage();
-    void knobsDiffer();
 };
 
 void ResDIBTest::skinImages_data()
@@ -88,9 +87,10 @@ void ResDIBTest::sharedPerProcess()
     const ResDIB *b = ResDIB::Find(OrbID(std::string("Controls.Slider.Knob.1")));
     QVERIFY(a);
     QCOMPARE(a, b);
-    QCOMPARE(&ResDIB::Get("Controls.Slider.Knob.1"), a);
-    // A ratio is rendered once and then reused.
-    QCOMPARE(a->Image(2.0).cacheKey(), a->Image(2.0).cacheKey());
+    // The held knob must look held: a different image of the same size.
+    const QImage held = ResDIB::Get("Controls.Slider.Knob.2").Image(2.0);
+    QCOMPARE(held.size(), a->Image(2.0).size());
+    QVERIFY(held != a->Image(2.0));
 }
 
 void ResDIBTest::missingImage()
@@ -100,16 +100,6 @@ void ResDIBTest::missingImage()
     const ResDIB &empty = ResDIB::Get("Controls.Slider.Nothing");
     QVERIFY(empty.IsNull());
     QVERIFY(empty.Image(2.0).isNull());
-    QVERIFY(empty.Pixmap(1.0).isNull());
-}
-
-void ResDIBTest::knobsDiffer()
-{
-    // The held knob must look held: a different image of the same size.
-    const QImage normal = ResDIB::Get("Controls.Slider.Knob.1").Image(2.0);
-    const QImage held = ResDIB::Get("Controls.Slider.Knob.2").Image(2.0);
-    QCOMPARE(normal.size(), held.size());
-    QVERIFY(normal != held);
 }
 
 QTEST_MAIN(ResDIBTest)
