@@ -10,8 +10,8 @@
 #include <QAction>
 #include <QMenu>
 
+#include <algorithm>
 #include <cmath>
-#include <cstdio>
 #include <string>
 #include <vector>
 
@@ -19,9 +19,8 @@ namespace Orbane {
 namespace Test {
 
 // The smallest real overlay: a 7-pixel filled square at its Input's point
-// that drags, claims the space key, offers a menu entry, a toolbar action
-// and a tip, and links to a second Input (TO_Link). It logs the calls the
-// viewer makes into it.
+// that drags, claims the space key, offers a menu entry and links to a
+// second Input (TO_Link). It logs the calls the viewer makes into it.
 class TestOverlay : public PreviewControl
 {
 public:
@@ -126,13 +125,6 @@ public:
             return uint64(reinterpret_cast<uintptr_t>(GetMainInput()));
         return PreviewControl::ControlCommand(info, command, data, tags);
     }
-    bool ControlGetTip(PreviewInfo *info, char *buffer, const TagList *tags) override
-    {
-        if (!Hit(*info) || !GetMainInput())
-            return PreviewControl::ControlGetTip(info, buffer, tags);
-        std::snprintf(buffer, TipSize, "tip of %s", GetMainInput()->GetID().c_str());
-        return true;
-    }
     void AddToMenu(QMenu *menu, PreviewInfo *info, const TagList *tags) override
     {
         menu->addAction(QString("Test %1").arg(GetMainInput()->GetID().c_str()))->setData(kMenuID);
@@ -143,23 +135,8 @@ public:
         menuIDs.push_back(id);
         return true;
     }
-    void GetAvailableEvents(std::vector<ToolbarEvent> &events, const TagList *) override
-    {
-        events.push_back({OrbID("TestEvent"), OrbString("Test")});
-    }
-    bool HandleEvent(const OrbID &event, PreviewInfo *, const TagList *) override
-    {
-        events.push_back(event.c_str());
-        return true;
-    }
 
-    int Count(const std::string &call) const
-    {
-        int n = 0;
-        for (const std::string &c : calls)
-            n += c == call;
-        return n;
-    }
+    int Count(const std::string &call) const { return int(std::count(calls.begin(), calls.end(), call)); }
     void Log(const std::string &call) { calls.push_back(call); }
     bool Hit(const PreviewInfo &info) const
     {
@@ -176,7 +153,6 @@ public:
     std::vector<std::string> calls;
     std::vector<int32> passes;
     std::vector<int32> menuIDs;
-    std::vector<std::string> events;
     std::vector<Qt::KeyboardModifiers> modifiers;
 };
 

@@ -6,29 +6,21 @@
 
 #include <QApplication>
 #include <QMouseEvent>
-#include <QTest>
-#include <QUndoStack>
 
-#include <cmath>
 #include <cstdlib>
 #include <dlfcn.h>
 
 namespace Orbane {
 namespace Test {
 
-ViewerFixture::ViewerFixture(int imageWidth, int imageHeight, const char *toolName)
-    : tool(new Operator(toolName, "TestTool")), viewer(&doc), image(imageWidth, imageHeight, QImage::Format_RGB32)
+ViewerFixture::ViewerFixture() : tool(new Operator("Tool1", "TestTool")), viewer(&doc)
 {
     doc.AddTool(tool);
     tool->DecRef();
+    QImage image(400, 200, QImage::Format_RGB32);
     image.fill(Qt::black);
     viewer.SetImage(image);
     viewer.resize(kViewWidth, kViewHeight);
-}
-
-ViewerFixture::~ViewerFixture()
-{
-    viewer.ShowTool(nullptr);
 }
 
 Input *ViewerFixture::AddPoint(const char *id, float64 x, float64 y, const TagList &attrs)
@@ -68,35 +60,10 @@ OrbPoint ViewerFixture::PointOf(const Input *input) const
     return p ? OrbPoint(p->X, p->Y) : OrbPoint(-1.0, -1.0);
 }
 
-namespace {
-
-void Send(QWidget *w, QEvent::Type type, QPoint at, Qt::MouseButton button, Qt::MouseButtons held,
-          Qt::KeyboardModifiers mods)
+void ViewerFixture::Send(QEvent::Type type, QPoint at, Qt::MouseButton button, Qt::MouseButtons held)
 {
-    QMouseEvent event(type, at, w->mapToGlobal(at), button, held, mods);
-    QApplication::sendEvent(w, &event);
-}
-
-} // namespace
-
-void ViewerFixture::Press(QPoint at, Qt::KeyboardModifiers mods, Qt::MouseButton button)
-{
-    Send(&viewer, QEvent::MouseButtonPress, at, button, button, mods);
-}
-
-void ViewerFixture::Move(QPoint at, Qt::KeyboardModifiers mods)
-{
-    Send(&viewer, QEvent::MouseMove, at, Qt::NoButton, Qt::LeftButton, mods);
-}
-
-void ViewerFixture::Release(QPoint at, Qt::KeyboardModifiers mods, Qt::MouseButton button)
-{
-    Send(&viewer, QEvent::MouseButtonRelease, at, button, Qt::NoButton, mods);
-}
-
-void ViewerFixture::Hover(QPoint at)
-{
-    Send(&viewer, QEvent::MouseMove, at, Qt::NoButton, Qt::NoButton, Qt::NoModifier);
+    QMouseEvent event(type, at, viewer.mapToGlobal(at), button, held, Qt::NoModifier);
+    QApplication::sendEvent(&viewer, &event);
 }
 
 void ViewerFixture::Drag(QPoint from, QPoint to, int steps)
@@ -105,21 +72,6 @@ void ViewerFixture::Drag(QPoint from, QPoint to, int steps)
     for (int i = 1; i <= steps; ++i)
         Move(from + (to - from) * i / steps);
     Release(to);
-}
-
-void ViewerFixture::Key(Qt::Key key, Qt::KeyboardModifiers mods)
-{
-    QTest::keyClick(&viewer, key, mods);
-}
-
-QImage ViewerFixture::Grab()
-{
-    return viewer.grab().toImage();
-}
-
-int ViewerFixture::UndoSteps() const
-{
-    return doc.UndoNames().size();
 }
 
 bool ViewerFixture::LoadControls(std::string *error)

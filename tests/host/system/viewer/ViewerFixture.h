@@ -7,6 +7,7 @@
 #include <QByteArray>
 #include <QImage>
 #include <QPoint>
+#include <QTest>
 
 #include <cmath>
 #include <string>
@@ -16,8 +17,8 @@ namespace Test {
 
 // A document with one tool and a viewer that shows it, laid out so that
 // image and widget pixels meet exactly: a 500 x 300 viewer showing a black
-// image of 400 x 200 (by default) at zoom 1, centred, so the image point
-// (0.5, 0.5) is widget pixel (250, 150) and one image pixel one widget pixel.
+// image of 400 x 200 at zoom 1, centred, so the image point (0.5, 0.5) is
+// widget pixel (250, 150) and one image pixel one widget pixel.
 // Everything reaches the viewer as Qt events.
 class ViewerFixture
 {
@@ -25,8 +26,8 @@ public:
     static constexpr int kViewWidth = 500;
     static constexpr int kViewHeight = 300;
 
-    explicit ViewerFixture(int imageWidth = 400, int imageHeight = 200, const char *toolName = "Tool1");
-    ~ViewerFixture();
+    ViewerFixture();
+    ~ViewerFixture() { viewer.ShowTool(nullptr); }
     ViewerFixture(const ViewerFixture &) = delete;
     ViewerFixture &operator=(const ViewerFixture &) = delete;
 
@@ -40,19 +41,28 @@ public:
     QPoint At(OrbPoint image, QPoint offset = QPoint()) const;
     OrbPoint PointOf(const Input *input) const;
 
-    void Press(QPoint at, Qt::KeyboardModifiers mods = Qt::NoModifier, Qt::MouseButton button = Qt::LeftButton);
-    // A move with the left button held.
-    void Move(QPoint at, Qt::KeyboardModifiers mods = Qt::NoModifier);
-    void Release(QPoint at, Qt::KeyboardModifiers mods = Qt::NoModifier, Qt::MouseButton button = Qt::LeftButton);
-    // A move with no button held.
-    void Hover(QPoint at);
+    void Press(QPoint at, Qt::MouseButton button = Qt::LeftButton)
+    {
+        Send(QEvent::MouseButtonPress, at, button, button);
+    }
+    void Move(QPoint at, Qt::MouseButtons held = Qt::LeftButton) { Send(QEvent::MouseMove, at, Qt::NoButton, held); }
+    void Hover(QPoint at) { Move(at, Qt::NoButton); }
+    void Release(QPoint at, Qt::MouseButton button = Qt::LeftButton)
+    {
+        Send(QEvent::MouseButtonRelease, at, button, Qt::NoButton);
+    }
+    void Click(QPoint at)
+    {
+        Press(at);
+        Release(at);
+    }
     // Press, moves in `steps`, release: one drag.
     void Drag(QPoint from, QPoint to, int steps = 4);
     // A key pressed and released, the modifier keys around it, as hands do.
-    void Key(Qt::Key key, Qt::KeyboardModifiers mods = Qt::NoModifier);
+    void Key(Qt::Key key, Qt::KeyboardModifiers mods = Qt::NoModifier) { QTest::keyClick(&viewer, key, mods); }
 
-    QImage Grab();
-    int UndoSteps() const;
+    QImage Grab() { return viewer.grab().toImage(); }
+    int UndoSteps() const { return doc.UndoNames().size(); }
 
     // The control library as the host loads it, once per process.
     static bool LoadControls(std::string *error);
@@ -60,13 +70,15 @@ public:
     OrbaneDoc doc;
     Operator *tool = nullptr; // owned by the document
     ViewerPanel viewer;
-    QImage image;
+
+private:
+    void Send(QEvent::Type type, QPoint at, Qt::MouseButton button, Qt::MouseButtons held);
 };
 
 // Points that agree to far below anything a viewer shows.
-inline bool Near(OrbPoint a, OrbPoint b, float64 tolerance = 1e-12)
+inline bool Near(OrbPoint a, OrbPoint b)
 {
-    return std::fabs(a.x - b.x) <= tolerance && std::fabs(a.y - b.y) <= tolerance;
+    return std::fabs(a.x - b.x) <= 1e-12 && std::fabs(a.y - b.y) <= 1e-12;
 }
 
 } // namespace Test
