@@ -1,6 +1,6 @@
 #include "MainWindow.h"
 
-#include "orbane/InspectorPanel.h"
+#include "orbane/ParameterPanel.h"
 #include "orbane/Operator.h"
 #include "orbane/OrbaneDoc.h"
 #include "orbane/ViewerPanel.h"
@@ -49,7 +49,7 @@ QWidget *MainWindow::BuildInspectorDock()
     auto *column = new QVBoxLayout(box);
     column->setContentsMargins(0, 0, 0, 0);
     mToolChooser = new QComboBox;
-    mInspector = new InspectorPanel(mDoc);
+    mInspector = new ParameterPanel(mDoc);
     column->addWidget(mToolChooser);
     column->addWidget(mInspector, 1);
     connect(mToolChooser, SIGNAL(currentIndexChanged(int)), this, SLOT(OnToolChosen(int)));

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "orbane/InspectorPanel.h"
+#include "orbane/ParameterPanel.h"
 #include "orbane/ViewerPanel.h"
 
 #include <QMainWindow>
@@ -23,7 +23,7 @@ public:
     explicit MainWindow(OrbaneDoc *doc, QWidget *parent = nullptr);
     ~MainWindow() override;
 
-    InspectorPanel *Inspector() const { return mInspector; }
+    ParameterPanel *Inspector() const { return mInspector; }
     ViewerPanel *Viewer() const { return mViewer; }
     // Shows the named tool's controls and overlays; false where there is no such tool.
     bool ShowTool(const QString &name);
@@ -45,7 +45,7 @@ private:
     QSlider *BuildTimeSlider();
 
     OrbaneDoc *mDoc;
-    InspectorPanel *mInspector = nullptr;
+    ParameterPanel *mInspector = nullptr;
     ViewerPanel *mViewer = nullptr;
     QComboBox *mToolChooser = nullptr;
     QSlider *mTimeSlider = nullptr;

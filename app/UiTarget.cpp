@@ -4,7 +4,7 @@
 
 #include "orbane/Input.h"
 #include "orbane/InputControl.h"
-#include "orbane/InspectorPanel.h"
+#include "orbane/ParameterPanel.h"
 #include "orbane/LayoutObj.h"
 #include "orbane/Operator.h"
 
@@ -76,7 +76,7 @@ UiTarget Named(const QString &name, MainWindow *window)
 UiTarget OfControl(lua_State *L, int idx, MainWindow *window)
 {
     const QString toolName = Field(L, idx, "tool"), inputName = Field(L, idx, "input");
-    InspectorPanel *inspector = window->Inspector();
+    ParameterPanel *inspector = window->Inspector();
     if (!inspector->GetTool() || toolName != inspector->GetTool()->GetName())
         if (!window->ShowTool(toolName))
             return Fail(QString("no tool \"%1\"").arg(toolName));

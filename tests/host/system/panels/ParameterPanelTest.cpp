@@ -6,7 +6,7 @@
 #include "orbane/AutoParam.h"
 #include "orbane/FallbackControl.h"
 #include "orbane/Input.h"
-#include "orbane/InspectorPanel.h"
+#include "orbane/ParameterPanel.h"
 #include "orbane/LuaRuntime.h"
 #include "orbane/Operator.h"
 #include "orbane/OrbaneDoc.h"
@@ -44,7 +44,7 @@ const char *kSwitches = R"(return { type = "Switches", inputs = {
 
 } // namespace
 
-class InspectorPanelTest : public QObject
+class ParameterPanelTest : public QObject
 {
     Q_OBJECT
 
@@ -61,7 +61,7 @@ private slots:
         std::string why;
         Operator *tool = AddTool(doc, kSwitches, "Switches1", &why);
         QVERIFY2(tool, why.c_str());
-        InspectorPanel panel(&doc);
+        ParameterPanel panel(&doc);
         panel.resize(300, 400);
         panel.show();
         panel.ShowTool(tool);
@@ -85,7 +85,7 @@ private slots:
         std::string why;
         Operator *tool = AddTool(doc, kSwitches, "Switches1", &why);
         QVERIFY2(tool, why.c_str());
-        InspectorPanel panel(&doc);
+        ParameterPanel panel(&doc);
         panel.resize(300, 400);
         panel.show();
         panel.ShowTool(tool);
@@ -107,7 +107,7 @@ private slots:
             { id = "Gain", type = "Number", default = 0.25, control = "NoSuchControl" } }})",
                                  "Tool1", &why);
         QVERIFY2(tool, why.c_str());
-        InspectorPanel panel(&doc);
+        ParameterPanel panel(&doc);
         QTest::ignoreMessage(QtWarningMsg, QRegularExpression("Input \"Gain\" .*\"NoSuchControl\", which is unknown"));
         panel.ShowTool(tool);
         QCOMPARE(panel.Controls().size(), size_t(1));
@@ -128,7 +128,7 @@ private slots:
             { id = "Mode", name = "Blend Mode", type = "Number", default = 3, control = "MultiButtonControl" } }})",
                                  "Tool1", &why);
         QVERIFY2(tool, why.c_str());
-        InspectorPanel panel(&doc);
+        ParameterPanel panel(&doc);
         panel.ShowTool(tool);
         auto *fallback = dynamic_cast<FallbackControl *>(panel.Controls().front());
         QVERIFY(fallback);
@@ -147,7 +147,7 @@ private slots:
         Operator *tool = AddTool(doc, kSwitches, "Switches1", &why);
         QVERIFY2(tool, why.c_str());
         AutoRef<Operator> keep = AutoRef<Operator>::Share(tool);
-        InspectorPanel panel(&doc);
+        ParameterPanel panel(&doc);
         panel.ShowTool(tool);
         QPointer<QWidget> first = panel.Controls().front();
         QCOMPARE(tool->FindInput("B")->Watchers().size(), size_t(2));
@@ -188,5 +188,5 @@ private slots:
     }
 };
 
-QTEST_MAIN(InspectorPanelTest)
-#include "InspectorPanelTest.moc"
+QTEST_MAIN(ParameterPanelTest)
+#include "ParameterPanelTest.moc"

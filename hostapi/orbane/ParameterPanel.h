@@ -14,18 +14,18 @@ class InputControl;
 class Operator;
 class OrbaneDoc;
 
-// Shows one tool's controls, top to bottom in Input order. For each Input it
+// The inspector: shows one tool's controls, top to bottom in Input order. For each Input it
 // creates the control classes the Input names (INPA_InputControl) through the
 // class registry and drives each control through AddInput, SetAttrsTagList,
 // Open and SetSize; a width change sizes every control again. When the tool
 // leaves the document, or another tool is shown, each control is unbound
 // (OnDisconnect) and destroyed.
-class InspectorPanel : public QScrollArea
+class ParameterPanel : public QScrollArea
 {
     Q_OBJECT
 public:
-    explicit InspectorPanel(OrbaneDoc *doc, QWidget *parent = nullptr);
-    ~InspectorPanel() override;
+    explicit ParameterPanel(OrbaneDoc *doc, QWidget *parent = nullptr);
+    ~ParameterPanel() override;
 
     void ShowTool(Operator *tool);
     Operator *GetTool() const { return mTool; }

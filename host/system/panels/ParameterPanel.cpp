@@ -1,4 +1,4 @@
-#include "orbane/InspectorPanel.h"
+#include "orbane/ParameterPanel.h"
 
 #include "orbane/FallbackControl.h"
 #include "orbane/Input.h"
@@ -20,7 +20,7 @@ constexpr int32 kSideMargin = 6;
 
 } // namespace
 
-InspectorPanel::InspectorPanel(OrbaneDoc *doc, QWidget *parent) : QScrollArea(parent), mDoc(doc)
+ParameterPanel::ParameterPanel(OrbaneDoc *doc, QWidget *parent) : QScrollArea(parent), mDoc(doc)
 {
     setWidgetResizable(false);
     setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
@@ -29,12 +29,12 @@ InspectorPanel::InspectorPanel(OrbaneDoc *doc, QWidget *parent) : QScrollArea(pa
     connect(doc, SIGNAL(toolRemoving(Orbane::Operator *)), this, SLOT(OnToolRemoving(Orbane::Operator *)));
 }
 
-InspectorPanel::~InspectorPanel()
+ParameterPanel::~ParameterPanel()
 {
     Clear();
 }
 
-void InspectorPanel::ShowTool(Operator *tool)
+void ParameterPanel::ShowTool(Operator *tool)
 {
     if (tool == mTool)
         return;
@@ -60,7 +60,7 @@ void InspectorPanel::ShowTool(Operator *tool)
     emit toolShown(tool);
 }
 
-InputControl *InspectorPanel::CreateControl(Input *input, const char *classID)
+InputControl *ParameterPanel::CreateControl(Input *input, const char *classID)
 {
     const TagList &attrs = input->GetAttrs();
     const Registry *reg = ClassRegistry.FindScriptName(classID);
@@ -76,7 +76,7 @@ InputControl *InspectorPanel::CreateControl(Input *input, const char *classID)
     return control;
 }
 
-std::vector<InputControl *> InspectorPanel::ControlsOf(const Input *input) const
+std::vector<InputControl *> ParameterPanel::ControlsOf(const Input *input) const
 {
     std::vector<InputControl *> found;
     for (InputControl *c : mControls)
@@ -86,7 +86,7 @@ std::vector<InputControl *> InspectorPanel::ControlsOf(const Input *input) const
     return found;
 }
 
-void InspectorPanel::LayOut()
+void ParameterPanel::LayOut()
 {
     const int32 width = viewport()->width();
     if (width == mLaidOutWidth || !widget())
@@ -104,13 +104,13 @@ void InspectorPanel::LayOut()
     widget()->resize(width, y + kSideMargin);
 }
 
-void InspectorPanel::resizeEvent(QResizeEvent *event)
+void ParameterPanel::resizeEvent(QResizeEvent *event)
 {
     QScrollArea::resizeEvent(event);
     LayOut();
 }
 
-void InspectorPanel::OnToolRemoving(Operator *tool)
+void ParameterPanel::OnToolRemoving(Operator *tool)
 {
     if (tool == mTool)
         ShowTool(nullptr);
@@ -118,7 +118,7 @@ void InspectorPanel::OnToolRemoving(Operator *tool)
 
 // Unbinds and destroys every control. A script may still hold one, so each
 // leaves the page before its reference is dropped.
-void InspectorPanel::Clear()
+void ParameterPanel::Clear()
 {
     for (InputControl *c : mControls) {
         const std::vector<Input *> inputs = c->Inputs();
