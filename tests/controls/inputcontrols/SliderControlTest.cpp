@@ -22,7 +22,7 @@ namespace {
 // Input attributes the slider reads.
 constexpr Tag kMinAllowed = 0x20030000, kMaxAllowed = 0x20030001;
 constexpr Tag kMinScale = 0x20030002, kMaxScale = 0x20030003, kDefault = 0x20030004;
-constexpr Tag kCentre = 0x20040006, kIndex = 0x10030007, kInteger = 0x1003000c, kKnobStyle = 0x10030011;
+constexpr Tag kIndex = 0x10030007, kInteger = 0x1003000c, kKnobStyle = 0x10030011;
 constexpr Tag kStepCount = 0x10040003, kPlaces = 0x10040004, kTimeDisplay = 0x10040006, kSnap = 0x10040007;
 constexpr Tag kReadAttrs = 0x10040008, kTickFreq = 0x10050000;
 constexpr Tag kLowName = 0x30050000, kMidName = 0x30050001, kHighName = 0x30050002;
@@ -82,30 +82,19 @@ void SendMove(QWidget *w, QPoint pos, Qt::KeyboardModifiers mods)
     QApplication::sendEvent(w, &move);
 }
 
-// Press at `fromX`, move in a few steps to `toX`, release there.
-void Drag(QWidget *w, int fromX, int toX, Qt::KeyboardModifiers mods = Qt::NoModifier)
-{
-    QTest::mousePress(w, Qt::LeftButton, mods, QPoint(fromX, kKnobY));
-    for (int i = 1; i <= 4; ++i)
-        SendMove(w, QPoint(fromX + (toX - fromX) * i / 4, kKnobY), mods);
-    QTest::mouseRelease(w, Qt::LeftButton, mods, QPoint(toX, kKnobY));
-}
-
-void SendKey(QWidget *w, QEvent::Type type, int key, Qt::KeyboardModifiers mods, bool autoRepeat)
-{
-    QKeyEvent event(type, key, mods, QString(), autoRepeat);
-    QApplication::sendEvent(w, &event);
-}
-
 // A press held for `repeats` auto-repeats, then let go.
 void HoldKey(QWidget *w, int key, Qt::KeyboardModifiers mods, int repeats)
 {
-    SendKey(w, QEvent::KeyPress, key, mods, false);
+    const auto send = [&](QEvent::Type type, bool autoRepeat) {
+        QKeyEvent event(type, key, mods, QString(), autoRepeat);
+        QApplication::sendEvent(w, &event);
+    };
+    send(QEvent::KeyPress, false);
     for (int i = 0; i < repeats; ++i) {
-        SendKey(w, QEvent::KeyRelease, key, mods, true);
-        SendKey(w, QEvent::KeyPress, key, mods, true);
+        send(QEvent::KeyRelease, true);
+        send(QEvent::KeyPress, true);
     }
-    SendKey(w, QEvent::KeyRelease, key, mods, false);
+    send(QEvent::KeyRelease, false);
 }
 
 void Type(TimeCodeEdit *edit, const QString &text)
@@ -128,31 +117,19 @@ class SliderControlTest : public QObject
     Q_OBJECT
 private slots:
     void initTestCase();
-    void geometry();
     void drags_data();
     void drags();
-    void snaps_data();
-    void snaps();
-    void integerSnapTruncates_data();
-    void integerSnapTruncates();
     void keys_data();
     void keys();
-    void pagePress();
-    void altClickResets_data();
-    void altClickResets();
     void rangeTags_data();
     void rangeTags();
     void allowedRangeResets();
-    void ownTagsSwitch();
     void typedValues_data();
     void typedValues();
     void typingKeepsEditBox();
     void typedExpression();
-    void untouchedEditWritesNothing_data();
     void untouchedEditWritesNothing();
     void inputIndexRouting();
-    void mappings_data();
-    void mappings();
     void knobStyles_data();
     void knobStyles();
     void captions();
@@ -166,56 +143,69 @@ void SliderControlTest::initTestCase()
     QVERIFY2(ToolFixture::LoadControls(&error), error.c_str());
 }
 
-// The layout gives the slider the control's whole width: the drags below
-// count on 200 pixels of track.
-void SliderControlTest::geometry()
-{
-    ToolFixture f;
-    InputControl *c = Slider(f, f.AddNumber("Blend", 0.5, Range(0.0, 1.0)));
-    QVERIFY(c);
-    QCOMPARE(SliderOf(c)->width(), kWidth);
-    QVERIFY(SliderOf(c)->height() >= 19);
-    QCOMPARE(KnobX(SliderOf(c), 0.5), 105);
-    QCOMPARE(c->findChild<QLabel *>("label")->text(), QString("Blend"));
-    QCOMPARE(EditOf(c)->text(), QString("0.5"));
-}
-
+// Each drag presses on the knob and moves through `path`, offsets in pixels
+// from the press.
 void SliderControlTest::drags_data()
 {
     QTest::addColumn<TagList>("attrs");
     QTest::addColumn<double>("start");
-    QTest::addColumn<int>("dx");
+    QTest::addColumn<QList<int>>("path");
     QTest::addColumn<int>("mods");
     QTest::addColumn<double>("written");
     QTest::addColumn<int>("steps");
-    const int none = Qt::NoModifier, ctrl = Qt::ControlModifier;
+    const int none = Qt::NoModifier, ctrl = Qt::ControlModifier, alt = Qt::AltModifier;
+    using Path = QList<int>;
     // 0..1 over 200 pixels: 0.005 a pixel, shown to three places.
-    QTest::newRow("plain right") << Range(0, 1) << 0.5 << 20 << none << 0.6 << 1;
-    QTest::newRow("plain left") << Range(0, 1) << 0.5 << -37 << none << 0.315 << 1;
-    QTest::newRow("plain 3 pixels") << Range(0, 1) << 0.5 << 3 << none << 0.515 << 1;
-    QTest::newRow("ctrl ten times slower, one more place") << Range(0, 1) << 0.5 << 3 << ctrl << 0.5015 << 1;
-    QTest::newRow("ctrl right") << Range(0, 1) << 0.5 << 20 << ctrl << 0.51 << 1;
-    QTest::newRow("clamped at the high end") << Range(0, 1) << 0.5 << 300 << none << 1.0 << 1;
-    QTest::newRow("clamped at the low end") << Range(0, 1) << 0.5 << -300 << none << 0.0 << 1;
-    QTest::newRow("ctrl clamped at the high end") << Range(0, 1) << 0.99 << 300 << ctrl << 1.0 << 1;
+    QTest::newRow("plain right") << Range(0, 1) << 0.5 << Path{10, 20} << none << 0.6 << 1;
+    QTest::newRow("plain left") << Range(0, 1) << 0.5 << Path{-37} << none << 0.315 << 1;
+    QTest::newRow("ctrl ten times slower, one more place") << Range(0, 1) << 0.5 << Path{3} << ctrl << 0.5015 << 1;
+    QTest::newRow("clamped at the high end") << Range(0, 1) << 0.5 << Path{300} << none << 1.0 << 1;
+    QTest::newRow("clamped at the low end") << Range(0, 1) << 0.5 << Path{-300} << none << 0.0 << 1;
+    // Away and back within half a pixel: exactly the value it started from,
+    // and a gesture that changed nothing leaves no undo step.
+    QTest::newRow("back to the press value") << Range(0, 1) << 0.123456 << Path{10, 0} << none << 0.123456 << 0;
+    // 0.25 is 50 pixels left of 0.5; the default 0.2523 lies 0.46 pixels away.
+    const TagList withDefault = Range(0, 1, {{kDefault, 0.2523}});
+    QTest::newRow("onto the default") << withDefault << 0.5 << Path{-25, -50} << none << 0.2523 << 1;
+    QTest::newRow("past the default") << withDefault << 0.5 << Path{-25, -51} << none << 0.245 << 1;
+    QTest::newRow("Alt-click resets") << withDefault << 0.5 << Path{0} << alt << 0.2523 << 1;
+    QTest::newRow("Alt-click without a default tag: 0") << Range(-1, 1) << 0.5 << Path{0} << alt << 0.0 << 1;
     // 0..0.2: the slider gives 0.123 and 0.127; two places write 0.12 and 0.13.
-    QTest::newRow("places 2: 0.123 writes 0.12") << Range(0, 0.2, {{kPlaces, 2}}) << 0.1 << 23 << none << 0.12 << 1;
-    QTest::newRow("places 2: 0.127 writes 0.13") << Range(0, 0.2, {{kPlaces, 2}}) << 0.1 << 27 << none << 0.13 << 1;
-    QTest::newRow("places -1: 0.123 as it is") << Range(0, 0.2, {{kPlaces, -1}}) << 0.1 << 23 << none << 0.123 << 1;
-    QTest::newRow("places 2: ctrl drag rounded") << Range(0, 1, {{kPlaces, 2}}) << 0.5 << 26 << ctrl << 0.51 << 1;
+    QTest::newRow("places 2: 0.123 writes 0.12")
+        << Range(0, 0.2, {{kPlaces, 2}}) << 0.1 << Path{23} << none << 0.12 << 1;
+    QTest::newRow("places 2: 0.127 writes 0.13")
+        << Range(0, 0.2, {{kPlaces, 2}}) << 0.1 << Path{27} << none << 0.13 << 1;
+    QTest::newRow("places -1: 0.123 as it is")
+        << Range(0, 0.2, {{kPlaces, -1}}) << 0.1 << Path{23} << none << 0.123 << 1;
     QTest::newRow("places 2: less than a step writes nothing")
-        << Range(0, 1, {{kPlaces, 2}}) << 0.5 << 3 << ctrl << 0.5 << 0;
+        << Range(0, 1, {{kPlaces, 2}}) << 0.5 << Path{3} << ctrl << 0.5 << 0;
     // 480 frames over 200 pixels: 2.4 frames a pixel, not rounded to places 0.
     QTest::newRow("time display unrounded")
-        << Range(0, 480, {{kTimeDisplay, 1}, {kPlaces, 0}}) << 240.0 << 1 << none << 242.4 << 1;
-    QTest::newRow("places 0 without time display") << Range(0, 480, {{kPlaces, 0}}) << 240.0 << 1 << none << 242.0 << 1;
+        << Range(0, 480, {{kTimeDisplay, 1}, {kPlaces, 0}}) << 240.0 << Path{1} << none << 242.4 << 1;
+    QTest::newRow("places 0 without time display")
+        << Range(0, 480, {{kPlaces, 0}}) << 240.0 << Path{1} << none << 242.0 << 1;
+    // -10..10: 0.1 a pixel; integer display with snapping to the normal step
+    // of 1 truncates toward zero after adding a half.
+    const TagList snap = Range(-10, 10, {{kInteger, 1}, {kSnap, 1}});
+    QTest::newRow("integer snap: -2.7 stored as -2") << snap << 0.0 << Path{-27} << none << -2.0 << 1;
+    QTest::newRow("integer snap: 2.7 stored as 3") << snap << 0.0 << Path{27} << none << 3.0 << 1;
+    QTest::newRow("integer, places 0, no snap: -2.7 rounds to -3")
+        << Range(-10, 10, {{kInteger, 1}, {kPlaces, 0}}) << 0.0 << Path{-27} << none << -3.0 << 1;
+    // The track fraction is the value squared: half way along it is sqrt(0.5).
+    TagList callbacks = Range(0, 1), expressions = Range(0, 1);
+    callbacks.Add(kForwardFunc, &Square);
+    callbacks.Add(kInverseFunc, &Root);
+    expressions.Add(kForwardExpr, "value^2");
+    expressions.Add(kInverseExpr, "sqrt(value)");
+    QTest::newRow("callback mapping") << callbacks << 0.0 << Path{100} << none << 0.707 << 1;
+    QTest::newRow("expression mapping") << expressions << 0.0 << Path{100} << none << 0.707 << 1;
 }
 
 void SliderControlTest::drags()
 {
     QFETCH(TagList, attrs);
     QFETCH(double, start);
-    QFETCH(int, dx);
+    QFETCH(QList<int>, path);
     QFETCH(int, mods);
     QFETCH(double, written);
     QFETCH(int, steps);
@@ -225,74 +215,16 @@ void SliderControlTest::drags()
     QWidget *slider = SliderOf(c);
     const double lo = attrs.GetDouble(kMinAllowed), hi = attrs.GetDouble(kMaxAllowed);
     const int x = KnobX(slider, (start - lo) / (hi - lo));
-    Drag(slider, x, x + dx, Qt::KeyboardModifiers(mods));
-    QCOMPARE(f.NumberOf(in), written);
+    const Qt::KeyboardModifiers m(mods);
+    QTest::mousePress(slider, Qt::LeftButton, m, QPoint(x, kKnobY));
+    for (int dx : path)
+        SendMove(slider, QPoint(x + dx, kKnobY), m);
+    QTest::mouseRelease(slider, Qt::LeftButton, m, QPoint(x + path.last(), kKnobY));
+    QVERIFY2(f.NumberOf(in) == written, qPrintable(QString::number(f.NumberOf(in), 'g', 17)));
     QCOMPARE(f.doc.UndoNames().size(), steps);
     if (steps)
         QCOMPARE(f.doc.UndoNames().last(), QString("Change Blend"));
     QVERIFY(!c->IsUndoOpen());
-}
-
-void SliderControlTest::snaps_data()
-{
-    QTest::addColumn<double>("start");
-    QTest::addColumn<double>("def");
-    QTest::addColumn<QList<int>>("path");
-    QTest::addColumn<double>("written");
-    QTest::addColumn<int>("steps");
-    // Away and back within half a pixel: exactly the value it started from,
-    // and a gesture that changed nothing leaves no undo step.
-    QTest::newRow("back to the press value") << 0.123456 << 0.9 << QList<int>{30, 40, 30} << 0.123456 << 0;
-    // Pixel 55 is 0.25; the default 0.2523 lies 0.46 pixels away.
-    QTest::newRow("onto the default") << 0.5 << 0.2523 << QList<int>{105, 80, 55} << 0.2523 << 1;
-    QTest::newRow("past the default") << 0.5 << 0.2523 << QList<int>{105, 80, 54} << 0.245 << 1;
-}
-
-void SliderControlTest::snaps()
-{
-    QFETCH(double, start);
-    QFETCH(double, def);
-    QFETCH(QList<int>, path);
-    QFETCH(double, written);
-    QFETCH(int, steps);
-    ToolFixture f;
-    Input *in = f.AddNumber("Blend", start, Range(0, 1, {{kDefault, def}}));
-    QWidget *slider = SliderOf(Slider(f, in));
-    QTest::mousePress(slider, Qt::LeftButton, Qt::NoModifier, QPoint(path.first(), kKnobY));
-    for (int x : path)
-        SendMove(slider, QPoint(x, kKnobY), Qt::NoModifier);
-    QTest::mouseRelease(slider, Qt::LeftButton, Qt::NoModifier, QPoint(path.last(), kKnobY));
-    QVERIFY2(f.NumberOf(in) == written, qPrintable(QString::number(f.NumberOf(in), 'g', 17)));
-    QCOMPARE(f.doc.UndoNames().size(), steps);
-}
-
-void SliderControlTest::integerSnapTruncates_data()
-{
-    QTest::addColumn<TagList>("attrs");
-    QTest::addColumn<int>("dx");
-    QTest::addColumn<double>("written");
-    // -10..10 over 200 pixels: 0.1 a pixel; integer display with snapping
-    // to the normal step of 1 truncates toward zero after adding a half.
-    const TagList snap = Range(-10, 10, {{kInteger, 1}, {kSnap, 1}});
-    QTest::newRow("-2.7 stored as -2") << snap << -27 << -2.0;
-    QTest::newRow("2.7 stored as 3") << snap << 27 << 3.0;
-    QTest::newRow("-0.4 stays 0") << snap << -4 << 0.0;
-    QTest::newRow("-7.5 stored as -7") << snap << -75 << -7.0;
-    QTest::newRow("no snap, places 0: -2.7 rounds to -3")
-        << Range(-10, 10, {{kInteger, 1}, {kPlaces, 0}}) << -27 << -3.0;
-}
-
-void SliderControlTest::integerSnapTruncates()
-{
-    QFETCH(TagList, attrs);
-    QFETCH(int, dx);
-    QFETCH(double, written);
-    ToolFixture f;
-    Input *in = f.AddNumber("Count", 0.0, attrs);
-    InputControl *c = Slider(f, in);
-    Drag(SliderOf(c), 105, 105 + dx);
-    QCOMPARE(f.NumberOf(in), written);
-    QCOMPARE(EditOf(c)->text(), QString::number(int(written)));
 }
 
 void SliderControlTest::keys_data()
@@ -307,16 +239,14 @@ void SliderControlTest::keys_data()
     QTest::newRow("End") << int(Qt::Key_End) << none << 0 << 1.0;
     QTest::newRow("Right") << int(Qt::Key_Right) << none << 0 << 0.51;
     QTest::newRow("Left") << int(Qt::Key_Left) << none << 0 << 0.49;
-    QTest::newRow("Page Up") << int(Qt::Key_PageUp) << none << 0 << 0.51;
     QTest::newRow("Page Down") << int(Qt::Key_PageDown) << none << 0 << 0.49;
-    QTest::newRow("Ctrl+Right fine") << int(Qt::Key_Right) << ctrl << 0 << 0.501;
+    QTest::newRow("Shift+Page Up coarse") << int(Qt::Key_PageUp) << shift << 0 << 0.6;
     QTest::newRow("Ctrl+Page Down fine") << int(Qt::Key_PageDown) << ctrl << 0 << 0.499;
-    QTest::newRow("Shift+Right coarse") << int(Qt::Key_Right) << shift << 0 << 0.6;
-    QTest::newRow("Shift+Page Down coarse") << int(Qt::Key_PageDown) << shift << 0 << 0.4;
     QTest::newRow("Right held, 4 repeats") << int(Qt::Key_Right) << none << 4 << 0.55;
     QTest::newRow("Shift+Left held, 2 repeats") << int(Qt::Key_Left) << shift << 2 << 0.2;
     QTest::newRow("Ctrl+Page Up held, 9 repeats") << int(Qt::Key_PageUp) << ctrl << 9 << 0.51;
     QTest::newRow("End held past the end") << int(Qt::Key_End) << none << 3 << 1.0;
+    QTest::newRow("Ctrl+Shift+Right: fine wins") << int(Qt::Key_Right) << (ctrl | shift) << 0 << 0.501;
 }
 
 void SliderControlTest::keys()
@@ -338,46 +268,6 @@ void SliderControlTest::keys()
     // A second press is a second step.
     HoldKey(slider, Qt::Key_Home, Qt::NoModifier, 0);
     QCOMPARE(f.doc.UndoNames().size(), written == 0.0 ? 1 : 2);
-}
-
-void SliderControlTest::pagePress()
-{
-    ToolFixture f;
-    Input *in = f.AddNumber("Blend", 0.5, Range(0, 1, {{kTickFreq, 11}, {kDefault, 0.9}}));
-    QWidget *slider = SliderOf(Slider(f, in));
-    // Left of the knob: one coarse page down at once.
-    QTest::mousePress(slider, Qt::LeftButton, Qt::NoModifier, QPoint(20, kKnobY));
-    QCOMPARE(f.NumberOf(in), 0.4);
-    QTest::mouseRelease(slider, Qt::LeftButton, Qt::NoModifier, QPoint(20, kKnobY));
-    QCOMPARE(f.doc.UndoNames().size(), 1);
-    QTest::mouseClick(slider, Qt::LeftButton, Qt::NoModifier, QPoint(200, kKnobY));
-    QCOMPARE(f.NumberOf(in), 0.5);
-    QCOMPARE(f.doc.UndoNames().size(), 2);
-}
-
-void SliderControlTest::altClickResets_data()
-{
-    QTest::addColumn<TagList>("attrs");
-    QTest::addColumn<int>("x");
-    QTest::addColumn<double>("written");
-    QTest::newRow("on the knob") << Range(0, 1, {{kDefault, 0.25}}) << 145 << 0.25;
-    QTest::newRow("on the track") << Range(0, 1, {{kDefault, 0.25}}) << 190 << 0.25;
-    QTest::newRow("no default tag: 0") << Range(-1, 1) << 190 << 0.0;
-}
-
-void SliderControlTest::altClickResets()
-{
-    QFETCH(TagList, attrs);
-    QFETCH(int, x);
-    QFETCH(double, written);
-    ToolFixture f;
-    Input *in = f.AddNumber("Blend", 0.7, attrs);
-    QWidget *slider = SliderOf(Slider(f, in));
-    QTest::mouseClick(slider, Qt::LeftButton, Qt::AltModifier, QPoint(x, kKnobY));
-    QCOMPARE(f.NumberOf(in), written);
-    QCOMPARE(f.doc.UndoNames(), QStringList{"Change Blend"});
-    f.doc.Undo();
-    QCOMPARE(f.NumberOf(in), 0.7);
 }
 
 void SliderControlTest::rangeTags_data()
@@ -440,15 +330,9 @@ void SliderControlTest::allowedRangeResets()
     slider->setFocus();
     HoldKey(slider, Qt::Key_End, Qt::NoModifier, 0);
     QCOMPARE(f.NumberOf(in), 1.0);
-}
-
-void SliderControlTest::ownTagsSwitch()
-{
-    ToolFixture f;
-    Input *in = f.AddNumber("Blend", 0.5, Range(0, 1));
-    InputControl *c = Slider(f, in);
+    // With the read-attributes switch off the control keeps its own tags.
     c->SetAttrsTagList(in, TagList{{kReadAttrs, 0}, {kMinAllowed, -4.0}, {kMaxAllowed, 4.0}});
-    QCOMPARE(CopyDouble(c, kMaxAllowed), 1.0);
+    QCOMPARE(CopyDouble(c, kMaxAllowed), 1e6);
     c->SetAttrsTagList(in, TagList{{kReadAttrs, 1}, {kMinAllowed, -4.0}, {kMaxAllowed, 4.0}});
     QCOMPARE(CopyDouble(c, kMaxAllowed), 4.0);
 }
@@ -463,7 +347,6 @@ void SliderControlTest::typedValues_data()
     QTest::newRow("places 2: 0.127 writes 0.13") << Range(0, 1, {{kPlaces, 2}}) << "0.127" << 0.13 << "0.13";
     QTest::newRow("places -1: step 1e-7") << Range(0, 1, {{kPlaces, -1}}) << "0.12345678" << 0.1234568 << "0.123457";
     QTest::newRow("places -2: steps of 100") << Range(0, 1000, {{kPlaces, -2}}) << "449" << 400.0 << "400";
-    QTest::newRow("arithmetic") << Range(0, 1, {{kPlaces, 3}}) << "1/8" << 0.125 << "0.125";
     QTest::newRow("time code") << Range(0, 480, {{kTimeDisplay, 1}, {kPlaces, 0}}) << "00:00:02:06" << 54.0
                                << "00:00:02:06";
 }
@@ -520,34 +403,22 @@ void SliderControlTest::typedExpression()
     QCOMPARE(f.NumberOf(in), 0.25);
 }
 
-void SliderControlTest::untouchedEditWritesNothing_data()
-{
-    QTest::addColumn<int>("places");
-    QTest::addColumn<double>("value");
-    QTest::addColumn<QString>("shown");
-    QTest::newRow("places 2") << 2 << 0.123456 << "0.12";
-    QTest::newRow("automatic places show six") << -1 << 0.12345678 << "0.123457";
-}
-
 // Clicking into the box and leaving it is no edit, even where the box shows
 // fewer places than the Input holds.
 void SliderControlTest::untouchedEditWritesNothing()
 {
-    QFETCH(int, places);
-    QFETCH(double, value);
-    QFETCH(QString, shown);
     ToolFixture f;
-    Input *in = f.AddNumber("Blend", value, Range(0, 1, {{kPlaces, places}}));
+    Input *in = f.AddNumber("Blend", 0.123456, Range(0, 1, {{kPlaces, 2}}));
     InputControl *c = Slider(f, in);
     QVERIFY(QTest::qWaitForWindowActive(&f.page));
     TimeCodeEdit *edit = EditOf(c);
     QSignalSpy finished(edit, SIGNAL(editingFinished()));
     QTest::mouseClick(edit, Qt::LeftButton);
     QVERIFY(edit->hasFocus());
-    QCOMPARE(edit->text(), shown);
+    QCOMPARE(edit->text(), QString("0.12"));
     SliderOf(c)->setFocus();
     QCOMPARE(finished.count(), 1);
-    QVERIFY(f.NumberOf(in) == value);
+    QVERIFY(f.NumberOf(in) == 0.123456);
     QVERIFY(f.doc.UndoNames().isEmpty());
 }
 
@@ -566,44 +437,12 @@ void SliderControlTest::inputIndexRouting()
     QCOMPARE(EditOf(c)->text(), QString("0.80"));
 }
 
-void SliderControlTest::mappings_data()
-{
-    QTest::addColumn<TagList>("attrs");
-    QTest::addColumn<int>("from");
-    QTest::addColumn<double>("written");
-    // 0.5 sits at a quarter of a squared track (pixel 55); 50 pixels right
-    // is half way along it: sqrt(0.5) = 0.7071, two places 0.71.
-    const TagList places = Range(0, 1, {{kPlaces, 2}});
-    TagList callbacks = places;
-    callbacks.Add(kForwardFunc, &Square);
-    callbacks.Add(kInverseFunc, &Root);
-    TagList expressions = places;
-    expressions.Add(kForwardExpr, "value^2");
-    expressions.Add(kInverseExpr, "sqrt(value)");
-    QTest::newRow("linear") << places << 105 << 0.75;
-    QTest::newRow("callbacks") << callbacks << 55 << 0.71;
-    QTest::newRow("expressions") << expressions << 55 << 0.71;
-}
-
-void SliderControlTest::mappings()
-{
-    QFETCH(TagList, attrs);
-    QFETCH(int, from);
-    QFETCH(double, written);
-    ToolFixture f;
-    Input *in = f.AddNumber("Blend", 0.5, attrs);
-    Drag(SliderOf(Slider(f, in)), from, from + 50);
-    QCOMPARE(f.NumberOf(in), written);
-}
-
 void SliderControlTest::knobStyles_data()
 {
     QTest::addColumn<int>("style");
     QTest::addColumn<bool>("red");
-    QTest::newRow("0 ordinary") << 0 << false;
     QTest::newRow("5 ordinary") << 5 << false;
     QTest::newRow("6 red channel") << 6 << true;
-    QTest::newRow("10 ordinary") << 10 << false;
 }
 
 void SliderControlTest::knobStyles()
@@ -622,23 +461,19 @@ void SliderControlTest::captions()
     ToolFixture f;
     Input *in = f.AddNumber("Balance", 0.0, Range(-1, 1, {{kLowName, "Shadows"}, {kHighName, "Highlights"}}));
     InputControl *c = Slider(f, in);
-    auto *low = c->findChild<QLabel *>("minlabel");
-    auto *mid = c->findChild<QLabel *>("midlabel");
-    auto *high = c->findChild<QLabel *>("maxlabel");
-    QCOMPARE(low->text(), QString("Shadows"));
-    QCOMPARE(high->text(), QString("Highlights"));
+    auto *low = c->findChild<QLabel *>("minlabel"), *mid = c->findChild<QLabel *>("midlabel"),
+         *high = c->findChild<QLabel *>("maxlabel");
+    QCOMPARE(low->text() + "|" + high->text(), QString("Shadows|Highlights"));
     QVERIFY(low->isVisible() && high->isVisible() && !mid->isVisible());
     QVERIFY(high->geometry().right() > SliderOf(c)->width() / 2);
     QVERIFY(!SliderOf(c)->testAttribute(Qt::WA_OpaquePaintEvent));
     c->SetAttrsTagList(in, Range(-1, 1, {{kMidName, "Midtones"}}));
-    QCOMPARE(mid->text(), QString("Midtones"));
-    QVERIFY(mid->isVisible());
+    QVERIFY(mid->isVisible() && mid->text() == "Midtones");
     QCOMPARE(low->text(), QString("Shadows"));
 }
 
 namespace {
 
-// Does column x of the slider show the ramp's blue in any row?
 bool BlueAt(const QImage &image, int x)
 {
     for (int y = 0; y < image.height(); ++y) {
@@ -651,7 +486,8 @@ bool BlueAt(const QImage &image, int x)
 
 } // namespace
 
-// The ramp fills the track from end to end, also after the inspector grows.
+// The ramp fills the track from end to end, also after the inspector grows:
+// it once painted no colour until a resize.
 void SliderControlTest::gradientTrack()
 {
     ToolFixture f;
@@ -674,17 +510,17 @@ void SliderControlTest::undoRenotifies()
     ToolFixture f;
     Input *in = f.AddNumber("Blend", 0.5, Range(0, 1, {{kPlaces, 3}}));
     InputControl *c = Slider(f, in);
-    Drag(SliderOf(c), 105, 125);
-    Drag(SliderOf(c), 125, 145);
-    QCOMPARE(f.NumberOf(in), 0.7);
+    SliderOf(c)->setFocus();
+    HoldKey(SliderOf(c), Qt::Key_End, Qt::NoModifier, 0);
+    HoldKey(SliderOf(c), Qt::Key_Home, Qt::NoModifier, 0);
     QCOMPARE(f.doc.UndoNames().size(), 2);
     f.doc.Undo();
-    QCOMPARE(f.NumberOf(in), 0.6);
-    QCOMPARE(EditOf(c)->text(), QString("0.600"));
+    QCOMPARE(f.NumberOf(in), 1.0);
+    QCOMPARE(EditOf(c)->text(), QString("1.000"));
     f.doc.Undo();
     QCOMPARE(EditOf(c)->text(), QString("0.500"));
     f.doc.Redo();
-    QCOMPARE(f.NumberOf(in), 0.6);
+    QCOMPARE(f.NumberOf(in), 1.0);
 }
 
 QTEST_MAIN(SliderControlTest)

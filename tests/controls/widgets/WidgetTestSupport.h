@@ -5,9 +5,7 @@
 #include "orbane/ScriptVal.h"
 #include "orbane/TagList.h"
 
-#include <QMouseEvent>
-#include <QPoint>
-#include <QVariant>
+#include <QColor>
 
 namespace Orbane {
 
@@ -34,20 +32,5 @@ public:
     QColor background = QColor(51, 102, 153);
     OrbaneDoc *doc = nullptr;
 };
-
-// Mouse events with modifiers and held buttons, which QTest::mouseMove
-// cannot send.
-void SendMouse(QWidget *widget, QEvent::Type type, const QPoint &pos, Qt::MouseButton button, Qt::MouseButtons buttons,
-               Qt::KeyboardModifiers modifiers = Qt::NoModifier);
-// A pointer argument of a spied signal as it was emitted. QVariant's own
-// conversion would treat it as a QObject pointer, which a class whose first
-// base is the host Object is not at the same address.
-template <class T> T *PointerArg(const QVariant &arg)
-{
-    return *static_cast<T *const *>(arg.constData());
-}
-
-void MoveMouse(QWidget *widget, const QPoint &pos, Qt::KeyboardModifiers modifiers = Qt::NoModifier,
-               Qt::MouseButtons buttons = Qt::LeftButton);
 
 } // namespace Orbane

@@ -21,12 +21,6 @@ bool Near(const GradientColor &a, const GradientColor &b, double tol)
     return qAbs(a.R - b.R) <= tol && qAbs(a.G - b.G) <= tol && qAbs(a.B - b.B) <= tol && qAbs(a.A - b.A) <= tol;
 }
 
-QByteArray Text(const GradientColor &c)
-{
-    return QByteArray::number(c.R) + "," + QByteArray::number(c.G) + "," + QByteArray::number(c.B) + "," +
-           QByteArray::number(c.A);
-}
-
 } // namespace
 
 class GradientTest : public QObject
@@ -35,8 +29,6 @@ class GradientTest : public QObject
 private slots:
     void evaluate_data();
     void evaluate();
-    void noStopsIsTransparent();
-    void quickMatchesExact_data();
     void quickMatchesExact();
     void changeRebuildsTable();
     void hardEdge();
@@ -51,12 +43,10 @@ void GradientTest::evaluate_data()
     QTest::addColumn<GradientColor>("expected");
     const GradientColor black{0, 0, 0, 1}, white{1, 1, 1, 1}, red{1, 0, 0, 1}, blue{0, 0, 1, 1};
     QTest::newRow("rgb middle") << black << white << int(GCS_RGB) << 0.5 << GradientColor{0.5, 0.5, 0.5, 1};
-    QTest::newRow("rgb start") << black << white << int(GCS_RGB) << 0.0 << black;
     QTest::newRow("before start clamps") << black << white << int(GCS_RGB) << -3.0 << black;
     QTest::newRow("after end clamps") << black << white << int(GCS_RGB) << 7.0 << white;
     QTest::newRow("alpha interpolates") << GradientColor{1, 0, 0, 0} << red << int(GCS_RGB) << 0.25
                                         << GradientColor{1, 0, 0, 0.25};
-    QTest::newRow("rgb red to blue") << red << blue << int(GCS_RGB) << 0.5 << GradientColor{0.5, 0, 0.5, 1};
     QTest::newRow("hsv red to blue goes round by magenta")
         << red << blue << int(GCS_HSV) << 0.5 << GradientColor{1, 0, 1, 1};
     QTest::newRow("hls red to blue goes round by magenta")
@@ -76,42 +66,26 @@ void GradientTest::evaluate()
     ramp->AddStop(1.0, to);
     ramp->AddStop(0.0, from);
     const GradientColor got = ramp->Evaluate(pos, space);
-    QVERIFY2(Near(got, expected, 1e-9), Text(got));
-}
-
-void GradientTest::noStopsIsTransparent()
-{
-    Ramp ramp;
-    QVERIFY(Near(ramp->Evaluate(0.3), GradientColor{0, 0, 0, 0}, 0));
-    QVERIFY(Near(ramp->QuickEvaluate(0.3), GradientColor{0, 0, 0, 0}, 0));
-}
-
-void GradientTest::quickMatchesExact_data()
-{
-    QTest::addColumn<int>("space");
-    QTest::newRow("rgb") << int(GCS_RGB);
-    QTest::newRow("hsv") << int(GCS_HSV);
-    QTest::newRow("hls") << int(GCS_HLS);
+    QVERIFY(Near(got, expected, 1e-9));
 }
 
 void GradientTest::quickMatchesExact()
 {
-    QFETCH(int, space);
     Ramp ramp;
     ramp->AddStop(0.0, {1, 0, 0, 1});
     ramp->AddStop(0.3, {0.2, 0.9, 0.1, 0.5});
     ramp->AddStop(1.0, {0, 0.2, 1, 1});
-    for (int i = 0; i <= 500; ++i) {
-        const double pos = i / 500.0;
-        // A 1024-entry table is within a thousandth of the exact ramp.
-        QVERIFY2(Near(ramp->QuickEvaluate(pos, space), ramp->Evaluate(pos, space), 2e-3),
-                 qPrintable(QString::number(pos)));
-    }
+    // A 1024-entry table is within a thousandth of the exact ramp.
+    for (int space : {GCS_RGB, GCS_HSV, GCS_HLS})
+        for (int i = 0; i <= 500; ++i)
+            QVERIFY2(Near(ramp->QuickEvaluate(i / 500.0, space), ramp->Evaluate(i / 500.0, space), 2e-3),
+                     qPrintable(QString("space %1 at %2").arg(space).arg(i / 500.0)));
 }
 
 void GradientTest::changeRebuildsTable()
 {
     Ramp ramp;
+    QVERIFY(Near(ramp->QuickEvaluate(0.3), GradientColor{0, 0, 0, 0}, 0)); // no stops: transparent
     ramp->AddStop(0.0, {0, 0, 0, 1});
     ramp->AddStop(1.0, {0, 0, 0, 1});
     const uint32 serial = ramp->Serial();
@@ -130,7 +104,6 @@ void GradientTest::hardEdge()
     ramp->AddStop(0.5, {1, 0, 0, 1});
     ramp->AddStop(0.5, {0, 0, 1, 1});
     ramp->AddStop(1.0, {0, 0, 1, 1});
-    QCOMPARE(ramp->Count(), 4);
     QVERIFY(Near(ramp->Evaluate(0.49), GradientColor{1, 0, 0, 1}, 1e-9));
     QVERIFY(Near(ramp->Evaluate(0.51), GradientColor{0, 0, 1, 1}, 1e-9));
 }
