@@ -11,8 +11,7 @@
 namespace Orbane {
 namespace Test {
 
-// The brightest grey level within `radius` pixels of `at`: overlays draw in
-// light colours over the tests' black image.
+// The brightest grey level within `radius` pixels of `at`.
 inline int Level(const QImage &image, QPoint at, int radius = 1)
 {
     int level = 0;
@@ -25,7 +24,6 @@ inline int Level(const QImage &image, QPoint at, int radius = 1)
     return level;
 }
 
-// Something is drawn at `at` (even faded to half).
 inline bool Lit(const QImage &image, QPoint at, int radius = 1)
 {
     return Level(image, at, radius) > 60;
@@ -36,8 +34,7 @@ inline bool Dark(const QImage &image, QPoint at, int radius = 1)
     return Level(image, at, radius) < 20;
 }
 
-// Arrow-key nudges and how far they move a point, in image pixels: one,
-// ten with Shift, a tenth with Control, one with both; Up is +Y.
+// Arrow-key nudges and how far they move a point, in image pixels.
 inline void NudgeRows()
 {
     QTest::addColumn<int>("key");
@@ -51,8 +48,7 @@ inline void NudgeRows()
     QTest::newRow("up with both: one") << int(Qt::Key_Up) << int(Qt::ShiftModifier | Qt::ControlModifier) << 0.0 << 1.0;
 }
 
-// One nudge of the overlay `attrs` give a point at the image centre, on the
-// fixture's 400 x 200 image: a Y step is one pixel of `yPixels`.
+// One nudge of a centred point; a Y step is one pixel of `yPixels`.
 inline void CheckNudge(const TagList &attrs, double yPixels)
 {
     QFETCH(int, key);

@@ -1,5 +1,3 @@
-// The point overlay from the loaded control library, in a real viewer, driven
-// by mouse and key events.
 #include "OverlayProbe.h"
 #include "ViewerFixture.h"
 
@@ -58,12 +56,9 @@ void PointControlTest::pickTolerance_data()
 {
     QTest::addColumn<QPoint>("offset"); // viewer pixels from the handle, Y up
     QTest::addColumn<bool>("hit");
-    // The tolerance is 6: six pixels away on either axis misses.
     QTest::newRow("6 right") << QPoint(6, 0) << false;
     QTest::newRow("5 right") << QPoint(5, 0) << true;
-    QTest::newRow("6 up") << QPoint(0, 6) << false;
     QTest::newRow("5 and 5: a square, not a circle") << QPoint(5, 5) << true;
-    QTest::newRow("5 and 6") << QPoint(5, 6) << false;
 }
 
 void PointControlTest::pickTolerance()
@@ -111,8 +106,7 @@ void PointControlTest::moveBelowThresholdWritesNothing()
     ViewerFixture f;
     Input *p = f.AddPoint("P", 0.5, 0.5, PointAttrs());
     QVERIFY(f.Show());
-    // 400 image pixels over 120000 viewer pixels: one pixel is 1/120000 of
-    // the width, below the 1e-5 threshold; two are above it.
+    // One viewer pixel is 1/120000 of the width: below the 1e-5 threshold.
     f.viewer.SetView(300.0);
     QCOMPARE(f.viewer.Info().ViewWidth, 120000);
     const QPoint at = f.At({0.5, 0.5});
@@ -131,8 +125,7 @@ void PointControlTest::nudge_data()
     NudgeRows();
 }
 
-// Y steps by a pixel of the width.
-void PointControlTest::nudge()
+void PointControlTest::nudge() // Y steps by a pixel of the width
 {
     CheckNudge(PointAttrs(), 400);
 }
@@ -153,21 +146,15 @@ void PointControlTest::pressOnLinkedHandleMovesNothing()
     QVERIFY(Near(f.PointOf(p1), {0.25 + 30 / 400.0, 0.5 - 30 / 200.0}));
     QCOMPARE(f.doc.UndoNames(), QStringList{"Change P1"});
     QCOMPARE(f.OverlayOf(p2)->IsDragging(), DRAG_None);
-
-    // The other way round nothing is linked: P1 has no previous point.
-    f.Press(f.At({0.75, 0.5}));
-    QCOMPARE(f.OverlayOf(p1)->IsDragging(), DRAG_None);
-    f.Release(f.At({0.75, 0.5}));
 }
 
 void PointControlTest::lineToPreviousPoint()
 {
     ViewerFixture f;
     Input *p1 = f.AddPoint("P1", 0.25, 0.5, PointAttrs());
-    Input *p2 = f.AddPoint("P2", 0.75, 0.75, LinkedTo("P1"));
+    f.AddPoint("P2", 0.75, 0.75, LinkedTo("P1"));
     QVERIFY(f.Show());
     QImage shot = f.Grab();
-    // A 4-pixel square at each point.
     QVERIFY(Lit(shot, f.At({0.25, 0.5}, QPoint(0, 2))));
     QVERIFY(Lit(shot, f.At({0.75, 0.75}, QPoint(-2, 0))));
     // The line from P2 to P1, and nothing beside it.
@@ -175,16 +162,11 @@ void PointControlTest::lineToPreviousPoint()
     QVERIFY(Dark(shot, f.At({0.5, 0.625}, QPoint(0, 8))));
     QVERIFY(Dark(shot, f.At({0.5, 0.3})));
 
-    // The line follows the previous point, and goes with it.
     const AutoPoint moved(0.75, 0.25);
     QVERIFY(p1->SetValue(moved.get(), 0.0));
     shot = f.Grab();
     QVERIFY(Lit(shot, f.At({0.75, 0.5})));
     QVERIFY(Dark(shot, f.At({0.5, 0.625})));
-    QVERIFY(f.OverlayOf(p2)->RemoveInput(p1, nullptr));
-    shot = f.Grab();
-    QVERIFY(Dark(shot, f.At({0.75, 0.5})));
-    QVERIFY(Lit(shot, f.At({0.75, 0.75}, QPoint(-2, 0))));
 }
 
 QTEST_MAIN(PointControlTest)

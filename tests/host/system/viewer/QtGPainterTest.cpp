@@ -13,7 +13,6 @@ namespace Graphics {
 namespace {
 
 const GColor Red(1.0f, 0.0f, 0.0f);
-const GColor Green(0.0f, 1.0f, 0.0f);
 const GColor Black(0.0f, 0.0f, 0.0f);
 const QColor Grey(128, 128, 128);
 
@@ -89,7 +88,7 @@ using QtGPainterScene = testing::TestWithParam<Scene>;
 TEST_P(QtGPainterScene, DrawsWhereExpected)
 {
     const Scene &s = GetParam();
-    PixelProbe probe(64, 64, 1.0, Grey);
+    PixelProbe probe(64, 64, Grey);
     probe.Paint(s.draw);
     for (const QPointF &p : s.red)
         EXPECT_EQ(probe.At(p.x(), p.y()), QColor(Qt::red)) << "red at " << p.x() << ", " << p.y();
@@ -107,43 +106,9 @@ const Scene Scenes[] = {
     {"StripIsNotClosed", primitive(GP_LineStrip, Outline),
      {{30.5, 10.5}, {50.5, 30.5}, {30.5, 50.5}}, {{10.5, 30.5}, {30.5, 30.5}, {55.5, 10.5}}},
     {"LoopClosesToTheFirstVertex", primitive(GP_LineLoop, Outline), {{30.5, 10.5}, {10.5, 30.5}}, {{30.5, 30.5}}},
-    {"LinesPairVerticesAndDropAnOddOne",
-     primitive(GP_Lines, {{10.5, 10.5}, {50.5, 10.5}, {10.5, 40.5}, {50.5, 40.5}, {30.5, 60.5}}),
-     {{30.5, 10.5}, {30.5, 40.5}}, {{50.5, 25.5}, {40.5, 50.5}}},
-    {"WidthIsInViewerPixelsWhateverTheScale",
-     [](QtGPainter &g) {
-         g.LineWidth(5.0f);
-         primitive(GP_LineStrip, {{0.0, 20.5}, {64.0, 20.5}})(g);
-         g.LineWidth(1.0f);
-         g.Scale(4.0, 4.0);
-         primitive(GP_LineStrip, {{0.0, 10.125}, {16.0, 10.125}})(g); // y 40.5 after the scale
-     },
-     {{30.5, 22.5}, {30.5, 18.5}, {30.5, 40.5}}, {{30.5, 23.5}, {30.5, 41.5}}},
-    {"PopAttribRestoresColourWidthAndStipple",
-     [](QtGPainter &g) {
-         g.Color(Red);
-         g.PushAttrib();
-         g.Color(Green);
-         g.LineWidth(7.0f);
-         g.LineStipple(1, 0x00FF);
-         g.Enable(GC_LineStipple);
-         g.PopAttrib();
-         g.PopAttrib(); // one too many: ignored
-         g.Begin(GP_LineStrip);
-         g.Vertex(0, 10.5);
-         g.Vertex(64, 10.5);
-         g.End();
-     },
-     {{4.5, 10.5}, {12.5, 10.5}}, {{12.5, 11.5}}},
     // Filled modes
-    {"Triangles", primitive(GP_Triangles, {{10, 10}, {30, 10}, {10, 30}, {40, 40}, {60, 40}, {40, 60}, {0, 60}}),
-     {{14.5, 14.5}, {44.5, 44.5}}, {{28.5, 28.5}, {5.5, 58.5}}},
     {"TriangleStrip", primitive(GP_TriangleStrip, {{10, 10}, {50, 10}, {10, 50}, {50, 50}}),
      {{15.5, 15.5}, {45.5, 45.5}, {30.5, 29.5}, {20.5, 39.5}}, {{5.5, 30.5}, {55.5, 30.5}}},
-    {"TriangleFan", primitive(GP_TriangleFan, {{30, 30}, {10, 10}, {50, 10}, {50, 50}, {10, 50}}),
-     {{30.5, 15.5}, {45.5, 30.5}, {20.5, 19.5}, {40.5, 40.5}}, {{30.5, 55.5}, {15.5, 30.5}}},
-    {"Quads", primitive(GP_Quads, {{5, 5}, {25, 5}, {25, 25}, {5, 25}, {35, 35}, {55, 35}, {55, 55}, {35, 55}, {0, 60}}),
-     {{15.5, 15.5}, {45.5, 45.5}}, {{30.5, 30.5}, {15.5, 45.5}}},
     {"QuadStrip", primitive(GP_QuadStrip, {{10, 10}, {10, 50}, {30, 10}, {30, 50}, {50, 10}, {50, 50}}),
      {{20.5, 30.5}, {40.5, 30.5}, {29.5, 30.5}, {30.5, 30.5}}, {{55.5, 30.5}, {30.5, 55.5}}},
     {"Polygon", primitive(GP_Polygon, {{30, 5}, {55, 30}, {30, 55}, {5, 30}}),
@@ -152,8 +117,6 @@ const Scene Scenes[] = {
     // Shadow pass: a dark copy one pixel down and right, under the colour
     {"ShadowOfALine", primitive(GP_LineStrip, {{10.0, 20.5}, {50.0, 20.5}}, Black),
      {{30.5, 20.5}}, {{30.5, 21.5}, {30.5, 18.5}}, {{31.5, 19.5}, {50.5, 19.5}}},
-    {"ShadowUnderAFill", rect(10, 10, 30, 30, Black), {{20.5, 20.5}, {29.5, 10.5}}, {{9.5, 30.5}}, {{30.5, 9.5}}},
-    {"TransparentShadowDrawsNoShadowPass", rect(10, 10, 30, 30, Black.WithAlpha(0.0f)), {{20.5, 20.5}}, {{30.5, 9.5}}},
     // Matrix stack
     {"ScaleActsBeforeAnEarlierTranslate",
      [](QtGPainter &g) { g.Translate(10, 10); g.Scale(2, 3); rect(0, 0, 5, 5)(g); },
@@ -172,18 +135,10 @@ const Scene Scenes[] = {
          marker(g);
      },
      {{50.5, 10.5}, {10.5, 10.5}}, {{0.5, 0.5}}},
-    {"MultMatrixTakesColumnMajorValues",
-     [](QtGPainter &g) {
-         const float64 m[16] = {2, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1, 0, 30, 20, 0, 1};
-         g.MultMatrix(m);
-         rect(0, 0, 5, 2)(g);
-     },
-     {{39.5, 21.5}}, {{40.5, 21.5}, {29.5, 21.5}}},
     // Arrays
     {"IndexedTrianglesFillTheSquare", squareArrays(GP_Triangles, 0, 6, true),
      {{40.5, 20.5}, {20.5, 40.5}, {30.5, 30.5}}},
     {"FirstAndCountPickIndices", squareArrays(GP_Triangles, 3, 3, true), {{20.5, 40.5}}, {{40.5, 20.5}}},
-    {"WithoutIndicesVerticesAreTakenInOrder", squareArrays(GP_Triangles, 1, 3, false), {{45.5, 40.5}}, {{20.5, 20.5}}},
     {"RangesOutsideTheArraysDrawNothing",
      [](QtGPainter &g) {
          const uint32 badIndex[3] = {0, 1, 7};
@@ -196,17 +151,6 @@ const Scene Scenes[] = {
          g.DrawArrays(GP_Triangles, 0, 3);
      },
      {}, {{40.5, 20.5}, {20.5, 40.5}, {30.5, 30.5}}},
-    {"UniformPicksAColourPair",
-     [](QtGPainter &g) {
-         const GColor uniforms[4] = {Green, GColor(), Red, Black};
-         g.SetVertexArray(Square, 4);
-         g.SetUniformArray(uniforms, 4);
-         g.Uniform(1);
-         g.DrawArrays(GP_Quads, 0, 4);
-         g.Uniform(2); // no such pair: the colour stays
-         g.Rectangle(52, 52, 60, 60);
-     },
-     {{30.5, 30.5}, {55.5, 55.5}}, {}, {{50.5, 9.5}}},
 };
 // clang-format on
 
@@ -252,14 +196,7 @@ const Draw Across = primitive(GP_LineStrip, {{0.0, 10.5}, {64.0, 10.5}});
 
 const StippleCase StippleCases[] = {
     {"HalfOn", 1, 0x00FF, Across, "11111111000000001111111100000000"},
-    {"StartsWithAGap", 1, 0xFF00, Across, "00000000111111110000000011111111"},
     {"FactorTwoUneven", 2, 0x0107, Across, "11111100000000001100000000000000"},
-    {"Disabled", 1, 0x00FF,
-     [](QtGPainter &g) {
-         g.Disable(GC_LineStipple);
-         Across(g);
-     },
-     "11111111111111111111111111111111"},
     {"StripCarriesThePatternAcrossVertices", 1, 0x00FF,
      primitive(GP_LineStrip, {{0.0, 10.5}, {12.0, 10.5}, {64.0, 10.5}}), "11111111000000001111111100000000"},
     {"SeparateLinesRestartThePattern", 1, 0x00FF,
@@ -271,52 +208,6 @@ const StippleCase StippleCases[] = {
 
 INSTANTIATE_TEST_SUITE_P(Patterns, QtGPainterStipple, testing::ValuesIn(StippleCases),
                          testing::PrintToStringParamName());
-
-// State -------------------------------------------------------------------------
-
-TEST(QtGPainterState, MisusedBeginAndEndDrawNothingStray)
-{
-    PixelProbe probe(64, 64);
-    probe.Paint([](QtGPainter &g) {
-        g.Color(Red);
-        g.Vertex(5, 5); // outside Begin
-        g.End();        // without Begin
-        g.Begin(42);    // no such mode
-        g.Vertex(10, 10);
-        g.Vertex(50, 50);
-        g.Vertex(10, 50);
-        g.End();
-        g.Text(10, 10, "");
-    });
-    QImage blank(probe.Image().size(), probe.Image().format());
-    blank.fill(Qt::black);
-    EXPECT_EQ(probe.Image(), blank);
-}
-
-// At a device pixel ratio of 2 a one-pixel line is two full device rows
-// (logical y 20 lies between rows 87 and 88), and stipple and shadow keep
-// their logical sizes.
-TEST(QtGPainterHiDpi, SizesStayLogical)
-{
-    PixelProbe probe(64, 64, 2.0, Grey);
-    probe.Paint([](QtGPainter &g) {
-        g.Color(Red, Black);
-        g.LineStipple(1, 0x00FF);
-        g.Enable(GC_LineStipple);
-        g.Begin(GP_LineStrip);
-        g.Vertex(0.0, 20.0);
-        g.Vertex(64.0, 20.0);
-        g.End();
-    });
-    EXPECT_EQ(probe.AtDevice(4, 87), QColor(Qt::red));
-    EXPECT_EQ(probe.AtDevice(4, 88), QColor(Qt::red));
-    EXPECT_EQ(probe.AtDevice(4, 86), Grey);
-    EXPECT_TRUE(isDark(probe.AtDevice(4, 89)));
-    EXPECT_EQ(probe.AtDevice(15, 88), QColor(Qt::red)) << "eight logical pixels are sixteen device pixels";
-    EXPECT_EQ(probe.AtDevice(17, 87), Grey);
-    EXPECT_TRUE(isDark(probe.AtDevice(17, 90))) << "the shadow is one logical pixel down: two device rows";
-    EXPECT_EQ(probe.AtDevice(17, 92), Grey);
-}
 
 } // namespace
 } // namespace Graphics

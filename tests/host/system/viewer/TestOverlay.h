@@ -18,9 +18,8 @@
 namespace Orbane {
 namespace Test {
 
-// The smallest real overlay: a 7-pixel filled square at its Input's point
-// that drags, claims the space key, offers a menu entry and links to a
-// second Input (TO_Link). It logs the calls the viewer makes into it.
+// A 7-pixel square at its Input's point that drags, claims the space key,
+// offers a menu entry, links to a second Input and logs the viewer's calls.
 class TestOverlay : public PreviewControl
 {
 public:
@@ -83,7 +82,6 @@ public:
     }
     DragType ControlDown(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override
     {
-        Log("Down");
         pressFlags = tags ? tags->GetLong(PCA_EventFlags, -1) : -1;
         if (info->HotControl) {
             if (link && info->HotControl->GetMainInput() == link)
@@ -103,11 +101,6 @@ public:
         const OrbPoint to = info->TransformIn(info->TransformOut(info->MouseX, info->MouseY) + grab);
         AutoPoint value(to.x, to.y, 0.0);
         SetInputs(value.get(), GetCurrentTime(), 0, nullptr);
-    }
-    void ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override
-    {
-        Log("Up");
-        PreviewControl::ControlUp(info, mouse, tags);
     }
     uint64 ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags) override
     {

@@ -15,11 +15,8 @@
 namespace Orbane {
 namespace Test {
 
-// A document with one tool and a viewer that shows it, laid out so that
-// image and widget pixels meet exactly: a 500 x 300 viewer showing a black
-// image of 400 x 200 at zoom 1, centred, so the image point (0.5, 0.5) is
-// widget pixel (250, 150) and one image pixel one widget pixel.
-// Everything reaches the viewer as Qt events.
+// A document with one tool and a 500 x 300 viewer showing a black 400 x 200
+// image at zoom 1, centred: image (0.5, 0.5) is widget pixel (250, 150).
 class ViewerFixture
 {
 public:
@@ -36,8 +33,7 @@ public:
     bool Show();
     PreviewControl *OverlayOf(const Input *input, int index = 0) const;
 
-    // The widget pixel of an image point, moved by `offset` viewer pixels
-    // (X right, Y up, as overlays count).
+    // The widget pixel of an image point, moved by `offset` viewer pixels (Y up).
     QPoint At(OrbPoint image, QPoint offset = QPoint()) const;
     OrbPoint PointOf(const Input *input) const;
 
@@ -56,15 +52,12 @@ public:
         Press(at);
         Release(at);
     }
-    // Press, moves in `steps`, release: one drag.
     void Drag(QPoint from, QPoint to, int steps = 4);
-    // A key pressed and released, the modifier keys around it, as hands do.
     void Key(Qt::Key key, Qt::KeyboardModifiers mods = Qt::NoModifier) { QTest::keyClick(&viewer, key, mods); }
 
     QImage Grab() { return viewer.grab().toImage(); }
     int UndoSteps() const { return doc.UndoNames().size(); }
 
-    // The control library as the host loads it, once per process.
     static bool LoadControls(std::string *error);
 
     OrbaneDoc doc;
