@@ -6,16 +6,13 @@
 namespace Orbane {
 namespace Test {
 
-// The control library as the host loads it: by path from ORBANE_CONTROLS,
-// with dlopen(RTLD_NOW | RTLD_GLOBAL), once per test process.
+// The control library, loaded from ORBANE_CONTROLS as the host loads it.
 class ControlModule
 {
 public:
-    // Loads the library; false (with the reason) where it cannot be loaded.
     static bool Load(std::string *error);
     // Registrations the library added to ClassRegistry while loading.
     static std::size_t AddedRegistrations();
-    // An exported symbol of the library, or null.
     static void *Symbol(const std::string &name);
 };
 

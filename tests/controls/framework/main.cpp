@@ -1,5 +1,4 @@
-// Runs the registration tests against the control library loaded as the host
-// loads it, with a QApplication so that inspector controls can be made.
+// The registration tests, against the control library loaded as the host loads it.
 
 #include "ControlModule.h"
 

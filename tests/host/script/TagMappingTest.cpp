@@ -59,11 +59,9 @@ std::vector<IntoCase> IntoCases()
         {"EnumerationByNumber", Table({{"WGT_Align", 4}}), "10050005=4"},
         {"ColourPacked", Table({{"WGT_Color", 2164195328.0}}), "10050007=2164195328"},
         {"ColourNamedTable", Table({{"WGT_Color", Table({{"R", 1}, {"G", 0.5}, {"B", 0}})}}), "10050007=4278223103"},
-        {"ColourArray", Table({{"WGT_Color", Array({0, 0, 1, 0.5})}}), "10050007=2164195328"},
         {"ColourClamped", Table({{"WGT_Color", Table({{"R", 2}, {"G", -1}, {"B", 0}, {"A", 1}})}}),
          "10050007=4278190335"},
         {"RepeatableArray", Table({{"WGT_AddItem", Array({"a", "b", "c"})}}), "38050008=a 38050008=b 38050008=c"},
-        {"RepeatableSingle", Table({{"WGT_AddItem", "only"}}), "38050008=only"},
         {"InsertionOrder", Table({{"WGT_Scale", 1}, {"WGT_Title", "T"}, {"WGT_Count", 2}}),
          "20050002=1 30050000=T 10050001=2"},
         {"NoTable", ScriptVal(), ""},
@@ -86,22 +84,11 @@ std::vector<ErrorCase> ErrorCases()
         {"BooleanGivenString", Table({{"WGT_TriState", "yes"}}), "WGT_TriState: expected a boolean, got string"},
         {"UnknownEnumerationName", Table({{"WGT_Align", "Middle"}}),
          "WGT_Align: unknown value \"Middle\"; expected one of Left, CenteredLeft, Center, CenteredRight, Right"},
-        {"UnknownEnumerationNumber", Table({{"WGT_Align", 9}}),
-         "WGT_Align: unknown value 9; expected one of Left, CenteredLeft, Center, CenteredRight, Right"},
         {"EnumerationGivenBoolean", Table({{"WGT_Align", true}}),
          "WGT_Align: expected a name of Align or a number, got boolean"},
-        {"TextGivenNumber", Table({{"WGT_Title", 5}}), "WGT_Title: expected a string, got 5"},
         {"IntegerGivenFraction", Table({{"WGT_Count", 1.5}}), "WGT_Count: expected an integer, got 1.5"},
-        {"DoubleGivenString", Table({{"WGT_Scale", "big"}}), "WGT_Scale: expected a number, got string"},
-        {"IdentifierGivenNumber", Table({{"WGT_Mode", 1}}), "WGT_Mode: expected an identifier string, got 1"},
-        {"ObjectGivenNumber", Table({{"WGT_Partner", 5}}),
-         "WGT_Partner: expected an object of type ScriptWidget, got 5"},
-        {"ColourGivenString", Table({{"WGT_Color", "red"}}), nullptr},
-        {"ColourMissingChannel", Table({{"WGT_Color", Table({{"R", 1}, {"G", 1}})}}), nullptr},
         {"RepeatableItemOfWrongType", Table({{"WGT_AddItem", Array({"a", 2})}}),
          "WGT_AddItem: item 2: expected a string, got 2"},
-        {"RepeatableWithOtherKeys", Table({{"WGT_AddItem", Table({{1, "a"}, {"x", 1}})}}),
-         "WGT_AddItem: expected a value or an array of values, got a table with other keys"},
         {"PositionalValue", Array({"x"}), "tag names must be strings, got 1"},
         {"NotATable", ScriptVal("text"), "tags must be given as a table, got string"},
         {"FailureAfterGoodValues", Table({{"WGT_Title", "ok"}, {"WGT_TriState", "bad"}}),
@@ -121,12 +108,9 @@ struct FromCase
 std::vector<FromCase> FromCases()
 {
     return {
-        {"Plain",
-         {{WGT_Title, "Hello"}, {WGT_Count, 3}, {WGT_Scale, 0.5}, {WGT_Mode, OrbID("Fast")}},
-         "WGT_Title=Hello; WGT_Count=3; WGT_Scale=0.5; WGT_Mode=Fast"},
-        {"BooleanTrue", {{WGT_TriState, 1}}, "WGT_TriState=true"},
-        {"EnumerationByName", {{WGT_Align, 2}}, "WGT_Align=Center"},
-        {"EnumerationUnnamedValue", {{WGT_Align, 9}}, "WGT_Align=9"},
+        {"EveryKind",
+         {{WGT_Title, "Hello"}, {WGT_Count, 3}, {WGT_Scale, 0.5}, {WGT_Mode, OrbID("Fast")}, {WGT_TriState, 1}, {WGT_Align, 2}},
+         "WGT_Title=Hello; WGT_Count=3; WGT_Scale=0.5; WGT_Mode=Fast; WGT_TriState=true; WGT_Align=Center"},
         {"Colour", {{WGT_Color, 0xFF0000FFu}}, "WGT_Color={R=1, G=0, B=0, A=1}"},
         {"RepeatableInRowOrder",
          {{WGT_AddItem, "a"}, {WGT_Title, "T"}, {WGT_AddItem, "b"}},
@@ -156,11 +140,7 @@ TEST_P(MapErrorTest, FailsWithAMessageAndLeavesTheListAlone)
     TakeScriptError();
     EXPECT_FALSE(IntoTags(GetParam().args, tags));
     const std::string message = TakeScriptError();
-    if (GetParam().message)
-        EXPECT_EQ(message, GetParam().message);
-    else
-        EXPECT_EQ(message.rfind("WGT_Color: expected a colour (a packed integer or a table {R=, G=, B=, A=}", 0), 0u)
-            << message;
+    EXPECT_EQ(message, GetParam().message);
     EXPECT_EQ(Show(tags), "30050000=before");
 }
 

@@ -79,8 +79,7 @@ bool TestWidget::SetAttrsTagList(const TagList &tags)
 
 namespace {
 
-// Allocates from the pool and gives the memory back if the constructor throws,
-// as the control library's factories do.
+// Gives the pooled memory back if the constructor throws, as the library does.
 template <class T> ScriptObject *Factory(const Registry *reg, const ScriptVal &args, const TagList &tags)
 {
     void *mem = Reuser::operator new(sizeof(T));
@@ -114,9 +113,7 @@ TagList Registration(const OrbID *base, ScriptInfo *info, const char *name, Fact
 } // namespace
 
 // Ordered as a control library's initialisers: type info, class ID, registry,
-// script info, the functions, then the type they belong to. The ID variant
-// binds its own script type to the widget's class after the primary's; the
-// gadget derives from the widget and inherits its hook through the base ID.
+// script info, the functions, then the type they belong to.
 const bool kWidgetTypeInfo = (SetTypeInfo(typeid(TestWidget), typeid(RefObject)), true);
 const bool kGadgetTypeInfo = (SetTypeInfo(typeid(TestGadget), typeid(TestWidget)), true);
 const OrbID WidgetClassID("WidgetControl");

@@ -31,11 +31,8 @@ enum WidgetTag : Tag
 
 extern const TagMapEntry WidgetTags[];
 
-// Registered the way the control library registers a control: class ID
-// "WidgetControl", registry and native name "TestWidget", script type
-// "ScriptWidget"; plus an ID variant "WidgetIDControl" with a script type of
-// its own, and a derived class "GadgetControl" (native "TestGadget") without
-// a tag map or hook of its own.
+// Registered as the control library registers controls: a primary, an ID
+// variant with its own script type, and a derived class without a hook.
 extern const OrbID WidgetClassID;
 extern const OrbID WidgetIDClassID;
 extern const OrbID GadgetClassID;
