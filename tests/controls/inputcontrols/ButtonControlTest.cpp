@@ -6,7 +6,6 @@
 #include "orbane/LuaRuntime.h"
 #include "orbane/Operator.h"
 
-#include <QSignalSpy>
 #include <QtTest>
 
 using namespace Orbane;
@@ -62,7 +61,6 @@ private slots:
     void scriptSeesToolSelfModifiers();
     void pressRunsScriptAndRequestsRender_data();
     void pressRunsScriptAndRequestsRender();
-    void scriptErrorIsReported();
     void secondLabel_data();
     void secondLabel();
 };
@@ -97,7 +95,6 @@ void ButtonControlTest::scriptSeesToolSelfModifiers()
     QCOMPARE(Eval("pressed.tool", LuaRuntime::ToObject), static_cast<ScriptObject *>(f.tool));
     QCOMPARE(Eval("pressed.self", LuaRuntime::ToObject), static_cast<ScriptObject *>(c));
     QCOMPARE(Eval("pressed.modifiers", lua_tonumber), double(int(modifiers)));
-    // The press writes no value.
     QCOMPARE(f.NumberOf(in), 0.0);
     QVERIFY(f.doc.UndoNames().isEmpty());
 }
@@ -130,18 +127,6 @@ void ButtonControlTest::pressRunsScriptAndRequestsRender()
     QCOMPARE(scripting.count(), 3);
 }
 
-void ButtonControlTest::scriptErrorIsReported()
-{
-    ToolFixture f("Grade1");
-    Input *in = f.AddNumber("Go", 0.0, TagList{{kExecute, "local x = 1\nerror('boom')"}});
-    InputControl *c = Button(f, in);
-    QTest::ignoreMessage(QtWarningMsg, QRegularExpression("tool \"Grade1\".*Grade1\\.Go:2: boom"));
-    Click(c);
-    QVERIFY(c->SetAttrsTagList(in, TagList{{kExecute, "after = 1"}}));
-    Click(c);
-    QCOMPARE(Eval("after", lua_tonumber), 1.0);
-}
-
 void ButtonControlTest::secondLabel_data()
 {
     QTest::addColumn<QString>("second");
@@ -167,11 +152,6 @@ void ButtonControlTest::secondLabel()
     QCOMPARE(LabelOf(c)->isHidden(), other.isEmpty());
     QCOMPARE(ButtonOf(c)->GetLabel(), QString("Run"));
     QVERIFY(!ButtonOf(c)->isEnabled());
-    QSignalSpy scripting(&f.doc, SIGNAL(scriptingUpdateRequested()));
-    Click(c);
-    QCOMPARE(scripting.count(), 0);
-    QVERIFY(c->SetAttrsTagList(in, TagList{{ICA_Disabled, 0}}));
-    QVERIFY(ButtonOf(c)->isEnabled());
 }
 
 QTEST_MAIN(ButtonControlTest)

@@ -7,7 +7,6 @@
 #include "orbane/ResDIB.h"
 #include "orbane/TimeCodeEdit.h"
 
-#include <QLabel>
 #include <QtTest>
 
 #include <cmath>
@@ -19,29 +18,18 @@ Q_DECLARE_METATYPE(Orbane::TagList)
 
 namespace {
 
-// Input attributes the slider reads.
 constexpr Tag kMinAllowed = 0x20030000, kMaxAllowed = 0x20030001;
 constexpr Tag kMinScale = 0x20030002, kMaxScale = 0x20030003, kDefault = 0x20030004;
-constexpr Tag kIndex = 0x10030007, kInteger = 0x1003000c, kKnobStyle = 0x10030011;
+constexpr Tag kInteger = 0x1003000c;
 constexpr Tag kStepCount = 0x10040003, kPlaces = 0x10040004, kTimeDisplay = 0x10040006, kSnap = 0x10040007;
 constexpr Tag kReadAttrs = 0x10040008, kTickFreq = 0x10050000;
-constexpr Tag kLowName = 0x30050000, kMidName = 0x30050001, kHighName = 0x30050002;
+constexpr Tag kLowName = 0x30050000;
 constexpr Tag kForwardExpr = 0x30040003, kInverseExpr = 0x30040004, kGradient = 0x40050000;
-constexpr Tag kForwardFunc = 0x60040001, kInverseFunc = 0x60040002;
 
 // A control 211 pixels wide gives the slider a 211-pixel track: with the
 // 11-pixel knob its centre runs from pixel 5 to 205, 200 pixels.
 constexpr int32 kWidth = 211;
 constexpr int kKnobY = 7; // inside the knob's rows whether or not a marker is shown
-
-float64 Square(float64 v, void *)
-{
-    return v * v;
-}
-float64 Root(float64 t, void *)
-{
-    return std::sqrt(t);
-}
 
 QWidget *SliderOf(const InputControl *c)
 {
@@ -52,7 +40,6 @@ TimeCodeEdit *EditOf(const InputControl *c)
     return c->findChild<TimeCodeEdit *>("edit");
 }
 
-// The knob's column for a track fraction (0 at the low end, 1 at the high end).
 int KnobX(const QWidget *slider, double fraction)
 {
     const int knob = ResDIB::Get(OrbID("Controls.Slider.Knob.1")).Size().width();
@@ -110,6 +97,16 @@ double CopyDouble(InputControl *c, Tag tag)
     return value;
 }
 
+bool BlueAt(const QImage &image, int x)
+{
+    for (int y = 0; y < image.height(); ++y) {
+        const QColor colour = image.pixelColor(x, y);
+        if (colour.blue() > 200 && colour.red() < 60)
+            return true;
+    }
+    return false;
+}
+
 } // namespace
 
 class SliderControlTest : public QObject
@@ -128,13 +125,7 @@ private slots:
     void typedValues();
     void typingKeepsEditBox();
     void typedExpression();
-    void untouchedEditWritesNothing();
-    void inputIndexRouting();
-    void knobStyles_data();
-    void knobStyles();
-    void captions();
     void gradientTrack();
-    void undoRenotifies();
 };
 
 void SliderControlTest::initTestCase()
@@ -157,12 +148,9 @@ void SliderControlTest::drags_data()
     using Path = QList<int>;
     // 0..1 over 200 pixels: 0.005 a pixel, shown to three places.
     QTest::newRow("plain right") << Range(0, 1) << 0.5 << Path{10, 20} << none << 0.6 << 1;
-    QTest::newRow("plain left") << Range(0, 1) << 0.5 << Path{-37} << none << 0.315 << 1;
     QTest::newRow("ctrl ten times slower, one more place") << Range(0, 1) << 0.5 << Path{3} << ctrl << 0.5015 << 1;
     QTest::newRow("clamped at the high end") << Range(0, 1) << 0.5 << Path{300} << none << 1.0 << 1;
-    QTest::newRow("clamped at the low end") << Range(0, 1) << 0.5 << Path{-300} << none << 0.0 << 1;
-    // Away and back within half a pixel: exactly the value it started from,
-    // and a gesture that changed nothing leaves no undo step.
+    // Back within half a pixel: exactly the press value, and no undo step.
     QTest::newRow("back to the press value") << Range(0, 1) << 0.123456 << Path{10, 0} << none << 0.123456 << 0;
     // 0.25 is 50 pixels left of 0.5; the default 0.2523 lies 0.46 pixels away.
     const TagList withDefault = Range(0, 1, {{kDefault, 0.2523}});
@@ -170,35 +158,18 @@ void SliderControlTest::drags_data()
     QTest::newRow("past the default") << withDefault << 0.5 << Path{-25, -51} << none << 0.245 << 1;
     QTest::newRow("Alt-click resets") << withDefault << 0.5 << Path{0} << alt << 0.2523 << 1;
     QTest::newRow("Alt-click without a default tag: 0") << Range(-1, 1) << 0.5 << Path{0} << alt << 0.0 << 1;
-    // 0..0.2: the slider gives 0.123 and 0.127; two places write 0.12 and 0.13.
-    QTest::newRow("places 2: 0.123 writes 0.12")
-        << Range(0, 0.2, {{kPlaces, 2}}) << 0.1 << Path{23} << none << 0.12 << 1;
     QTest::newRow("places 2: 0.127 writes 0.13")
         << Range(0, 0.2, {{kPlaces, 2}}) << 0.1 << Path{27} << none << 0.13 << 1;
     QTest::newRow("places -1: 0.123 as it is")
         << Range(0, 0.2, {{kPlaces, -1}}) << 0.1 << Path{23} << none << 0.123 << 1;
     QTest::newRow("places 2: less than a step writes nothing")
         << Range(0, 1, {{kPlaces, 2}}) << 0.5 << Path{3} << ctrl << 0.5 << 0;
-    // 480 frames over 200 pixels: 2.4 frames a pixel, not rounded to places 0.
-    QTest::newRow("time display unrounded")
-        << Range(0, 480, {{kTimeDisplay, 1}, {kPlaces, 0}}) << 240.0 << Path{1} << none << 242.4 << 1;
-    QTest::newRow("places 0 without time display")
-        << Range(0, 480, {{kPlaces, 0}}) << 240.0 << Path{1} << none << 242.0 << 1;
-    // -10..10: 0.1 a pixel; integer display with snapping to the normal step
-    // of 1 truncates toward zero after adding a half.
-    const TagList snap = Range(-10, 10, {{kInteger, 1}, {kSnap, 1}});
-    QTest::newRow("integer snap: -2.7 stored as -2") << snap << 0.0 << Path{-27} << none << -2.0 << 1;
-    QTest::newRow("integer snap: 2.7 stored as 3") << snap << 0.0 << Path{27} << none << 3.0 << 1;
-    QTest::newRow("integer, places 0, no snap: -2.7 rounds to -3")
-        << Range(-10, 10, {{kInteger, 1}, {kPlaces, 0}}) << 0.0 << Path{-27} << none << -3.0 << 1;
+    // Integer snapping adds a half, then truncates toward zero.
+    QTest::newRow("integer snap: -2.7 stored as -2")
+        << Range(-10, 10, {{kInteger, 1}, {kSnap, 1}}) << 0.0 << Path{-27} << none << -2.0 << 1;
     // The track fraction is the value squared: half way along it is sqrt(0.5).
-    TagList callbacks = Range(0, 1), expressions = Range(0, 1);
-    callbacks.Add(kForwardFunc, &Square);
-    callbacks.Add(kInverseFunc, &Root);
-    expressions.Add(kForwardExpr, "value^2");
-    expressions.Add(kInverseExpr, "sqrt(value)");
-    QTest::newRow("callback mapping") << callbacks << 0.0 << Path{100} << none << 0.707 << 1;
-    QTest::newRow("expression mapping") << expressions << 0.0 << Path{100} << none << 0.707 << 1;
+    QTest::newRow("expression mapping") << Range(0, 1, {{kForwardExpr, "value^2"}, {kInverseExpr, "sqrt(value)"}})
+                                        << 0.0 << Path{100} << none << 0.707 << 1;
 }
 
 void SliderControlTest::drags()
@@ -238,15 +209,12 @@ void SliderControlTest::keys_data()
     QTest::newRow("Home") << int(Qt::Key_Home) << none << 0 << 0.0;
     QTest::newRow("End") << int(Qt::Key_End) << none << 0 << 1.0;
     QTest::newRow("Right") << int(Qt::Key_Right) << none << 0 << 0.51;
-    QTest::newRow("Left") << int(Qt::Key_Left) << none << 0 << 0.49;
     QTest::newRow("Page Down") << int(Qt::Key_PageDown) << none << 0 << 0.49;
     QTest::newRow("Shift+Page Up coarse") << int(Qt::Key_PageUp) << shift << 0 << 0.6;
     QTest::newRow("Ctrl+Page Down fine") << int(Qt::Key_PageDown) << ctrl << 0 << 0.499;
     QTest::newRow("Right held, 4 repeats") << int(Qt::Key_Right) << none << 4 << 0.55;
     QTest::newRow("Shift+Left held, 2 repeats") << int(Qt::Key_Left) << shift << 2 << 0.2;
     QTest::newRow("Ctrl+Page Up held, 9 repeats") << int(Qt::Key_PageUp) << ctrl << 9 << 0.51;
-    QTest::newRow("End held past the end") << int(Qt::Key_End) << none << 3 << 1.0;
-    QTest::newRow("Ctrl+Shift+Right: fine wins") << int(Qt::Key_Right) << (ctrl | shift) << 0 << 0.501;
 }
 
 void SliderControlTest::keys()
@@ -262,10 +230,8 @@ void SliderControlTest::keys()
     slider->setFocus();
     HoldKey(slider, key, Qt::KeyboardModifiers(mods), repeats);
     QCOMPARE(f.NumberOf(in), written);
-    // One press-and-hold, one undo step.
     QCOMPARE(f.doc.UndoNames(), QStringList{"Change Blend"});
     QVERIFY(!c->IsUndoOpen());
-    // A second press is a second step.
     HoldKey(slider, Qt::Key_Home, Qt::NoModifier, 0);
     QCOMPARE(f.doc.UndoNames().size(), written == 0.0 ? 1 : 2);
 }
@@ -278,10 +244,8 @@ void SliderControlTest::rangeTags_data()
     QTest::addColumn<double>("home");
     QTest::addColumn<double>("end");
     QTest::newRow("no tags: allowed +-1e6, track 0..1") << TagList{} << -1e6 << 1e6 << 0.0 << 1.0;
-    QTest::newRow("the track follows the allowed range") << Range(-5, 5) << -5.0 << 5.0 << -5.0 << 5.0;
     QTest::newRow("scale tags narrow the track")
         << Range(-10, 10, {{kMinScale, -1.0}, {kMaxScale, 1.0}}) << -10.0 << 10.0 << -1.0 << 1.0;
-    QTest::newRow("one scale tag") << Range(-10, 10, {{kMaxScale, 2.0}}) << -10.0 << 10.0 << -10.0 << 2.0;
     QTest::newRow("the allowed range clips the track")
         << Range(0, 1, {{kMinScale, -5.0}, {kMaxScale, 5.0}}) << 0.0 << 1.0 << 0.0 << 1.0;
     QTest::newRow("reversed pairs are ordered") << Range(3, -3) << -3.0 << 3.0 << -3.0 << 3.0;
@@ -307,8 +271,8 @@ void SliderControlTest::rangeTags()
     QCOMPARE(f.NumberOf(in), end);
 }
 
-// Every call without the allowed range resets it; places, centre and the
-// counts keep what they had; the default falls back to 0.
+// A call without the allowed range resets it and the default; places and
+// counts stay.
 void SliderControlTest::allowedRangeResets()
 {
     ToolFixture f;
@@ -325,7 +289,6 @@ void SliderControlTest::allowedRangeResets()
     QCOMPARE(places, 2);
     QCOMPARE(c->CopyAttr(kTickFreq, &ticks), false);
     QCOMPARE(ticks, 5);
-    // The track keeps 0..1 (its tags only ever narrow it here).
     QWidget *slider = SliderOf(c);
     slider->setFocus();
     HoldKey(slider, Qt::Key_End, Qt::NoModifier, 0);
@@ -343,10 +306,8 @@ void SliderControlTest::typedValues_data()
     QTest::addColumn<QString>("typed");
     QTest::addColumn<double>("written");
     QTest::addColumn<QString>("shown");
-    QTest::newRow("places 2: 0.123 writes 0.12") << Range(0, 1, {{kPlaces, 2}}) << "0.123" << 0.12 << "0.12";
     QTest::newRow("places 2: 0.127 writes 0.13") << Range(0, 1, {{kPlaces, 2}}) << "0.127" << 0.13 << "0.13";
     QTest::newRow("places -1: step 1e-7") << Range(0, 1, {{kPlaces, -1}}) << "0.12345678" << 0.1234568 << "0.123457";
-    QTest::newRow("places -2: steps of 100") << Range(0, 1000, {{kPlaces, -2}}) << "449" << 400.0 << "400";
     QTest::newRow("time code") << Range(0, 480, {{kTimeDisplay, 1}, {kPlaces, 0}}) << "00:00:02:06" << 54.0
                                << "00:00:02:06";
 }
@@ -401,93 +362,10 @@ void SliderControlTest::typedExpression()
     QCOMPARE(f.doc.UndoNames().size(), 1);
     f.doc.Undo();
     QCOMPARE(f.NumberOf(in), 0.25);
+    QCOMPARE(EditOf(c)->text(), QString("0.250"));
 }
 
-// Clicking into the box and leaving it is no edit, even where the box shows
-// fewer places than the Input holds.
-void SliderControlTest::untouchedEditWritesNothing()
-{
-    ToolFixture f;
-    Input *in = f.AddNumber("Blend", 0.123456, Range(0, 1, {{kPlaces, 2}}));
-    InputControl *c = Slider(f, in);
-    QVERIFY(QTest::qWaitForWindowActive(&f.page));
-    TimeCodeEdit *edit = EditOf(c);
-    QSignalSpy finished(edit, SIGNAL(editingFinished()));
-    QTest::mouseClick(edit, Qt::LeftButton);
-    QVERIFY(edit->hasFocus());
-    QCOMPARE(edit->text(), QString("0.12"));
-    SliderOf(c)->setFocus();
-    QCOMPARE(finished.count(), 1);
-    QVERIFY(f.NumberOf(in) == 0.123456);
-    QVERIFY(f.doc.UndoNames().isEmpty());
-}
-
-void SliderControlTest::inputIndexRouting()
-{
-    ToolFixture f;
-    Input *first = f.AddNumber("Red", 0.5, Range(0, 1, {{kPlaces, 2}, {kIndex, 0}}));
-    Input *second = f.AddNumber("Green", 0.9, Range(0, 1, {{kIndex, 1}}));
-    InputControl *c = Slider(f, first);
-    c->NotifyChanged(second, AutoNumber(0.9), nullptr);
-    QCOMPARE(EditOf(c)->text(), QString("0.50"));
-    c->NotifyChanged(first, AutoNumber(0.8), nullptr);
-    QCOMPARE(EditOf(c)->text(), QString("0.80"));
-    // Less than half a step is no change.
-    c->NotifyChanged(first, AutoNumber(0.804), nullptr);
-    QCOMPARE(EditOf(c)->text(), QString("0.80"));
-}
-
-void SliderControlTest::knobStyles_data()
-{
-    QTest::addColumn<int>("style");
-    QTest::addColumn<bool>("red");
-    QTest::newRow("5 ordinary") << 5 << false;
-    QTest::newRow("6 red channel") << 6 << true;
-}
-
-void SliderControlTest::knobStyles()
-{
-    QFETCH(int, style);
-    QFETCH(bool, red);
-    ToolFixture f;
-    InputControl *c = Slider(f, f.AddNumber("Blend", 0.5, Range(0, 1, {{kKnobStyle, style}})));
-    const QImage image = SliderOf(c)->grab().toImage();
-    const QColor knob = image.pixelColor(105 + 2, kKnobY);
-    QCOMPARE(knob.red() > knob.green() + 60, red);
-}
-
-void SliderControlTest::captions()
-{
-    ToolFixture f;
-    Input *in = f.AddNumber("Balance", 0.0, Range(-1, 1, {{kLowName, "Shadows"}, {kHighName, "Highlights"}}));
-    InputControl *c = Slider(f, in);
-    auto *low = c->findChild<QLabel *>("minlabel"), *mid = c->findChild<QLabel *>("midlabel"),
-         *high = c->findChild<QLabel *>("maxlabel");
-    QCOMPARE(low->text() + "|" + high->text(), QString("Shadows|Highlights"));
-    QVERIFY(low->isVisible() && high->isVisible() && !mid->isVisible());
-    QVERIFY(high->geometry().right() > SliderOf(c)->width() / 2);
-    QVERIFY(!SliderOf(c)->testAttribute(Qt::WA_OpaquePaintEvent));
-    c->SetAttrsTagList(in, Range(-1, 1, {{kMidName, "Midtones"}}));
-    QVERIFY(mid->isVisible() && mid->text() == "Midtones");
-    QCOMPARE(low->text(), QString("Shadows"));
-}
-
-namespace {
-
-bool BlueAt(const QImage &image, int x)
-{
-    for (int y = 0; y < image.height(); ++y) {
-        const QColor colour = image.pixelColor(x, y);
-        if (colour.blue() > 200 && colour.red() < 60)
-            return true;
-    }
-    return false;
-}
-
-} // namespace
-
-// The ramp fills the track from end to end, also after the inspector grows:
-// it once painted no colour until a resize.
+// The ramp once painted no colour until a resize.
 void SliderControlTest::gradientTrack()
 {
     ToolFixture f;
@@ -503,24 +381,6 @@ void SliderControlTest::gradientTrack()
         for (double along : {0.1, 0.5, 0.95})
             QVERIFY2(BlueAt(image, KnobX(slider, along)), qPrintable(QString("width %1 at %2").arg(width).arg(along)));
     }
-}
-
-void SliderControlTest::undoRenotifies()
-{
-    ToolFixture f;
-    Input *in = f.AddNumber("Blend", 0.5, Range(0, 1, {{kPlaces, 3}}));
-    InputControl *c = Slider(f, in);
-    SliderOf(c)->setFocus();
-    HoldKey(SliderOf(c), Qt::Key_End, Qt::NoModifier, 0);
-    HoldKey(SliderOf(c), Qt::Key_Home, Qt::NoModifier, 0);
-    QCOMPARE(f.doc.UndoNames().size(), 2);
-    f.doc.Undo();
-    QCOMPARE(f.NumberOf(in), 1.0);
-    QCOMPARE(EditOf(c)->text(), QString("1.000"));
-    f.doc.Undo();
-    QCOMPARE(EditOf(c)->text(), QString("0.500"));
-    f.doc.Redo();
-    QCOMPARE(f.NumberOf(in), 1.0);
 }
 
 QTEST_MAIN(SliderControlTest)
