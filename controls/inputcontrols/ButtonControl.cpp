@@ -41,8 +41,7 @@ ButtonControl::~ButtonControl() = default;
 bool ButtonControl::GetAttrsTagList(TagList &tags) const
 {
     InputControl::GetAttrsTagList(tags);
-    tags.Set(LINKS_Name, mLabelText);
-    tags.Set(LINKS_SecondName, mSecondText);
+    mTexts.AddTo(tags);
     tags.Set(BTNCS_Execute, mScriptText.c_str());
     return true;
 }
@@ -51,8 +50,7 @@ bool ButtonControl::AddInput(Input *input, const TagList *tags)
 {
     if (!InputControl::AddInput(input, tags))
         return false;
-    mLabelText = LabelOf(input);
-    mSecondText = SecondLabelOf(input);
+    mTexts.Read(input);
     return true;
 }
 
@@ -67,38 +65,37 @@ bool ButtonControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
     mLabel->setElideMode(ElideLabel::Elide_Right);
     ShowTexts();
     mButton->update();
-    mTextsChanged = false;
+    mTexts.changed = false;
     LoadLayout("Controls.Button.Layout");
     return true;
 }
 
 void ButtonControl::ShowTexts()
 {
-    mButton->SetLabel(mLabelText);
-    mLabel->setText(QString::fromStdString(mSecondText.str()));
-    mLabel->setVisible(!mSecondText.IsEmpty());
+    mButton->SetLabel(mTexts.label);
+    mLabel->setText(QString::fromStdString(mTexts.second.str()));
+    mLabel->setVisible(!mTexts.second.IsEmpty());
 }
 
 bool ButtonControl::SetAttrsTagList(Input *input, const TagList &tags)
 {
     const bool wasDisabled = IsDisabled();
     InputControl::SetAttrsTagList(input, tags);
-    if (TakeTexts(tags, mLabelText, mSecondText))
-        mTextsChanged = true;
+    mTexts.Take(tags);
     mScriptText = OrbID(tags.GetString(BTNCS_Execute, mScriptText.c_str()));
     if (IsDisabled() != wasDisabled)
-        mTextsChanged = true;
-    if (mTextsChanged)
+        mTexts.changed = true;
+    if (mTexts.changed)
         NotifyChanged(nullptr, nullptr, nullptr);
     return true;
 }
 
 bool ButtonControl::UpdateDisplay(Input *input, const TagList *tags)
 {
-    if (IsOpen() && mTextsChanged) {
+    if (IsOpen() && mTexts.changed) {
         mButton->setEnabled(!IsDisabled());
         ShowTexts();
-        mTextsChanged = false;
+        mTexts.changed = false;
     }
     return InputControl::UpdateDisplay(input, tags);
 }
@@ -142,7 +139,7 @@ bool ButtonControl::RunScript()
     const ButtonScript script(mScriptText.c_str(), ChunkName());
     if (script.Run(GetDoc(), tool, this, mModifiers, &error))
         return true;
-    qWarning("Button \"%s\" of tool \"%s\": %s", mLabelText.c_str(), tool ? tool->GetName() : "?", error.c_str());
+    qWarning("Button \"%s\" of tool \"%s\": %s", mTexts.label.c_str(), tool ? tool->GetName() : "?", error.c_str());
     return false;
 }
 

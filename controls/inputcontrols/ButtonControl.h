@@ -1,6 +1,7 @@
 #pragma once
 
 #include "orbane/InputControl.h"
+#include "orbane/LabelTexts.h"
 #include "orbane/OrbID.h"
 
 namespace Orbane {
@@ -46,10 +47,8 @@ private:
 
     ElideLabel *mLabel;
     CustomButton *mButton;
-    OrbString mSecondText;
-    OrbString mLabelText;
     OrbID mScriptText;
-    bool mTextsChanged = false;
+    LabelTexts mTexts;
     uint64 mModifiers = 0; // of the click being handled
 };
 

@@ -60,8 +60,7 @@ bool CheckBoxControl::CopyAttr(Tag tag, void *out)
 bool CheckBoxControl::GetAttrsTagList(TagList &tags) const
 {
     InputControl::GetAttrsTagList(tags);
-    tags.Set(LINKS_Name, mLabelText);
-    tags.Set(LINKS_SecondName, mSecondText);
+    mTexts.AddTo(tags);
     tags.Set(CBC_TriState, mTriState);
     return true;
 }
@@ -77,9 +76,8 @@ bool CheckBoxControl::SetAttrsTagList(Input *input, const TagList &tags)
     }
     mCheckBox->AllowWrap(tags.GetBool(CBA_AllowWrap, false));
     InputControl::SetAttrsTagList(input, tags);
-    if (TakeTexts(tags, mLabelText, mSecondText))
-        mTextsChanged = true;
-    if (mTextsChanged)
+    mTexts.Take(tags);
+    if (mTexts.changed)
         NotifyChanged(nullptr, nullptr, nullptr);
     return true;
 }
@@ -88,8 +86,7 @@ bool CheckBoxControl::AddInput(Input *input, const TagList *tags)
 {
     if (!InputControl::AddInput(input, tags))
         return false;
-    mLabelText = LabelOf(input);
-    mSecondText = SecondLabelOf(input);
+    mTexts.Read(input);
     return true;
 }
 
@@ -115,16 +112,16 @@ bool CheckBoxControl::Open(QWidget *host, const QRect &rect, const TagList *tags
         mRowHeight = row->GetHeight();
     if (Layout::LayoutObj *where = FindLayoutObj("expression"); where && where->AsContainer())
         CreateExpressionEdit(where->AsContainer(), 0);
-    mTextsChanged = false;
+    mTexts.changed = false;
     return true;
 }
 
 void CheckBoxControl::ShowTexts()
 {
-    mCheckBox->SetLabel(mLabelText);
-    mLabel->setText(QString::fromStdString(mSecondText.str()));
+    mCheckBox->SetLabel(mTexts.label);
+    mLabel->setText(QString::fromStdString(mTexts.second.str()));
     // An empty second label gives its room to the box.
-    mLabel->setVisible(!mSecondText.IsEmpty());
+    mLabel->setVisible(!mTexts.second.IsEmpty());
 }
 
 bool CheckBoxControl::WrapsLabel() const
@@ -137,7 +134,7 @@ int32 CheckBoxControl::WrappedRowHeight() const
 {
     const QFontMetrics metrics(QApplication::font());
     const QRect box(0, 0, mCheckBox->width() - kBoxRoom, 1000);
-    const QString text = QString::fromStdString(mLabelText.str());
+    const QString text = QString::fromStdString(mTexts.label.str());
     const int single = metrics.boundingRect(box, 0x321, text).height();
     const int wrapped = metrics.boundingRect(box, 0x1021, text).height();
     return mRowHeight + wrapped - single;
@@ -170,9 +167,9 @@ bool CheckBoxControl::UpdateDisplay(Input *input, const TagList *tags)
 {
     if (IsOpen()) {
         mCheckBox->SetValue(mValue);
-        if (mTextsChanged) {
+        if (mTexts.changed) {
             ShowTexts();
-            mTextsChanged = false;
+            mTexts.changed = false;
         }
     }
     return InputControl::UpdateDisplay(input, tags);

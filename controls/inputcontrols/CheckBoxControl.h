@@ -1,6 +1,7 @@
 #pragma once
 
 #include "orbane/InputControl.h"
+#include "orbane/LabelTexts.h"
 
 namespace Orbane {
 
@@ -46,11 +47,9 @@ private:
 
     int32 mValue = 0; // -1: the mixed state
     bool mTriState = false;
-    bool mTextsChanged = false;
+    LabelTexts mTexts;
     ElideLabel *mLabel;
     OrbCheckBox *mCheckBox;
-    OrbString mSecondText;
-    OrbString mLabelText;
     int32 mRowHeight = 0;
 };
 

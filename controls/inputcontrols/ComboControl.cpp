@@ -77,8 +77,7 @@ bool ComboControl::CopyAttr(Tag tag, void *out)
 bool ComboControl::GetAttrsTagList(TagList &tags) const
 {
     InputControl::GetAttrsTagList(tags);
-    tags.Set(LINKS_Name, mLabelText);
-    tags.Set(LINKS_SecondName, mSecondText);
+    mTexts.AddTo(tags);
     tags.Set(CC_LabelPosition, mLabelPosition);
     tags.Set(CC_AlphaSort, mAlphaSort);
     return true;
@@ -91,9 +90,8 @@ bool ComboControl::SetAttrsTagList(Input *input, const TagList &tags)
         FillRows();
     }
     InputControl::SetAttrsTagList(input, tags);
-    if (TakeTexts(tags, mLabelText, mSecondText))
-        mTextsChanged = true;
-    if (mTextsChanged)
+    mTexts.Take(tags);
+    if (mTexts.changed)
         NotifyChanged(nullptr, nullptr, nullptr);
     return true;
 }
@@ -112,8 +110,7 @@ bool ComboControl::AddInput(Input *input, const TagList *tags)
     if (!InputControl::AddInput(input, tags))
         return false;
     if (GetCurrentInput() == input) {
-        mLabelText = LabelOf(input);
-        mSecondText = SecondLabelOf(input);
+        mTexts.Read(input);
     }
     return true;
 }
@@ -150,14 +147,14 @@ bool ComboControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
     // Only a number can come from a typed expression.
     if (Layout::LayoutObj *where = FindLayoutObj("expression"); where && where->AsContainer() && !IsIDVariant())
         CreateExpressionEdit(where->AsContainer(), 0);
-    mTextsChanged = false;
+    mTexts.changed = false;
     return true;
 }
 
 void ComboControl::ShowTexts()
 {
-    mLabel->setText(ToQString(mLabelText));
-    mLabel->setToolTip(ToQString(mSecondText));
+    mLabel->setText(ToQString(mTexts.label));
+    mLabel->setToolTip(ToQString(mTexts.second));
 }
 
 int32 ComboControl::SelectionFor(const Parameter *value) const
@@ -190,9 +187,9 @@ bool ComboControl::UpdateDisplay(Input *input, const TagList *tags)
     // A preview leaves the list as it is: the user is still choosing.
     if (IsOpen() && !mPreviewing) {
         mCombo->ShowItem(mSelection);
-        if (mTextsChanged) {
+        if (mTexts.changed) {
             ShowTexts();
-            mTextsChanged = false;
+            mTexts.changed = false;
         }
     }
     return InputControl::UpdateDisplay(input, tags);

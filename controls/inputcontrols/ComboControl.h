@@ -4,6 +4,7 @@
 
 #include "orbane/AutoParam.h"
 #include "orbane/InputControl.h"
+#include "orbane/LabelTexts.h"
 
 namespace Orbane {
 
@@ -74,10 +75,8 @@ private:
     bool mPreviewing = false;
     // The open list's gesture has not been ended by a choice yet.
     bool mGesture = false;
-    bool mTextsChanged = false;
+    LabelTexts mTexts;
     AutoParameter mBeforePopup;
-    OrbString mLabelText;
-    OrbString mSecondText;
     ElideLabel *mLabel;
     OrbComboBox *mCombo;
 };

@@ -51,7 +51,7 @@ bool ScriptValListControl::CopyAttr(Tag tag, void *out)
 bool ScriptValListControl::GetAttrsTagList(TagList &tags) const
 {
     InputControl::GetAttrsTagList(tags);
-    tags.Set(LINKS_Name, mLabelText);
+    mTexts.AddTo(tags);
     tags.Set(LC_Rows, TagValue(mRows));
     return true;
 }
@@ -63,9 +63,8 @@ bool ScriptValListControl::SetAttrsTagList(Input *input, const TagList &tags)
         ApplyTreeHeight();
     }
     InputControl::SetAttrsTagList(input, tags);
-    if (TakeTexts(tags, mLabelText, mSecondText))
-        mTextsChanged = true;
-    if (mTextsChanged)
+    mTexts.Take(tags);
+    if (mTexts.changed)
         NotifyChanged(nullptr, nullptr, nullptr);
     return true;
 }
@@ -74,8 +73,7 @@ bool ScriptValListControl::AddInput(Input *input, const TagList *tags)
 {
     if (!InputControl::AddInput(input, tags))
         return false;
-    mLabelText = LabelOf(input);
-    mSecondText = SecondLabelOf(input);
+    mTexts.Read(input);
     return true;
 }
 
@@ -123,7 +121,7 @@ bool ScriptValListControl::Open(QWidget *host, const QRect &rect, const TagList 
 {
     if (!InputControl::Open(host, rect, tags))
         return false;
-    mLabel->setText(QString::fromStdString(mLabelText.str()));
+    mLabel->setText(QString::fromStdString(mTexts.label.str()));
     mLabel->setAlignment(Qt::AlignLeft);
     mLabel->setWordWrap(false);
     mLabel->show();
@@ -135,7 +133,7 @@ bool ScriptValListControl::Open(QWidget *host, const QRect &rect, const TagList 
     }
     LoadLayout("Controls.ScriptValList.Layout");
     ApplyTreeHeight();
-    mTextsChanged = false;
+    mTexts.changed = false;
     // The tree shows the value from the start, not from the first change.
     UpdateDisplay(GetCurrentInput(), nullptr);
     return true;
@@ -167,9 +165,9 @@ bool ScriptValListControl::UpdateDisplay(Input *input, const TagList *tags)
         const AutoParameter held = mHeldValue;
         if (const auto *table = dynamic_cast<const ScriptValParam *>(held.get()); table && table->Value.IsTable())
             mTree->Fill(mTree->invisibleRootItem(), table->Value, false);
-        if (mTextsChanged) {
-            mLabel->setText(QString::fromStdString(mLabelText.str()));
-            mTextsChanged = false;
+        if (mTexts.changed) {
+            mLabel->setText(QString::fromStdString(mTexts.label.str()));
+            mTexts.changed = false;
         }
     }
     return InputControl::UpdateDisplay(input, tags);

@@ -2,6 +2,7 @@
 
 #include "orbane/AutoParam.h"
 #include "orbane/InputControl.h"
+#include "orbane/LabelTexts.h"
 
 class QLabel;
 
@@ -47,9 +48,7 @@ private:
     ScriptValTreeWidget *mTree;
     QLabel *mLabel;
     uint32 mRows = kDefaultRows;
-    OrbString mLabelText;
-    OrbString mSecondText;
-    bool mTextsChanged = false;
+    LabelTexts mTexts;
 };
 
 } // namespace Orbane

@@ -127,7 +127,7 @@ bool SliderControl::CopyAttr(Tag tag, void *out)
 bool SliderControl::GetAttrsTagList(TagList &tags) const
 {
     InputControl::GetAttrsTagList(tags);
-    tags.Set(LINKS_Name, mLabelText);
+    mTexts.AddTo(tags);
     tags.Set(IC_TickFreq, mTickCount);
     tags.Set(SLCS_LowName, mLowText);
     tags.Set(SLCS_MidName, mMidText);
@@ -142,11 +142,10 @@ bool SliderControl::SetAttrsTagList(Input *input, const TagList &tags)
         ReadOwnAttrs(input, tags);
     else
         InputControl::SetAttrsTagList(input, tags);
-    if (TakeTexts(tags, mLabelText, mSecondText))
-        mTextsChanged = true;
+    mTexts.Take(tags);
     if (IsDisabled() != wasDisabled)
-        mTextsChanged = true;
-    if (mTextsChanged || mKnobStyleChanged)
+        mTexts.changed = true;
+    if (mTexts.changed || mKnobStyleChanged)
         NotifyChanged(nullptr, nullptr, nullptr);
     else if (IsOpen())
         mSlider->Redraw(true);
@@ -206,7 +205,7 @@ void SliderControl::ReadCaptions(const TagList &tags)
         const OrbString text(tags.GetString(ids[i], ""));
         if (text != *texts[i]) {
             *texts[i] = text;
-            mTextsChanged = true;
+            mTexts.changed = true;
         }
     }
 }
@@ -254,9 +253,8 @@ bool SliderControl::AddInput(Input *input, const TagList *tags)
     if (!InputControl::AddInput(input, tags))
         return false;
     mInputIndex = input->GetAttrs().GetInt(SLA_InputIndex, 0);
-    mLabelText = LabelOf(input);
-    mSecondText = SecondLabelOf(input);
-    mLabel->setText(QString::fromStdString(mLabelText.str()));
+    mTexts.Read(input);
+    mLabel->setText(QString::fromStdString(mTexts.label.str()));
     const AutoParameter now(input, GetCurrentTime());
     if (now) {
         NotifyChanged(input, now.get(), nullptr);
@@ -290,7 +288,7 @@ bool SliderControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
     CreateLayout(gLayout, true, nullptr);
     if (Layout::LayoutObj *where = FindLayoutObj("expression"); where && where->AsContainer())
         CreateExpressionEdit(where->AsContainer(), 0);
-    mTextsChanged = false;
+    mTexts.changed = false;
     mKnobStyleChanged = false;
     return true;
 }
@@ -322,10 +320,10 @@ bool SliderControl::UpdateDisplay(Input *input, const TagList *tags)
             ApplyKnobStyle();
             mKnobStyleChanged = false;
         }
-        if (mTextsChanged) {
+        if (mTexts.changed) {
             ShowTexts();
             update();
-            mTextsChanged = false;
+            mTexts.changed = false;
         }
     }
     return InputControl::UpdateDisplay(input, tags);
@@ -333,7 +331,7 @@ bool SliderControl::UpdateDisplay(Input *input, const TagList *tags)
 
 void SliderControl::ShowTexts()
 {
-    mLabel->setText(QString::fromStdString(mLabelText.str()));
+    mLabel->setText(QString::fromStdString(mTexts.label.str()));
     const OrbString *texts[3] = {&mLowText, &mMidText, &mHighText};
     bool anyCaption = false;
     for (int32 i = 0; i < 3; ++i) {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "orbane/InputControl.h"
+#include "orbane/LabelTexts.h"
 #include "orbane/OrbString.h"
 
 #include <limits>
@@ -124,7 +125,7 @@ private:
     bool mSliderDisabled = false;
     int32 mKnobStyle = 0;
     bool mKnobStyleChanged = false;
-    bool mTextsChanged = false;
+    LabelTexts mTexts;
     bool mValueReceived = false;
     int32 mInputIndex = 0;
     OrbString mLowText;
@@ -132,8 +133,6 @@ private:
     OrbString mHighText;
     const QWidget *mPendingEdit = nullptr;
 
-    OrbString mLabelText;
-    OrbString mSecondText;
     ElideLabel *mLabel;
     TimeCodeEdit *mEdit;
     CustomSlider *mSlider;

@@ -177,10 +177,6 @@ public:
     static OrbString LabelOf(const Input *input);
     // Tag 0x30040001, empty where absent.
     static OrbString SecondLabelOf(const Input *input);
-    // The texts rule of SetAttrsTagList: takes the label (0x30040000, else
-    // 0x30020014) and the second label (0x30040001) only where the list
-    // carries them; true where a taken text differs from the stored one.
-    static bool TakeTexts(const TagList &tags, OrbString &label, OrbString &second);
 
     virtual QColor GetBackgroundColor() const;
     // The document of the control's tool; null while no Input is bound.

@@ -359,23 +359,6 @@ OrbString InputControl::SecondLabelOf(const Input *input)
     return input ? OrbString(input->GetAttrs().GetString(LINKS_SecondName, "")) : OrbString();
 }
 
-bool InputControl::TakeTexts(const TagList &tags, OrbString &label, OrbString &second)
-{
-    bool changed = false;
-    const Tag labelTag = tags.FindQuery(LINKS_Name) ? Tag(LINKS_Name) : Tag(INPA_Name);
-    if (tags.FindQuery(labelTag)) {
-        const OrbString text(tags.GetString(labelTag, ""));
-        changed = text != label;
-        label = text;
-    }
-    if (tags.FindQuery(LINKS_SecondName)) {
-        const OrbString text(tags.GetString(LINKS_SecondName, ""));
-        changed = text != second || changed;
-        second = text;
-    }
-    return changed;
-}
-
 QColor InputControl::GetBackgroundColor() const
 {
     return palette().color(QPalette::Window);
