@@ -170,20 +170,13 @@ void CrosshairControl::ControlUp(PreviewInfo *info, const OrbPointI &mouse, cons
 
 uint64 CrosshairControl::ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags)
 {
+    uint64 result = 0;
+    if (NudgeCommand(info, command, data, tags, mValue, 1.0 / info->ImageHeight, result))
+        return result;
     if (command == CCMD_GetInputAt) {
         const Zone zone = HitZone(HandleOffset(*info), info->PickTolerance, ArmReach * info->HandleScale, mStyle == 0);
         if (GetMainInput() && mStyle < 5 && zone.Hit())
             return uint64(reinterpret_cast<uintptr_t>(GetMainInput()));
-    } else if (command == CCMD_NeedsKey) {
-        return IsArrowKey(data) ? 1 : 0;
-    } else if (command == CCMD_KeyDown) {
-        const bool arrow = IsArrowKey(data);
-        if (arrow)
-            Nudge(*info, data);
-        PreviewControl::ControlCommand(info, command, data, tags);
-        return arrow ? 1 : 0;
-    } else if (command == CCMD_KeyUpAll) {
-        ResetUndo(nullptr);
     } else if (command == CCMD_HitTest) {
         return HitTest(*info, data);
     }
@@ -221,13 +214,6 @@ void CrosshairControl::Write(OrbPoint to, const TagList *tags)
 }
 
 // One image pixel on each axis: the width's on X, the height's on Y.
-void CrosshairControl::Nudge(const PreviewInfo &info, uint64 key)
-{
-    const OrbPoint to = mValue + NudgeOffset(key, 1.0 / info.ImageWidth, 1.0 / info.ImageHeight, KeyModifiers());
-    AutoPoint value(to.x, to.y, 0.0);
-    SetInputs(value.get(), GetCurrentTime(), 0, nullptr);
-}
-
 uint64 CrosshairControl::HitTest(PreviewInfo &info, uint64 data)
 {
     const uint8 oldX = mHoverX, oldY = mHoverY;

@@ -66,7 +66,6 @@ private:
     OrbPoint Handle() const { return {mValue.x + mDisplayOffsetX, mValue.y + mDisplayOffsetY}; }
     OrbPoint HandleOffset(const PreviewInfo &info) const;
     void Write(OrbPoint to, const TagList *tags);
-    void Nudge(const PreviewInfo &info, uint64 key);
     uint64 HitTest(PreviewInfo &info, uint64 data);
     void DrawCrosshair(Graphics::GPainter &p, const PreviewInfo &info, OrbPoint at);
 

@@ -162,20 +162,12 @@ void PointControl::ControlUp(PreviewInfo *info, const OrbPointI &mouse, const Ta
 
 uint64 PointControl::ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags)
 {
-    if (command == CCMD_GetInputAt) {
-        if (GetMainInput() && Hits(HandleOffset(*info), info->PickTolerance))
-            return uint64(reinterpret_cast<uintptr_t>(GetMainInput()));
-    } else if (command == CCMD_NeedsKey) {
-        return IsArrowKey(data) ? 1 : 0;
-    } else if (command == CCMD_KeyDown) {
-        const bool arrow = IsArrowKey(data);
-        if (arrow)
-            Nudge(*info, data);
-        PreviewControl::ControlCommand(info, command, data, tags);
-        return arrow ? 1 : 0;
-    } else if (command == CCMD_KeyUpAll) {
-        ResetUndo(nullptr);
-    }
+    // One image pixel of the width on both axes, also for non-square images.
+    uint64 result = 0;
+    if (NudgeCommand(info, command, data, tags, mValue, 1.0 / info->ImageWidth, result))
+        return result;
+    if (command == CCMD_GetInputAt && GetMainInput() && Hits(HandleOffset(*info), info->PickTolerance))
+        return uint64(reinterpret_cast<uintptr_t>(GetMainInput()));
     return PreviewControl::ControlCommand(info, command, data, tags);
 }
 
@@ -191,14 +183,6 @@ OrbPoint PointControl::HandleOffset(const PreviewInfo &info) const
 
 // One image pixel of the image's width on both axes: the same step size
 // whichever way the point goes.
-void PointControl::Nudge(const PreviewInfo &info, uint64 key)
-{
-    const float64 step = 1.0 / info.ImageWidth;
-    const OrbPoint to = mValue + NudgeOffset(key, step, step, KeyModifiers());
-    AutoPoint value(to.x, to.y, 0.0);
-    SetInputs(value.get(), GetCurrentTime(), 0, nullptr);
-}
-
 // Takes the point's X and Y when either moved beyond the threshold.
 bool PointControl::Store(OrbPoint &copy, const Parameter *value)
 {

@@ -44,7 +44,6 @@ public:
 
 private:
     OrbPoint HandleOffset(const PreviewInfo &info) const;
-    void Nudge(const PreviewInfo &info, uint64 key);
     bool Store(OrbPoint &copy, const Parameter *value);
 
     OrbPoint mValue{0.5, 0.5};

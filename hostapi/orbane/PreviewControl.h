@@ -181,6 +181,13 @@ public:
 
 protected:
     void OnInputChanged(Input *input, Parameter *value, const TagList *tags) final;
+    // The arrow-key commands every overlay with a draggable point answers
+    // alike: NeedsKey claims the arrows; KeyDown moves `point` by one image
+    // pixel (1 / ImageWidth across, `stepY` up) scaled by the modifiers and
+    // writes it; KeyUpAll ends the nudges' undo step. True where `command`
+    // was one of them, with the answer in `result`.
+    bool NudgeCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags, OrbPoint point,
+                      float64 stepY, uint64 &result);
     int32 IndexOf(const Input *input) const;
 
     DragType mDragType = DRAG_None;

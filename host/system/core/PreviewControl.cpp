@@ -1,10 +1,12 @@
 #include "orbane/PreviewControl.h"
 
+#include "orbane/AutoParam.h"
 #include "orbane/ControlCommands.h"
 #include "orbane/Input.h"
 #include "orbane/Operator.h"
 #include "orbane/OrbaneDoc.h"
 #include "orbane/Parameter.h"
+#include "orbane/PreviewInfo.h"
 #include "orbane/Registry.h"
 
 #include <QGuiApplication>
@@ -275,6 +277,29 @@ void PreviewControl::Redraw()
 bool PreviewControl::Moved(float64 a, float64 b) noexcept
 {
     return std::fabs(a - b) > ChangeThreshold;
+}
+
+bool PreviewControl::NudgeCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags,
+                                  OrbPoint point, float64 stepY, uint64 &result)
+{
+    if (command == CCMD_NeedsKey) {
+        result = IsArrowKey(data) ? 1 : 0;
+    } else if (command == CCMD_KeyDown) {
+        const bool arrow = IsArrowKey(data);
+        if (arrow) {
+            const OrbPoint to = point + NudgeOffset(data, 1.0 / info->ImageWidth, stepY, KeyModifiers());
+            AutoPoint value(to.x, to.y, 0.0);
+            SetInputs(value.get(), GetCurrentTime(), 0, nullptr);
+        }
+        PreviewControl::ControlCommand(info, command, data, tags);
+        result = arrow ? 1 : 0;
+    } else if (command == CCMD_KeyUpAll) {
+        ResetUndo(nullptr);
+        result = PreviewControl::ControlCommand(info, command, data, tags);
+    } else {
+        return false;
+    }
+    return true;
 }
 
 bool PreviewControl::IsArrowKey(uint64 key) noexcept
