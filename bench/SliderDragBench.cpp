@@ -2,6 +2,8 @@
 // the rounded value written to the Input with undo, every control bound to
 // the Input notified, and the repaint the event loop does. Against a stock
 // QSlider wired to a QDoubleSpinBox through a plain value, doing the same.
+#include "BenchModule.h"
+
 #include "orbane/AutoParam.h"
 #include "orbane/ClassIDs.h"
 #include "orbane/Input.h"
@@ -15,7 +17,6 @@
 
 #include <QApplication>
 #include <QDoubleSpinBox>
-#include <QLibrary>
 #include <QMouseEvent>
 #include <QSlider>
 #include <QStyle>
@@ -34,18 +35,6 @@ constexpr int Moves = 1000;
 constexpr int Width = 300;
 constexpr int KnobY = 7;
 constexpr int KnobWidth = 11;
-
-bool LoadControlLibrary()
-{
-    static QLibrary library;
-    if (library.isLoaded())
-        return true;
-    const QByteArray env = qgetenv("ORBANE_CONTROLS");
-    library.setFileName(env.isEmpty() ? QCoreApplication::applicationDirPath() + "/../lib/orbane/liborbanecontrols.so"
-                                      : QString::fromLocal8Bit(env));
-    library.setLoadHints(QLibrary::ExportExternalSymbolsHint);
-    return library.load();
-}
 
 // The moves sweep the track to and fro, so that every move changes the value.
 int MoveX(int i)
@@ -125,7 +114,7 @@ private:
 
 void BM_SliderControl_Drag(benchmark::State &state)
 {
-    if (!LoadControlLibrary())
+    if (!LoadControlModule())
         return state.SkipWithError("the control library did not load");
     SliderPage page(int(state.range(0)));
     if (!page.IsValid())

@@ -1,6 +1,8 @@
 // A viewer with many point overlays (a chain, each joined to the one before)
 // against a naive QPainter loop that draws the same squares and lines: the
 // cost of a repaint, and of finding the handle under a press.
+#include "BenchModule.h"
+
 #include "orbane/AutoParam.h"
 #include "orbane/ClassIDs.h"
 #include "orbane/Input.h"
@@ -11,7 +13,6 @@
 #include <benchmark/benchmark.h>
 
 #include <QApplication>
-#include <QLibrary>
 #include <QMouseEvent>
 #include <QPainter>
 
@@ -26,20 +27,6 @@ using namespace Orbane;
 constexpr int Width = 800, Height = 450;
 constexpr int ImageWidth = 1600, ImageHeight = 900;
 constexpr int Tolerance = 6;
-
-// The control library as the application loads it: ORBANE_CONTROLS, else
-// next to the benchmark in the build tree.
-bool LoadControls()
-{
-    static QLibrary library;
-    if (library.isLoaded())
-        return true;
-    const QByteArray env = qgetenv("ORBANE_CONTROLS");
-    library.setFileName(env.isEmpty() ? QCoreApplication::applicationDirPath() + "/../lib/orbane/liborbanecontrols.so"
-                                      : QString::fromLocal8Bit(env));
-    library.setLoadHints(QLibrary::ExportExternalSymbolsHint);
-    return library.load();
-}
 
 // Points on a wavy line across the image, in image coordinates.
 std::vector<OrbPoint> Points(int count)
@@ -98,7 +85,7 @@ void SendMouse(QWidget *w, QEvent::Type type, QPointF at, Qt::MouseButtons held)
 
 void BM_Viewer_DrawPointOverlays(benchmark::State &state)
 {
-    if (!LoadControls())
+    if (!LoadControlModule())
         return state.SkipWithError("the control library did not load");
     ViewerRig rig(int(state.range(0)));
     QImage target(Width, Height, QImage::Format_ARGB32_Premultiplied);
@@ -150,7 +137,7 @@ void BM_NaiveQPainter_DrawPoints(benchmark::State &state)
 // it between two presses.
 void BM_Viewer_PressHitTest(benchmark::State &state)
 {
-    if (!LoadControls())
+    if (!LoadControlModule())
         return state.SkipWithError("the control library did not load");
     ViewerRig rig(int(state.range(0)));
     const QPointF at = rig.viewer.ImageToWidget(Points(int(state.range(0))).front());
@@ -169,7 +156,7 @@ void BM_Viewer_PressHitTest(benchmark::State &state)
 // CCMD_HitTest on each move, and nothing needs a repaint.
 void BM_Viewer_HoverHitTest(benchmark::State &state)
 {
-    if (!LoadControls())
+    if (!LoadControlModule())
         return state.SkipWithError("the control library did not load");
     ViewerRig rig(int(state.range(0)));
     const QPointF at = rig.viewer.ImageToWidget(Points(int(state.range(0))).front());
