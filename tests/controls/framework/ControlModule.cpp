@@ -1,8 +1,8 @@
 #include "ControlModule.h"
+#include "LoadControlModule.h"
 
 #include "orbane/RegistryList.h"
 
-#include <cstdlib>
 #include <dlfcn.h>
 
 namespace Orbane {
@@ -10,24 +10,15 @@ namespace Test {
 
 namespace {
 
-void *gHandle = nullptr;
 std::size_t gAdded = 0;
 
 } // namespace
 
 bool ControlModule::Load(std::string *error)
 {
-    const char *path = std::getenv("ORBANE_CONTROLS");
-    if (!path) {
-        *error = "ORBANE_CONTROLS is not set";
-        return false;
-    }
     const std::size_t before = ClassRegistry.All().size();
-    gHandle = dlopen(path, RTLD_NOW | RTLD_GLOBAL);
-    if (!gHandle) {
-        *error = dlerror();
+    if (!LoadControlModule(error))
         return false;
-    }
     gAdded = ClassRegistry.All().size() - before;
     return true;
 }
@@ -37,9 +28,10 @@ std::size_t ControlModule::AddedRegistrations()
     return gAdded;
 }
 
+// The library's symbols are global once loaded.
 void *ControlModule::Symbol(const std::string &name)
 {
-    return gHandle ? dlsym(gHandle, name.c_str()) : nullptr;
+    return dlsym(RTLD_DEFAULT, name.c_str());
 }
 
 } // namespace Test

@@ -1,4 +1,5 @@
 #include "ToolFixture.h"
+#include "LoadControlModule.h"
 
 #include "orbane/AutoParam.h"
 #include "orbane/ClassIDs.h"
@@ -9,8 +10,6 @@
 #include <QTest>
 
 #include <algorithm>
-#include <cstdlib>
-#include <dlfcn.h>
 
 namespace Orbane {
 namespace Test {
@@ -96,17 +95,7 @@ void ToolFixture::Destroy(InputControl *control)
 
 bool ToolFixture::LoadControls(std::string *error)
 {
-    static void *handle = nullptr;
-    static std::string failure;
-    if (!handle && failure.empty()) {
-        const char *path = std::getenv("ORBANE_CONTROLS");
-        handle = path ? dlopen(path, RTLD_NOW | RTLD_GLOBAL) : nullptr;
-        if (!handle)
-            failure = path ? dlerror() : "ORBANE_CONTROLS is not set";
-    }
-    if (error)
-        *error = failure;
-    return handle != nullptr;
+    return LoadControlModule(error);
 }
 
 float64 ToolFixture::NumberOf(const Input *input) const

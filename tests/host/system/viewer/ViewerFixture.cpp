@@ -1,4 +1,5 @@
 #include "ViewerFixture.h"
+#include "LoadControlModule.h"
 
 #include "orbane/AutoParam.h"
 #include "orbane/ClassIDs.h"
@@ -7,8 +8,6 @@
 #include <QApplication>
 #include <QMouseEvent>
 
-#include <cstdlib>
-#include <dlfcn.h>
 
 namespace Orbane {
 namespace Test {
@@ -76,17 +75,7 @@ void ViewerFixture::Drag(QPoint from, QPoint to, int steps)
 
 bool ViewerFixture::LoadControls(std::string *error)
 {
-    static void *handle = nullptr;
-    static std::string failure;
-    if (!handle && failure.empty()) {
-        const char *path = std::getenv("ORBANE_CONTROLS");
-        handle = path ? dlopen(path, RTLD_NOW | RTLD_GLOBAL) : nullptr;
-        if (!handle)
-            failure = path ? dlerror() : "ORBANE_CONTROLS is not set";
-    }
-    if (error)
-        *error = failure;
-    return handle != nullptr;
+    return LoadControlModule(error);
 }
 
 } // namespace Test
