@@ -45,16 +45,12 @@ protected:
     static std::string Eval(const std::string &code)
     {
         const std::string error = Run(code);
-        return error.empty() ? Show(Global("result")) : "error: " + error;
-    }
-
-    static ScriptVal Global(const char *name)
-    {
-        lua_State *L = Lua().State();
-        lua_getglobal(L, name);
-        ScriptVal v = LuaRuntime::ToScriptVal(L, -1);
-        lua_pop(L, 1);
-        return v;
+        if (!error.empty())
+            return "error: " + error;
+        lua_getglobal(Lua().State(), "result");
+        const ScriptVal result = LuaRuntime::ToScriptVal(Lua().State(), -1);
+        lua_pop(Lua().State(), 1);
+        return Show(result);
     }
 
     int mAlive = 0;

@@ -131,9 +131,9 @@ private slots:
 
         LayoutObj *obj = root->Find("checkbox");
         QVERIFY(obj->SetAttrs(TagList{{INPA_LayoutHeight, rowHeight + 37}}));
+        QVERIFY(!obj->SetAttrs(TagList{{LINKS_Name, "not a layout tag"}}));
         QCOMPARE(root->Arrange(250), height + 37);
         QCOMPARE(box->height(), rowHeight + 37);
-        QVERIFY(!obj->SetAttrs(TagList{{LINKS_Name, "not a layout tag"}}));
         QVERIFY(obj->SetAttrs(TagList{{INPA_LayoutHeight, -1}}));
         QCOMPARE(root->Arrange(250), height);
 
