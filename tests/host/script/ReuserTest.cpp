@@ -4,15 +4,9 @@
 
 namespace Orbane {
 
-class ReuserTest : public testing::Test
+TEST(ReuserTest, FreedBlocksComeBackLastFreedFirstWithinTheirClass)
 {
-protected:
-    void SetUp() override { Reuser::Trim(); }
-    void TearDown() override { Reuser::Trim(); }
-};
-
-TEST_F(ReuserTest, FreedBlocksComeBackLastFreedFirstWithinTheirClass)
-{
+    Reuser::Trim();
     void *a = Reuser::operator new(40);
     void *b = Reuser::operator new(48);
     void *big = Reuser::operator new(512);
@@ -29,8 +23,9 @@ TEST_F(ReuserTest, FreedBlocksComeBackLastFreedFirstWithinTheirClass)
     Reuser::operator delete(b, 48);
 }
 
-TEST_F(ReuserTest, LargeBlocksAndNullBypassThePoolAndTrimEmptiesIt)
+TEST(ReuserTest, LargeBlocksAndNullBypassThePoolAndTrimEmptiesIt)
 {
+    Reuser::Trim();
     EXPECT_EQ(Reuser::ClassSize(1025), 0u);
     Reuser::operator delete(Reuser::operator new(4096), 4096);
     EXPECT_EQ(Reuser::FreeBlocks(4096), 0u);

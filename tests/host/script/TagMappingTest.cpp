@@ -39,16 +39,18 @@ bool IntoTags(ScriptVal args, TagList &tags)
     return scriptval_maptags(WidgetTags, MAP_ToTags, args, tags);
 }
 
-struct IntoCase
-{
-    const char *name;
-    ScriptVal args;
-    std::string tags;
-};
+} // namespace
 
-std::vector<IntoCase> IntoCases()
+// One row per kind of map row and per way of giving its value; the text is
+// the tag list the table becomes.
+TEST(TagMapping, MapsNamedValuesToTags)
 {
-    return {
+    const struct
+    {
+        const char *name;
+        ScriptVal args;
+        std::string tags;
+    } cases[] = {
         {"PlainText", Table({{"WGT_Title", "Hello"}}), "30050000=Hello"},
         {"PlainInteger", Table({{"WGT_Count", 3}}), "10050001=3"},
         {"PlainDouble", Table({{"WGT_Scale", 0.5}}), "20050002=0.5"},
@@ -66,95 +68,57 @@ std::vector<IntoCase> IntoCases()
          "20050002=1 30050000=T 10050001=2"},
         {"NoTable", ScriptVal(), ""},
     };
+    for (const auto &c : cases) {
+        TagList tags;
+        ASSERT_TRUE(IntoTags(c.args, tags)) << c.name << ": " << TakeScriptError();
+        EXPECT_EQ(Show(tags), c.tags) << c.name;
+    }
 }
 
-using IntoTagsTest = testing::TestWithParam<IntoCase>;
-
-struct ErrorCase
+// A failure leaves the list as it was, even after good values.
+TEST(TagMapping, FailsWithAMessageAndLeavesTheListAlone)
 {
-    const char *name;
-    ScriptVal args;
-    const char *message;
-};
-
-std::vector<ErrorCase> ErrorCases()
-{
-    return {
-        {"UnknownTag", Table({{"Foo", 1}}), "unknown tag \"Foo\" for ScriptWidget"},
-        {"BooleanGivenString", Table({{"WGT_TriState", "yes"}}), "WGT_TriState: expected a boolean, got string"},
-        {"UnknownEnumerationName", Table({{"WGT_Align", "Middle"}}),
+    const std::pair<ScriptVal, const char *> cases[] = {
+        {Table({{"Foo", 1}}), "unknown tag \"Foo\" for ScriptWidget"},
+        {Table({{"WGT_TriState", "yes"}}), "WGT_TriState: expected a boolean, got string"},
+        {Table({{"WGT_Align", "Middle"}}),
          "WGT_Align: unknown value \"Middle\"; expected one of Left, CenteredLeft, Center, CenteredRight, Right"},
-        {"EnumerationGivenBoolean", Table({{"WGT_Align", true}}),
-         "WGT_Align: expected a name of Align or a number, got boolean"},
-        {"IntegerGivenFraction", Table({{"WGT_Count", 1.5}}), "WGT_Count: expected an integer, got 1.5"},
-        {"RepeatableItemOfWrongType", Table({{"WGT_AddItem", Array({"a", 2})}}),
-         "WGT_AddItem: item 2: expected a string, got 2"},
-        {"PositionalValue", Array({"x"}), "tag names must be strings, got 1"},
-        {"NotATable", ScriptVal("text"), "tags must be given as a table, got string"},
-        {"FailureAfterGoodValues", Table({{"WGT_Title", "ok"}, {"WGT_TriState", "bad"}}),
-         "WGT_TriState: expected a boolean, got string"},
+        {Table({{"WGT_Align", true}}), "WGT_Align: expected a name of Align or a number, got boolean"},
+        {Table({{"WGT_Count", 1.5}}), "WGT_Count: expected an integer, got 1.5"},
+        {Table({{"WGT_AddItem", Array({"a", 2})}}), "WGT_AddItem: item 2: expected a string, got 2"},
+        {Array({"x"}), "tag names must be strings, got 1"},
+        {ScriptVal("text"), "tags must be given as a table, got string"},
+        {Table({{"WGT_Title", "ok"}, {"WGT_TriState", "bad"}}), "WGT_TriState: expected a boolean, got string"},
     };
+    for (const auto &[args, message] : cases) {
+        TagList tags{{WGT_Title, "before"}};
+        EXPECT_FALSE(IntoTags(args, tags));
+        EXPECT_EQ(TakeScriptError(), message);
+        EXPECT_EQ(Show(tags), "30050000=before") << message;
+    }
 }
 
-using MapErrorTest = testing::TestWithParam<ErrorCase>;
-
-struct FromCase
+TEST(TagMapping, MapsTagsToNamedValues)
 {
-    const char *name;
-    TagList tags;
-    std::string attrs;
-};
-
-std::vector<FromCase> FromCases()
-{
-    return {
-        {"EveryKind",
-         {{WGT_Title, "Hello"}, {WGT_Count, 3}, {WGT_Scale, 0.5}, {WGT_Mode, OrbID("Fast")}, {WGT_TriState, 1}, {WGT_Align, 2}},
+    const std::pair<TagList, std::string> cases[] = {
+        {TagList{{WGT_Title, "Hello"},
+                 {WGT_Count, 3},
+                 {WGT_Scale, 0.5},
+                 {WGT_Mode, OrbID("Fast")},
+                 {WGT_TriState, 1},
+                 {WGT_Align, 2}},
          "WGT_Title=Hello; WGT_Count=3; WGT_Scale=0.5; WGT_Mode=Fast; WGT_TriState=true; WGT_Align=Center"},
-        {"Colour", {{WGT_Color, 0xFF0000FFu}}, "WGT_Color={R=1, G=0, B=0, A=1}"},
-        {"RepeatableInRowOrder",
-         {{WGT_AddItem, "a"}, {WGT_Title, "T"}, {WGT_AddItem, "b"}},
-         "WGT_Title=T; WGT_AddItem={a, b}"},
-        {"WrongKindsAndUnknownTagsAreSkipped", {{WGT_Title, 5}, {WGT_TriState, "yes"}, {0x10059999, 1}}, ""},
+        {{{WGT_Color, 0xFF0000FFu}}, "WGT_Color={R=1, G=0, B=0, A=1}"},
+        {{{WGT_AddItem, "a"}, {WGT_Title, "T"}, {WGT_AddItem, "b"}}, "WGT_Title=T; WGT_AddItem={a, b}"},
+        {{{WGT_Title, 5}, {WGT_TriState, "yes"}, {0x10059999, 1}}, ""},
     };
+    for (const auto &[tags, attrs] : cases) {
+        ScriptVal out;
+        TagList in = tags;
+        ASSERT_TRUE(scriptval_maptags(WidgetTags, MAP_FromTags, out, in));
+        EXPECT_EQ(Show(out), attrs);
+    }
 }
-
-using FromTagsTest = testing::TestWithParam<FromCase>;
-
-const auto kName = [](const auto &info) { return std::string(info.param.name); };
-
-} // namespace
-
-TEST_P(IntoTagsTest, MapsNamedValuesToTags)
-{
-    TagList tags;
-    ASSERT_TRUE(IntoTags(GetParam().args, tags)) << TakeScriptError();
-    EXPECT_EQ(Show(tags), GetParam().tags);
-}
-
-INSTANTIATE_TEST_SUITE_P(TagMapping, IntoTagsTest, testing::ValuesIn(IntoCases()), kName);
-
-TEST_P(MapErrorTest, FailsWithAMessageAndLeavesTheListAlone)
-{
-    TagList tags{{WGT_Title, "before"}};
-    TakeScriptError();
-    EXPECT_FALSE(IntoTags(GetParam().args, tags));
-    const std::string message = TakeScriptError();
-    EXPECT_EQ(message, GetParam().message);
-    EXPECT_EQ(Show(tags), "30050000=before");
-}
-
-INSTANTIATE_TEST_SUITE_P(TagMapping, MapErrorTest, testing::ValuesIn(ErrorCases()), kName);
-
-TEST_P(FromTagsTest, MapsTagsToNamedValues)
-{
-    ScriptVal attrs;
-    TagList tags = GetParam().tags;
-    ASSERT_TRUE(scriptval_maptags(WidgetTags, MAP_FromTags, attrs, tags));
-    EXPECT_EQ(Show(attrs), GetParam().attrs);
-}
-
-INSTANTIATE_TEST_SUITE_P(TagMapping, FromTagsTest, testing::ValuesIn(FromCases()), kName);
 
 // An object row checks the script type (or its script base); on a pointer tag
 // the object travels as its address, the way overlays take their linked Inputs.

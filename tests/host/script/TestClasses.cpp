@@ -47,26 +47,10 @@ TestWidget::TestWidget(const Registry *reg, const ScriptVal &, const TagList &ta
     ++sAlive;
 }
 
-TestWidget::~TestWidget()
-{
-    --sAlive;
-}
-
-void TestWidget::operator delete(void *block, std::size_t size) noexcept
-{
-    Reuser::operator delete(block, size);
-}
-
 const char *TestWidget::ScriptTypeName() const
 {
     const FFIType *type = GetFFIType(typeid(*this));
     return type ? type->ScriptName() : "TestWidget";
-}
-
-bool TestWidget::GetAttrsTagList(TagList &tags) const
-{
-    tags = mTags;
-    return true;
 }
 
 bool TestWidget::SetAttrsTagList(const TagList &tags)
@@ -83,10 +67,8 @@ namespace {
 template <class T> ScriptObject *Factory(const Registry *reg, const ScriptVal &args, const TagList &tags)
 {
     void *mem = Reuser::operator new(sizeof(T));
-    if (!mem)
-        return nullptr;
     try {
-        return ::new (mem) T(reg, args, tags);
+        return mem ? ::new (mem) T(reg, args, tags) : nullptr;
     } catch (...) {
         Reuser::operator delete(mem, sizeof(T));
         throw;

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "orbane/OrbID.h"
+#include "orbane/Reuser.h"
 #include "orbane/ScriptObject.h"
 #include "orbane/TagList.h"
 #include "orbane/TagMapEntry.h"
@@ -41,13 +42,13 @@ class TestWidget : public RefObject
 {
 public:
     TestWidget(const Registry *reg, const ScriptVal &args, const TagList &tags);
-    ~TestWidget() override;
+    ~TestWidget() override { --sAlive; }
 
-    static void operator delete(void *block, std::size_t size) noexcept;
+    static void operator delete(void *block, std::size_t size) noexcept { Reuser::operator delete(block, size); }
 
     const Registry *GetRegistry() const override { return mRegistry; }
     const char *ScriptTypeName() const override;
-    bool GetAttrsTagList(TagList &tags) const override;
+    bool GetAttrsTagList(TagList &tags) const override { return (tags = mTags), true; }
     bool SetAttrsTagList(const TagList &tags) override;
 
     int64 Count() const { return mTags.GetLong(WGT_Count); }

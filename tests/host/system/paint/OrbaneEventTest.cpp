@@ -32,23 +32,21 @@ class OrbaneEventTest : public QObject
 {
     Q_OBJECT
 private slots:
-    void sendAndPost();
+    // Send delivers at once and returns the receiver's result; Post delivers
+    // with the event loop. Without a target neither does anything.
+    void sendAndPost()
+    {
+        Receiver r;
+        QCOMPARE(OrbaneEvent::Send(&r, 100, 20, 3), 123u);
+        QVERIFY(OrbaneEvent::Post(&r, 5, 1, 2));
+        QCOMPARE(r.calls, 1);
+        QCoreApplication::sendPostedEvents(&r);
+        QCOMPARE(r.calls, 2);
+        QCOMPARE(r.lastId, 5u);
+        QCOMPARE(OrbaneEvent::Send(nullptr, 5, 1, 1), 0u);
+        QVERIFY(!OrbaneEvent::Post(nullptr, 5));
+    }
 };
-
-// Send delivers at once and returns the receiver's result; Post delivers
-// with the event loop. Without a target neither does anything.
-void OrbaneEventTest::sendAndPost()
-{
-    Receiver r;
-    QCOMPARE(OrbaneEvent::Send(&r, 100, 20, 3), 123u);
-    QVERIFY(OrbaneEvent::Post(&r, 5, 1, 2));
-    QCOMPARE(r.calls, 1);
-    QCoreApplication::sendPostedEvents(&r);
-    QCOMPARE(r.calls, 2);
-    QCOMPARE(r.lastId, 5u);
-    QCOMPARE(OrbaneEvent::Send(nullptr, 5, 1, 1), 0u);
-    QVERIFY(!OrbaneEvent::Post(nullptr, 5));
-}
 
 QTEST_GUILESS_MAIN(OrbaneEventTest)
 #include "OrbaneEventTest.moc"

@@ -1,15 +1,15 @@
 // The inspector as the application uses it: a tool described in Lua, its
 // controls built in Input order from the classes the Inputs name, sized on
 // every width change, and unbound and destroyed when the tool goes.
-#include "ToolFixture.h"
+#include "LoadControlModule.h"
 
 #include "orbane/AutoParam.h"
 #include "orbane/FallbackControl.h"
 #include "orbane/Input.h"
-#include "orbane/ParameterPanel.h"
 #include "orbane/LuaRuntime.h"
 #include "orbane/Operator.h"
 #include "orbane/OrbaneDoc.h"
+#include "orbane/ParameterPanel.h"
 #include "orbane/ScriptVal.h"
 #include "orbane/ToolLoader.h"
 
@@ -30,9 +30,7 @@ Operator *AddTool(OrbaneDoc &doc, const char *lua, const char *name, std::string
     ScriptVal desc = LuaRuntime::ToScriptVal(rt.State(), -1);
     lua_pop(rt.State(), 1);
     AutoRef<Operator> tool(ToolLoader::FromTable(desc, name, error));
-    if (tool && !doc.AddTool(tool.get()))
-        return nullptr;
-    return tool.get();
+    return tool && doc.AddTool(tool.get()) ? tool.get() : nullptr;
 }
 
 const char *kSwitches = R"(return { type = "Switches", inputs = {
@@ -41,6 +39,24 @@ const char *kSwitches = R"(return { type = "Switches", inputs = {
       tags = { CBC_TriState = true } },
     { id = "C", name = "Go", type = "Number", control = "ButtonControl" },
 }})";
+
+// A panel showing one tool of a document.
+struct Shown
+{
+    explicit Shown(const char *lua)
+    {
+        std::string why;
+        tool = AddTool(doc, lua, "Tool1", &why);
+        if (!tool)
+            qWarning("%s", why.c_str());
+        panel.resize(300, 400);
+        panel.show();
+        panel.ShowTool(tool);
+    }
+    OrbaneDoc doc;
+    Operator *tool = nullptr;
+    ParameterPanel panel{&doc};
+};
 
 } // namespace
 
@@ -52,138 +68,103 @@ private slots:
     void initTestCase()
     {
         std::string why;
-        QVERIFY2(Test::ToolFixture::LoadControls(&why), why.c_str());
+        QVERIFY2(Test::LoadControlModule(&why), why.c_str());
     }
 
-    void buildsControlsInInputOrder()
+    // Top to bottom in Input order, every control following the panel's
+    // width, inside it, without a horizontal scroll.
+    void buildsControlsInInputOrderAndSizesThemToTheWidth()
     {
-        OrbaneDoc doc;
-        std::string why;
-        Operator *tool = AddTool(doc, kSwitches, "Switches1", &why);
-        QVERIFY2(tool, why.c_str());
-        ParameterPanel panel(&doc);
-        panel.resize(300, 400);
-        panel.show();
-        panel.ShowTool(tool);
-
-        QCOMPARE(panel.Controls().size(), size_t(4));
-        QCOMPARE(panel.ControlsOf(tool->FindInput("B")).size(), size_t(2));
+        Shown s(kSwitches);
+        QCOMPARE(s.panel.ControlsOf(s.tool->FindInput("B")).size(), size_t(2));
         QStringList classes;
         int lastBottom = 0;
-        for (InputControl *c : panel.Controls()) {
+        for (InputControl *c : s.panel.Controls()) {
             classes << c->ScriptTypeName();
             QVERIFY2(c->geometry().top() >= lastBottom, "controls stack top to bottom");
             lastBottom = c->geometry().bottom();
         }
         QCOMPARE(classes, QStringList({"CheckboxControl", "CheckboxControl", "CheckboxControl", "ButtonControl"}));
-    }
-
-    // Every control follows the panel's width, inside it, without a horizontal scroll.
-    void sizesAgainOnWidthChange()
-    {
-        OrbaneDoc doc;
-        std::string why;
-        Operator *tool = AddTool(doc, kSwitches, "Switches1", &why);
-        QVERIFY2(tool, why.c_str());
-        ParameterPanel panel(&doc);
-        panel.resize(300, 400);
-        panel.show();
-        panel.ShowTool(tool);
         for (int width : {240, 520}) {
-            panel.resize(width, 400);
+            s.panel.resize(width, 400);
             QCoreApplication::processEvents();
-            for (InputControl *c : panel.Controls()) {
-                QVERIFY(c->width() > panel.viewport()->width() - 20);
-                QVERIFY(c->geometry().right() < panel.viewport()->width());
-            }
+            for (InputControl *c : s.panel.Controls())
+                QVERIFY(c->width() > s.panel.viewport()->width() - 20 &&
+                        c->geometry().right() < s.panel.viewport()->width());
         }
     }
 
-    void unknownClassGetsTheFallbackAndAWarning()
+    // An unknown class gets the fallback and a warning; a registered class
+    // whose control is not written yet shows its Input read-only, unwarned.
+    void fallbackShowsTheValueReadOnly_data()
     {
-        OrbaneDoc doc;
-        std::string why;
-        Operator *tool = AddTool(doc, R"(return { inputs = {
-            { id = "Gain", type = "Number", default = 0.25, control = "NoSuchControl" } }})",
-                                 "Tool1", &why);
-        QVERIFY2(tool, why.c_str());
-        ParameterPanel panel(&doc);
-        QTest::ignoreMessage(QtWarningMsg, QRegularExpression("Input \"Gain\" .*\"NoSuchControl\", which is unknown"));
-        panel.ShowTool(tool);
-        QCOMPARE(panel.Controls().size(), size_t(1));
-        auto *fallback = dynamic_cast<FallbackControl *>(panel.Controls().front());
-        QVERIFY(fallback);
-        QCOMPARE(fallback->ValueText(), QString("0.25"));
-        tool->FindInput("Gain")->SetValue(AutoNumber(0.5).get(), 0.0);
-        QCOMPARE(fallback->ValueText(), QString("0.5"));
+        QTest::addColumn<QString>("control");
+        QTest::addColumn<QString>("warning");
+        QTest::newRow("unknown class") << "NoSuchControl"
+                                       << "Input \"Blend Gain\" .*\"NoSuchControl\", which is unknown";
+        QTest::newRow("unwritten control") << "MultiButtonControl"
+                                           << "";
     }
 
-    // A registered class whose control is not written yet still shows its
-    // Input read-only, without a warning: the class is known.
-    void unwrittenControlShowsItsInputReadOnly()
+    void fallbackShowsTheValueReadOnly()
     {
-        OrbaneDoc doc;
-        std::string why;
-        Operator *tool = AddTool(doc, R"(return { inputs = {
-            { id = "Mode", name = "Blend Mode", type = "Number", default = 3, control = "MultiButtonControl" } }})",
-                                 "Tool1", &why);
-        QVERIFY2(tool, why.c_str());
-        ParameterPanel panel(&doc);
-        panel.ShowTool(tool);
-        auto *fallback = dynamic_cast<FallbackControl *>(panel.Controls().front());
+        QFETCH(QString, control);
+        QFETCH(QString, warning);
+        if (!warning.isEmpty())
+            QTest::ignoreMessage(QtWarningMsg, QRegularExpression(warning));
+        const QByteArray lua = QString(R"(return { inputs = { { id = "Gain", name = "Blend Gain", type = "Number",
+            default = 0.25, control = "%1" } }})")
+                                   .arg(control)
+                                   .toUtf8();
+        Shown s(lua.constData());
+        QCOMPARE(s.panel.Controls().size(), size_t(1));
+        auto *fallback = dynamic_cast<FallbackControl *>(s.panel.Controls().front());
         QVERIFY(fallback);
-        QCOMPARE(fallback->ScriptTypeName(), "MultiButtonControl");
-        QCOMPARE(fallback->ValueText(), QString("3"));
-        const auto labels = fallback->findChildren<QLabel *>();
-        QCOMPARE(labels.size(), 2);
-        QCOMPARE(labels.front()->text(), QString("Blend Mode"));
+        QCOMPARE(fallback->ValueText(), QString("0.25"));
+        s.tool->FindInput("Gain")->SetValue(AutoNumber(0.5).get(), 0.0);
+        QCOMPARE(fallback->ValueText(), QString("0.5"));
+        QCOMPARE(fallback->findChildren<QLabel *>().front()->text(), QString("Blend Gain"));
     }
 
     // Removing the tool unbinds every control: nothing watches its Inputs.
     void toolRemovalUnbindsAndDestroys()
     {
-        OrbaneDoc doc;
-        std::string why;
-        Operator *tool = AddTool(doc, kSwitches, "Switches1", &why);
-        QVERIFY2(tool, why.c_str());
-        AutoRef<Operator> keep = AutoRef<Operator>::Share(tool);
-        ParameterPanel panel(&doc);
-        panel.ShowTool(tool);
-        QPointer<QWidget> first = panel.Controls().front();
-        QCOMPARE(tool->FindInput("B")->Watchers().size(), size_t(2));
-        doc.RemoveTool(tool);
-        QVERIFY(!panel.GetTool());
-        QVERIFY(panel.Controls().empty());
+        Shown s(kSwitches);
+        AutoRef<Operator> keep = AutoRef<Operator>::Share(s.tool);
+        QPointer<QWidget> first = s.panel.Controls().front();
+        QCOMPARE(s.tool->FindInput("B")->Watchers().size(), size_t(2));
+        s.doc.RemoveTool(s.tool);
+        QVERIFY(!s.panel.GetTool());
+        QVERIFY(s.panel.Controls().empty());
         QVERIFY2(first.isNull(), "the control is destroyed");
-        for (Input *in : tool->Inputs())
+        for (Input *in : keep->Inputs())
             QVERIFY(in->Watchers().empty());
     }
 
     void badDescriptionsFailWithClearMessages_data()
     {
-        QTest::addColumn<QString>("lua");
+        QTest::addColumn<QString>("input");
         QTest::addColumn<QString>("message");
-        QTest::newRow("unknown tag") << R"(return { inputs = { { id = "A", control = "CheckboxControl",
-            tags = { CBC_Tristate = true } } } })"
-                                     << R"(tool "T": Input "A": unknown tag "CBC_Tristate" for CheckboxControl)";
-        QTest::newRow("wrong tag type") << R"(return { inputs = { { id = "A", control = "CheckboxControl",
-            tags = { CBC_TriState = "yes" } } } })"
-                                        << R"(tool "T": Input "A": CBC_TriState: expected a boolean, got string)";
+        QTest::newRow("unknown tag") << R"({ id = "A", control = "CheckboxControl", tags = { CBC_Tristate = true } })"
+                                     << R"(Input "A": unknown tag "CBC_Tristate" for CheckboxControl)";
+        QTest::newRow("wrong tag type")
+            << R"({ id = "A", control = "CheckboxControl", tags = { CBC_TriState = "yes" } })"
+            << R"(Input "A": CBC_TriState: expected a boolean, got string)";
         QTest::newRow("default of another type")
-            << R"(return { inputs = { { id = "A", default = "x" } } })"
-            << R"(tool "T": Input "A": default: expected a value of type Number, got string)";
-        QTest::newRow("no id") << R"(return { inputs = { { name = "A" } } })"
-                               << R"(tool "T": an Input needs an id)";
+            << R"({ id = "A", default = "x" })"
+            << R"(Input "A": default: expected a value of type Number, got string)";
+        QTest::newRow("no id") << R"({ name = "A" })"
+                               << R"(an Input needs an id)";
     }
 
     void badDescriptionsFailWithClearMessages()
     {
-        QFETCH(QString, lua);
+        QFETCH(QString, input);
         QFETCH(QString, message);
         OrbaneDoc doc;
         std::string why;
-        QVERIFY(!AddTool(doc, lua.toUtf8().constData(), "T", &why));
-        QCOMPARE(QString::fromStdString(why), message);
+        QVERIFY(!AddTool(doc, ("return { inputs = { " + input + " } }").toUtf8().constData(), "T", &why));
+        QCOMPARE(QString::fromStdString(why), "tool \"T\": " + message);
         QVERIFY(doc.Tools().empty());
     }
 };

@@ -61,81 +61,66 @@ class OrbComboBoxTest : public QObject
 {
     Q_OBJECT
 private slots:
-    void rowsCarryItemIndices_data();
-    void rowsCarryItemIndices();
-    void closingTheList_data();
-    void closingTheList();
-};
-
-void OrbComboBoxTest::rowsCarryItemIndices_data()
-{
-    QTest::addColumn<int>("row");
-    QTest::addColumn<int>("index");
-    QTest::newRow("first") << 0 << 4;
-    QTest::newRow("separator") << 1 << 5;
-    QTest::newRow("after the separator") << 2 << 6;
-    QTest::newRow("last") << 3 << 7;
-    QTest::newRow("past the end") << 4 << -1;
-    QTest::newRow("no row") << -1 << -1;
-}
-
-void OrbComboBoxTest::rowsCarryItemIndices()
-{
-    QFETCH(int, row);
-    QFETCH(int, index);
-    OrbComboBox combo;
-    AddRows(combo);
-    QCOMPARE(combo.count(), 4);
-    QCOMPARE(combo.ItemIndexOf(row), index);
-    if (index >= 0)
-        QCOMPARE(combo.RowOfItem(index), row);
-    // The second text of an item is its tip.
-    QCOMPARE(combo.itemData(row, Qt::ToolTipRole).toString(), QString(row == 0 ? "first" : ""));
-}
-
-void OrbComboBoxTest::closingTheList_data()
-{
-    QTest::addColumn<QString>("how");
-    QTest::addColumn<QStringList>("events");
-    QTest::addColumn<int>("current");
-    QTest::newRow("click on a row") << "click 3" << QStringList{"show", "hide", "activated 3"} << 3;
-    QTest::newRow("Return on a row") << "return" << QStringList{"show", "hide", "activated 2"} << 2;
-    QTest::newRow("Escape") << "escape" << QStringList{"show", "hide"} << 0;
-    QTest::newRow("hidePopup") << "program" << QStringList{"show", "hide"} << 0;
-    // The list closes on the row that was current: a separator is never chosen.
-    QTest::newRow("click on the separator") << "click 1" << QStringList{"show", "hide", "activated 0"} << 0;
-}
-
-void OrbComboBoxTest::closingTheList()
-{
-    QFETCH(QString, how);
-    QFETCH(QStringList, events);
-    QFETCH(int, current);
-    Shown s;
-    s.combo->setCurrentIndex(0);
-    s.combo->showPopup();
-    QVERIFY(s.combo->IsPopupVisible());
-    // Shown once, however often asked.
-    s.combo->showPopup();
-    QCOMPARE(s.recorder.events, QStringList{"show"});
-    if (how.startsWith("click")) {
-        const QPoint at = s.RowCentre(how.back().digitValue());
-        QTest::mouseClick(s.View()->viewport(), Qt::LeftButton, Qt::NoModifier, at);
-    } else if (how == "return") {
-        // From "A" past the separator to "B".
-        QTest::keyClick(s.View(), Qt::Key_Down);
-        QTest::keyClick(s.View(), Qt::Key_Return);
-    } else if (how == "escape") {
-        QTest::keyClick(s.View(), Qt::Key_Escape);
+    // Row to item index and back, past either end too; the second text of
+    // an item is its tip.
+    void rowsCarryItemIndices()
+    {
+        OrbComboBox combo;
+        AddRows(combo);
+        QCOMPARE(combo.count(), 4);
+        for (int row = -1; row <= 4; ++row) {
+            const int index = row >= 0 && row < 4 ? row + 4 : -1;
+            QCOMPARE(combo.ItemIndexOf(row), index);
+            QCOMPARE(combo.RowOfItem(index), index < 0 ? -1 : row);
+        }
+        QCOMPARE(combo.itemData(0, Qt::ToolTipRole).toString(), QString("first"));
+        QCOMPARE(combo.itemData(2, Qt::ToolTipRole).toString(), QString());
     }
-    QCoreApplication::processEvents();
-    if (how == "program")
-        s.combo->hidePopup();
-    QVERIFY(!s.View()->isVisible());
-    QVERIFY(!s.combo->IsPopupVisible());
-    QCOMPARE(s.recorder.events, events);
-    QCOMPARE(s.combo->currentIndex(), current);
-}
+
+    void closingTheList_data()
+    {
+        QTest::addColumn<QString>("how");
+        QTest::addColumn<QStringList>("events");
+        QTest::addColumn<int>("current");
+        QTest::newRow("click on a row") << "click 3" << QStringList{"show", "hide", "activated 3"} << 3;
+        QTest::newRow("Return on a row") << "return" << QStringList{"show", "hide", "activated 2"} << 2;
+        QTest::newRow("Escape") << "escape" << QStringList{"show", "hide"} << 0;
+        QTest::newRow("hidePopup") << "program" << QStringList{"show", "hide"} << 0;
+        // The list closes on the row that was current: a separator is never chosen.
+        QTest::newRow("click on the separator") << "click 1" << QStringList{"show", "hide", "activated 0"} << 0;
+    }
+
+    void closingTheList()
+    {
+        QFETCH(QString, how);
+        QFETCH(QStringList, events);
+        QFETCH(int, current);
+        Shown s;
+        s.combo->setCurrentIndex(0);
+        s.combo->showPopup();
+        QVERIFY(s.combo->IsPopupVisible());
+        // Shown once, however often asked.
+        s.combo->showPopup();
+        QCOMPARE(s.recorder.events, QStringList{"show"});
+        if (how.startsWith("click")) {
+            const QPoint at = s.RowCentre(how.back().digitValue());
+            QTest::mouseClick(s.View()->viewport(), Qt::LeftButton, Qt::NoModifier, at);
+        } else if (how == "return") {
+            // From "A" past the separator to "B".
+            QTest::keyClick(s.View(), Qt::Key_Down);
+            QTest::keyClick(s.View(), Qt::Key_Return);
+        } else if (how == "escape") {
+            QTest::keyClick(s.View(), Qt::Key_Escape);
+        }
+        QCoreApplication::processEvents();
+        if (how == "program")
+            s.combo->hidePopup();
+        QVERIFY(!s.View()->isVisible());
+        QVERIFY(!s.combo->IsPopupVisible());
+        QCOMPARE(s.recorder.events, events);
+        QCOMPARE(s.combo->currentIndex(), current);
+    }
+};
 
 QTEST_MAIN(OrbComboBoxTest)
 #include "OrbComboBoxTest.moc"
