@@ -44,8 +44,9 @@ public:
     float32 DrawnFade() const { return mDrawnFade; }
     bool Hovered() const { return mHover; }
     bool FollowsCursor() const { return mFollowCursor != 0; }
-    // Where the press of a drag flagged PEF_StartGrab began, in viewer
-    // units: the dial is drawn there a second time. 0, 0 when none.
+    // For a press flagged PEF_StartGrab: the centre of a dial whose arm
+    // reaches where the press began (viewer units). The dial is drawn there
+    // a second time while the drag lasts; 0, 0 when none.
     OrbPoint StartGrab() const { return mStartGrab; }
     OrbPoint GrabOffset() const { return mGrabOffset; }
     float64 AngleAtPress() const { return mAngleAtPress; }
