@@ -5,6 +5,7 @@ return {
   tools = {
     { file = "tools/Switches.lua", name = "Switches1" },
     { file = "tools/Points.lua", name = "Points1" },
+    { file = "tools/Dials.lua", name = "Dials1" },
     { file = "tools/Sliders.lua", name = "Sliders1" },
     { file = "tools/Choices.lua", name = "Choices1" },
   },

@@ -23,6 +23,10 @@ constexpr Tag ACID_CenterY = 0x80058003;
 constexpr Tag ACP_CenterY = 0x60058003;
 constexpr Tag ACID_CenterZ = 0x80058004;
 constexpr Tag ACP_CenterZ = 0x60058004;
+// Tools choose the dial, scripts do not: no row in the table below.
+// 1 draws the dial and grabs its ring; 0 grabs the end of the radius arm
+// and draws nothing.
+constexpr Tag AC_DialStyle = 0x10058000;
 
 extern const TagMapEntry AngleControlTags[];
 

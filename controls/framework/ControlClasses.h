@@ -8,6 +8,7 @@
 #include "inputcontrols/ComboControl.h"
 #include "inputcontrols/ScriptValListControl.h"
 #include "inputcontrols/SliderControl.h"
+#include "overlays/AngleControl.h"
 #include "overlays/CrosshairControl.h"
 #include "overlays/PointControl.h"
 
@@ -30,7 +31,6 @@
 
 namespace Orbane {
 
-ORBANE_PENDING_PREVIEW(AngleControl);
 // Before the camera and light, which derive from it.
 ORBANE_PENDING_PREVIEW(TransformControl);
 ORBANE_PENDING_DERIVED(CameraControl, TransformControl);
