@@ -9,85 +9,11 @@
 #include <QPaintEvent>
 #include <QtTest>
 
-#include <cmath>
-#include <functional>
-
 using namespace Orbane;
 
 namespace {
 
-// The mappings the tables name. Two segments have their centre at 1; a
-// centre at the range's start keeps the track linear.
-void Apply(CustomSlider *slider, const QByteArray &mode)
-{
-    static const QHash<QByteArray, std::function<void(CustomSlider *)>> mappings{
-        {"linear", [](CustomSlider *) {}},
-        {"exponent 2", [](CustomSlider *s) { s->SetExponent(2.0); }},
-        {"two segments", [](CustomSlider *s) { s->SetCentre(1.0); }},
-        {"centre at an end", [](CustomSlider *s) { s->SetCentre(s->GetMinScale()); }},
-        {"cube callbacks",
-         [](CustomSlider *s) {
-             s->SetMappingCallbacks([](double v, void *) { return v * v * v; }, nullptr,
-                                    [](double t, void *) { return std::cbrt(t); }, nullptr);
-         }},
-        {"square expressions",
-         [](CustomSlider *s) { QVERIFY(s->SetMappingExpressions("value*value", "sqrt(value)")); }},
-        {"expressions with variables",
-         [](CustomSlider *s) {
-             QVERIFY(s->SetMappingExpressions("(value-minscale)/(maxscale-minscale)",
-                                              "minscale+value*(maxscale-minscale)"));
-         }},
-        {"steep callbacks",
-         [](CustomSlider *s) {
-             s->SetMappingCallbacks([](double v, void *) { return std::pow(v, 10.0); }, nullptr,
-                                    [](double t, void *) { return std::pow(t, 0.1); }, nullptr);
-         }},
-        {"steep expressions", [](CustomSlider *s) { QVERIFY(s->SetMappingExpressions("value^10", "value^0.1")); }},
-        {"steepest expressions",
-         [](CustomSlider *s) { QVERIFY(s->SetMappingExpressions("value^1000", "value^0.001")); }},
-    };
-    QVERIFY(mappings.contains(mode));
-    mappings.value(mode)(slider);
-}
-
-void AddMappingColumns()
-{
-    QTest::addColumn<QByteArray>("mode");
-    QTest::addColumn<double>("min");
-    QTest::addColumn<double>("max");
-}
-
 const QColor kKnob(200, 200, 200), kHeld(240, 160, 60), kMarker(150, 150, 150);
-
-// A slider whose track runs from pixel 5 to pixel 205 (an 11-pixel knob on a
-// 211-pixel widget): 200 pixels for the soft range.
-struct SliderFixture
-{
-    static constexpr int Width = 211, Height = 24;
-
-    CustomSlider *slider;
-    DIB *knob = new DIB(11, 14), *held = new DIB(11, 14), *marker = new DIB(7, 5);
-
-    explicit SliderFixture(double min = 0.0, double max = 1.0, CustomSlider *s = new CustomSlider) : slider(s)
-    {
-        knob->Fill(kKnob);
-        held->Fill(kHeld);
-        marker->Fill(kMarker);
-        slider->SetKnobImage(knob, held);
-        slider->SetResetImage(marker);
-        slider->SetAllowedRange(min, max, false);
-        slider->SetScale(min, max, false);
-        slider->SetRange(min, max);
-        slider->SetTrackRect(OrbRectT<int32>(0, 0, Width, Height));
-        slider->resize(Width, Height);
-    }
-    ~SliderFixture()
-    {
-        delete slider;
-        for (DIB *dib : {knob, held, marker})
-            dib->Recycle();
-    }
-};
 
 // A mouse move with modifiers and the button held, which QTest::mouseMove
 // cannot send.
@@ -126,29 +52,48 @@ protected:
     }
 };
 
-// A slider shown in its owner, range 0..1 over 200 pixels (0.005 a pixel),
-// with spies on its signals.
+// A slider shown in its owner, with spies on its signals. Its track runs
+// from pixel 5 to pixel 205 (an 11-pixel knob on a 211-pixel widget): the
+// range 0..1 is 0.005 a pixel.
 struct Shown
 {
+    static constexpr int Width = 211, Height = 24;
+
     TestOwner owner;
-    SliderFixture f;
+    DIB *knob = new DIB(11, 14), *held = new DIB(11, 14), *marker = new DIB(7, 5);
     CustomSlider *s;
     QSignalSpy valueChanged, drag, pressed;
 
     explicit Shown(double min = 0.0, double max = 1.0, CustomSlider *slider = new CustomSlider)
-        : f(min, max, slider), s(slider), valueChanged(s, SIGNAL(ValueChanged(float64))),
+        : s(slider), valueChanged(s, SIGNAL(ValueChanged(float64))),
           drag(s, SIGNAL(dragSlider(CustomController *, int))), pressed(s, SIGNAL(Pressed(CustomController *)))
     {
+        knob->Fill(kKnob);
+        held->Fill(kHeld);
+        marker->Fill(kMarker);
+        s->SetKnobImage(knob, held);
+        s->SetResetImage(marker);
+        s->SetAllowedRange(min, max, false);
+        s->SetScale(min, max, false);
+        s->SetRange(min, max);
+        s->SetTrackRect(OrbRectT<int32>(0, 0, Width, Height));
+        s->resize(Width, Height);
         s->setParent(&owner);
         s->SetOwner(&owner);
-        owner.resize(SliderFixture::Width, SliderFixture::Height);
+        owner.resize(Width, Height);
         owner.show();
         QVERIFY(QTest::qWaitForWindowExposed(&owner));
         QApplication::setActiveWindow(&owner);
         s->setFocus();
         owner.resetUndos = 0;
     }
-    ~Shown() { s->setParent(nullptr); }
+    ~Shown()
+    {
+        s->setParent(nullptr);
+        delete s;
+        for (DIB *dib : {knob, held, marker})
+            dib->Recycle();
+    }
 
     // The row through the middle of the knob, and the reset marker's row.
     int KnobY() const { return s->GetTrackRect().y1 + s->GetKnobTop() + 7; }
@@ -188,15 +133,6 @@ class CustomSliderTest : public QObject
 {
     Q_OBJECT
 private slots:
-    void valueToPixel_data();
-    void valueToPixel();
-    void fineScaling();
-    void flatRange();
-    void resolution_data();
-    void resolution();
-    void badExpressionIsDropped();
-    void mapValue_data();
-    void mapValue();
     void scaleRange();
     void steps_data();
     void steps();
@@ -216,160 +152,25 @@ private slots:
     void repaintsOnlyWhatChanged();
 };
 
-// Value to pixel at one point, and pixel to value and back along the track.
-void CustomSliderTest::valueToPixel_data()
-{
-    AddMappingColumns();
-    QTest::addColumn<double>("value");
-    QTest::addColumn<double>("pixel");
-    QTest::newRow("linear") << QByteArray("linear") << 0.0 << 1.0 << 0.5 << 105.0;
-    QTest::newRow("below clamps") << QByteArray("linear") << 0.0 << 1.0 << -3.0 << 5.0;
-    QTest::newRow("above clamps") << QByteArray("linear") << 0.0 << 1.0 << 9.0 << 205.0;
-    QTest::newRow("negative range") << QByteArray("linear") << -10.0 << -5.0 << -6.0 << 165.0;
-    QTest::newRow("exponent 2") << QByteArray("exponent 2") << 0.0 << 1.0 << 0.25 << 105.0;
-    QTest::newRow("exponent 2 about zero") << QByteArray("exponent 2") << -1.0 << 1.0 << -0.25 << 55.0;
-    QTest::newRow("callback") << QByteArray("cube callbacks") << -2.0 << 2.0 << 1.0 << 117.5;
-    QTest::newRow("expression") << QByteArray("square expressions") << 0.0 << 2.0 << 1.0 << 55.0;
-    QTest::newRow("expression with variables") << QByteArray("expressions with variables") << 2.0 << 6.0 << 3.0 << 55.0;
-    QTest::newRow("two segments below") << QByteArray("two segments") << 0.0 << 10.0 << 0.5 << 55.0;
-    QTest::newRow("two segments centre") << QByteArray("two segments") << 0.0 << 10.0 << 1.0 << 105.0;
-    QTest::newRow("two segments above") << QByteArray("two segments") << 0.0 << 10.0 << 5.5 << 155.0;
-    QTest::newRow("centre at an end is linear") << QByteArray("centre at an end") << 0.0 << 10.0 << 5.0 << 105.0;
-}
-
-void CustomSliderTest::valueToPixel()
-{
-    QFETCH(QByteArray, mode);
-    QFETCH(double, min);
-    QFETCH(double, max);
-    QFETCH(double, value);
-    QFETCH(double, pixel);
-    SliderFixture f(min, max);
-    Apply(f.slider, mode);
-    QVERIFY(qAbs(f.slider->ValueToPixel(value) - pixel) < 1e-9);
-    for (double x = 5.0; x <= 205.0; x += 2.5) {
-        const double v = f.slider->PixelToValue(x);
-        QVERIFY(v >= min - 1e-9 && v <= max + 1e-9);
-        QVERIFY2(qAbs(f.slider->ValueToPixel(v) - x) < 1e-6, qPrintable(QString::number(x)));
-    }
-    // Beyond the track the value stops at the range's ends.
-    if (mode != "two segments") {
-        QVERIFY(qAbs(f.slider->PixelToValue(-50.0) - min) < 1e-9);
-        QVERIFY(qAbs(f.slider->PixelToValue(400.0) - max) < 1e-9);
-    }
-}
-
-// A scale below 1 stretches the track about the anchor (0 here).
-void CustomSliderTest::fineScaling()
-{
-    SliderFixture f;
-    QCOMPARE(f.slider->ValueToPixel(0.01, 0.1), 25.0);
-    QVERIFY(qAbs(f.slider->PixelToValue(25.0, 0.1) - 0.01) < 1e-12);
-    f.slider->SetCentre(0.5);
-    QVERIFY(qAbs(f.slider->ValueToPixel(0.01, 0.1) - 25.0) < 1e-9);
-    QVERIFY(qAbs(f.slider->PixelToValue(25.0, 0.1) - 0.01) < 1e-12);
-}
-
-void CustomSliderTest::flatRange()
-{
-    SliderFixture f(2.0, 2.0);
-    QCOMPARE(f.slider->ValueToPixel(-5.0), 5.0);
-    QCOMPARE(f.slider->ValueToPixel(7.0), 5.0);
-    QCOMPARE(f.slider->Resolution(2.0), 1.0);
-}
-
-void CustomSliderTest::resolution_data()
-{
-    AddMappingColumns();
-    QTest::addColumn<double>("value");
-    QTest::addColumn<double>("resolution");
-    // 200 pixels need three digits across the range.
-    QTest::newRow("unit range") << QByteArray("linear") << 0.0 << 1.0 << 0.3 << 1000.0;
-    QTest::newRow("hundred") << QByteArray("linear") << 0.0 << 100.0 << 30.0 << 10.0;
-    QTest::newRow("exponent, steep end") << QByteArray("exponent 2") << 0.0 << 1.0 << 0.0001 << 1e5;
-    QTest::newRow("exponent, flat end") << QByteArray("exponent 2") << 0.0 << 1.0 << 1.0 << 1000.0;
-    // A steep mapping needs more digits where a pixel covers less of the
-    // range, never more than two beyond the linear case.
-    QTest::newRow("callback, steep end") << QByteArray("steep callbacks") << 0.0 << 1.0 << 1.0 << 1e4;
-    QTest::newRow("callback, flat end") << QByteArray("steep callbacks") << 0.0 << 1.0 << 0.5 << 1000.0;
-    QTest::newRow("expression, steep end") << QByteArray("steep expressions") << 0.0 << 1.0 << 1.0 << 1e4;
-    QTest::newRow("expression, capped") << QByteArray("steepest expressions") << 0.0 << 1.0 << 1.0 << 1e5;
-    QTest::newRow("two segments below") << QByteArray("two segments") << 0.0 << 10.0 << 0.5 << 100.0;
-    QTest::newRow("two segments above") << QByteArray("two segments") << 0.0 << 10.0 << 5.0 << 100.0;
-    QTest::newRow("two segments at centre") << QByteArray("two segments") << 0.0 << 10.0 << 1.0 << 1.0;
-}
-
-void CustomSliderTest::resolution()
-{
-    QFETCH(QByteArray, mode);
-    QFETCH(double, min);
-    QFETCH(double, max);
-    QFETCH(double, value);
-    QFETCH(double, resolution);
-    SliderFixture f(min, max);
-    Apply(f.slider, mode);
-    QCOMPARE(f.slider->Resolution(value), resolution);
-}
-
-void CustomSliderTest::badExpressionIsDropped()
-{
-    SliderFixture f;
-    QVERIFY(!f.slider->SetMappingExpressions("value*", "value"));
-    QVERIFY(f.slider->GetForwardExpression().IsEmpty());
-    QVERIFY(!f.slider->SetMappingExpressions("nosuchvar", ""));
-    QCOMPARE(f.slider->ValueToPixel(0.5), 105.0);
-}
-
-void CustomSliderTest::mapValue_data()
-{
-    QTest::addColumn<bool>("integer");
-    QTest::addColumn<bool>("snap");
-    QTest::addColumn<double>("centre");
-    QTest::addColumn<double>("stepDown");
-    QTest::addColumn<double>("value");
-    QTest::addColumn<double>("mapped");
-    const double linear = -100.0; // no centre inside the range
-    QTest::newRow("truncates toward zero") << true << true << linear << 1.0 << -2.7 << -2.0;
-    QTest::newRow("step of five") << true << true << linear << 5.0 << 8.0 << 10.0;
-    QTest::newRow("negative step of five") << true << true << linear << 5.0 << -7.0 << 0.0;
-    QTest::newRow("snap alone keeps value") << false << true << linear << 1.0 << -2.7 << -2.7;
-    QTest::newRow("below the centre") << true << true << 2.4 << 1.0 << 1.2 << 1.0;
-    QTest::newRow("crossing the centre") << true << true << 2.4 << 4.0 << 2.3 << 2.0;
-}
-
-void CustomSliderTest::mapValue()
-{
-    QFETCH(bool, integer);
-    QFETCH(bool, snap);
-    QFETCH(double, centre);
-    QFETCH(double, stepDown);
-    QFETCH(double, value);
-    QFETCH(double, mapped);
-    SliderFixture f(-10.0, 10.0);
-    if (centre > -10.0)
-        f.slider->SetCentre(centre);
-    f.slider->SetInteger(integer);
-    f.slider->SetSnapToStep(snap);
-    f.slider->SetStepsDown(0.1, stepDown, 5.0);
-    QCOMPARE(f.slider->MapValue(value), mapped);
-}
-
 // SetRange orders its ends and clamps value and centre into them; where an
 // end stays, the scale the user set at that end is kept.
 void CustomSliderTest::scaleRange()
 {
-    SliderFixture f(-100.0, 100.0);
-    f.slider->SetValue(50.0, false);
-    f.slider->SetCentre(-60.0);
-    f.slider->SetRange(10.0, -10.0);
-    QCOMPARE(f.slider->GetMinScale(), -10.0);
-    QCOMPARE(f.slider->GetMaxScale(), 10.0);
-    QCOMPARE(f.slider->GetValue(), 10.0);
-    QCOMPARE(f.slider->GetCentre(), -10.0);
-    f.slider->SetScale(-20.0, 20.0, false);
-    f.slider->SetRange(-10.0, 50.0);
-    QCOMPARE(f.slider->GetMinScale(), -20.0);
-    QCOMPARE(f.slider->GetMaxScale(), 50.0);
+    Shown w(-100.0, 100.0);
+    w.s->SetValue(50.0, false);
+    w.s->SetCentre(-60.0);
+    w.s->SetRange(10.0, -10.0);
+    QCOMPARE(w.s->GetMinScale(), -10.0);
+    QCOMPARE(w.s->GetMaxScale(), 10.0);
+    QCOMPARE(w.s->GetValue(), 10.0);
+    QCOMPARE(w.s->GetCentre(), -10.0);
+    // A centre at an end of the range leaves the track linear.
+    w.s->SetCentre(-10.0);
+    QVERIFY(!w.s->IsTwoSegment());
+    w.s->SetScale(-20.0, 20.0, false);
+    w.s->SetRange(-10.0, 50.0);
+    QCOMPARE(w.s->GetMinScale(), -20.0);
+    QCOMPARE(w.s->GetMaxScale(), 50.0);
 }
 
 // Step and tick counts divide each side of the centre; one tick counts as two.
@@ -391,14 +192,14 @@ void CustomSliderTest::steps()
     QFETCH(int, stepCount);
     QFETCH(int, tickCount);
     QFETCH(QList<double>, expected);
-    SliderFixture f(0.0, 8.0);
+    Shown w(0.0, 8.0);
     if (centre >= 0.0)
-        f.slider->SetCentre(centre);
-    f.slider->SetStepCount(stepCount);
-    f.slider->SetTickCount(tickCount);
+        w.s->SetCentre(centre);
+    w.s->SetStepCount(stepCount);
+    w.s->SetTickCount(tickCount);
     const auto normal = CustomSlider::STEP_Normal, coarse = CustomSlider::STEP_Coarse;
-    QCOMPARE(QList<double>({f.slider->GetStepDown(normal), f.slider->GetStepUp(normal), f.slider->GetStepDown(coarse),
-                            f.slider->GetStepUp(coarse)}),
+    QCOMPARE(QList<double>(
+                 {w.s->GetStepDown(normal), w.s->GetStepUp(normal), w.s->GetStepDown(coarse), w.s->GetStepUp(coarse)}),
              expected);
 }
 
