@@ -2,6 +2,7 @@
 
 #include "WidgetTestSupport.h"
 
+#include "orbane/AutoRef.h"
 #include "orbane/DIB.h"
 #include "orbane/Gradient.h"
 #include "orbane/TimeCodeEdit.h"
@@ -114,6 +115,29 @@ struct Shown
     QList<int> Firsts() const { return Column<int>(drag, 1); }
 };
 
+// One step of a gesture: "press X", "move X" or "release X" on the knob's
+// row, or on the marker's row after "marker", with "ctrl" at the end for the
+// Control key held; "ctrl down" and "ctrl up" press and let go of it.
+void Run(Shown &w, const QString &step)
+{
+    if (step == "ctrl down")
+        return QTest::keyPress(w.s, Qt::Key_Control, Qt::ControlModifier);
+    if (step == "ctrl up")
+        return QTest::keyRelease(w.s, Qt::Key_Control);
+    QStringList words = step.split(' ');
+    const bool marker = words.first() == "marker";
+    if (marker)
+        words.removeFirst();
+    const Qt::KeyboardModifiers m(words.last() == "ctrl" ? Qt::ControlModifier : Qt::NoModifier);
+    const QPoint at = marker ? w.Marker(words[1].toInt()) : w.At(words[1].toInt());
+    if (words[0] == "press")
+        QTest::mousePress(w.s, Qt::LeftButton, m, at);
+    else if (words[0] == "move")
+        MoveMouse(w.s, at, m);
+    else
+        QTest::mouseRelease(w.s, Qt::LeftButton, m, at);
+}
+
 bool Close(const QColor &a, const QColor &b, int tol = 3)
 {
     return qAbs(a.red() - b.red()) <= tol && qAbs(a.green() - b.green()) <= tol && qAbs(a.blue() - b.blue()) <= tol;
@@ -136,19 +160,14 @@ private slots:
     void scaleRange();
     void steps_data();
     void steps();
-    void knobKeepsItsGrabPoint();
-    void ctrlChangeReAnchors_data();
-    void ctrlChangeReAnchors();
+    void gestures_data();
+    void gestures();
     void keySteps();
-    void markerClickResets();
-    void trackPressPages_data();
-    void trackPressPages();
     void dragDrivesDocument();
     void editDrag();
     void knobAndMarkerDrawn();
     void knobStates();
     void gradientPaintsTrack();
-    void secondGradientRightOfCentre();
     void repaintsOnlyWhatChanged();
 };
 
@@ -203,62 +222,57 @@ void CustomSliderTest::steps()
              expected);
 }
 
-// A press off the knob's centre moves nothing; the drag then moves the value
-// by the pixels the mouse travels, as one gesture.
-void CustomSliderTest::knobKeepsItsGrabPoint()
+// Mouse gestures on a slider with the default 0.3 (its marker at x 65) and
+// the steps 0.01, 0.1 and 0.25: the values signalled; the first change of a
+// gesture says so; every release closes the owner's undo step.
+void CustomSliderTest::gestures_data()
 {
+    QTest::addColumn<double>("start");
+    QTest::addColumn<QStringList>("steps");
+    QTest::addColumn<QList<double>>("values");
+    using Steps = QStringList;
+    using Values = QList<double>;
+    // The knob of 0.123456 is at x 30: a press at 33 keeps the 3 pixels.
+    QTest::newRow("press off the knob's centre")
+        << 0.123456 << Steps{"press 33", "move 33", "move 53", "move 73", "release 73"} << Values{0.223, 0.323};
+    // A change of Ctrl re-anchors at the current value, the knob under the cursor.
+    QTest::newRow("Ctrl let go") << 0.5 << Steps{"press 105", "move 155 ctrl", "ctrl up", "move 165", "release 165"}
+                                 << Values{0.525, 0.575};
+    QTest::newRow("Ctrl pressed") << 0.5
+                                  << Steps{"press 105", "move 155", "ctrl down", "move 165 ctrl", "release 165 ctrl"}
+                                  << Values{0.75, 0.755};
+    QTest::newRow("marker let go elsewhere") << 0.8 << Steps{"marker press 65", "marker release 120"} << Values{};
+    QTest::newRow("marker click resets") << 0.8 << Steps{"marker press 65", "marker release 65"} << Values{0.3};
+    QTest::newRow("page left of the knob") << 0.5 << Steps{"press 20", "release 20"} << Values{0.25};
+    QTest::newRow("page right of the knob") << 0.5 << Steps{"press 190", "release 190"} << Values{0.75};
+    QTest::newRow("Ctrl pages finely") << 0.5 << Steps{"press 190 ctrl", "release 190 ctrl"} << Values{0.51};
+    QTest::newRow("page from just left of the widget") << 0.5 << Steps{"press -9", "release -9"} << Values{0.25};
+}
+
+void CustomSliderTest::gestures()
+{
+    QFETCH(double, start);
+    QFETCH(QStringList, steps);
+    QFETCH(QList<double>, values);
     Shown w;
     QSignalSpy released(w.s, SIGNAL(Released(CustomController *)));
-    w.s->SetValue(0.123456, false);
-    QCOMPARE(w.s->KnobX(), 30);
-    w.Press(33);
+    w.s->SetSteps(0.01, 0.1, 0.25);
+    w.s->SetDefault(0.3, false);
+    w.s->SetValue(start, false);
+    for (const QString &step : steps)
+        Run(w, step);
+    QCOMPARE(w.Values(), values);
+    QList<int> firsts;
+    for (int i = 0; i < values.size(); ++i)
+        firsts << (i == 0 ? 1 : 0);
+    QCOMPARE(w.Firsts(), firsts);
+    if (!values.isEmpty())
+        QCOMPARE(PointerArg<CustomController>(w.drag.at(0).at(0)), w.s);
     QCOMPARE(PointerArg<CustomController>(w.pressed.at(0).at(0)), w.s);
-    w.Move(33);
-    QCOMPARE(w.valueChanged.count(), 0);
-    w.Move(53);
-    w.Move(73);
-    w.Release(73);
-    QCOMPARE(w.Values(), QList<double>({0.223, 0.323}));
-    QCOMPARE(w.Firsts(), QList<int>({1, 0}));
-    QCOMPARE(PointerArg<CustomController>(w.drag.at(0).at(0)), w.s);
-    QCOMPARE(released.count(), 1);
-    QCOMPARE(w.owner.resetUndos, 1);
+    const int releases = steps.filter("release").size();
+    QCOMPARE(released.count(), releases);
+    QCOMPARE(w.owner.resetUndos, releases);
     QVERIFY(!w.s->IsDragging());
-}
-
-// Pressing or letting go of Ctrl in a drag re-anchors at the current value:
-// the knob stays under the cursor and the new rate applies from there.
-void CustomSliderTest::ctrlChangeReAnchors_data()
-{
-    QTest::addColumn<int>("before");
-    QTest::addColumn<int>("after");
-    QTest::addColumn<double>("atSwitch");
-    QTest::addColumn<double>("end");
-    const int none = Qt::NoModifier, ctrl = Qt::ControlModifier;
-    QTest::newRow("Ctrl let go") << ctrl << none << 0.525 << 0.575;
-    QTest::newRow("Ctrl pressed") << none << ctrl << 0.75 << 0.755;
-}
-
-void CustomSliderTest::ctrlChangeReAnchors()
-{
-    QFETCH(int, before);
-    QFETCH(int, after);
-    QFETCH(double, atSwitch);
-    QFETCH(double, end);
-    Shown w;
-    w.s->SetValue(0.5, false);
-    w.Press(105);
-    w.Move(155, Qt::KeyboardModifiers(before));
-    if (after)
-        QTest::keyPress(w.s, Qt::Key_Control, Qt::ControlModifier);
-    else
-        QTest::keyRelease(w.s, Qt::Key_Control);
-    QCOMPARE(w.s->GetValue(), atSwitch);
-    QCOMPARE(w.s->GetScaleAnchor(), atSwitch);
-    w.Move(165, Qt::KeyboardModifiers(after));
-    QCOMPARE(w.s->GetValue(), end);
-    w.Release(165, Qt::KeyboardModifiers(after));
-    QCOMPARE(w.owner.resetUndos, 1);
 }
 
 // Integer sliders step by at least 1 at every level; on two segments a step
@@ -287,50 +301,6 @@ void CustomSliderTest::keySteps()
     w.s->SetValue(2.0, false);
     w.Key(Qt::Key_Left);
     QCOMPARE(w.s->GetValue(), 1.0);
-}
-
-// A click on the marker goes back to the default when the button is let go
-// over it; let go elsewhere, nothing changes.
-void CustomSliderTest::markerClickResets()
-{
-    Shown w;
-    w.s->SetDefault(0.3, false);
-    w.s->SetValue(0.8, false);
-    for (int releaseX : {120, 65}) {
-        QTest::mousePress(w.s, Qt::LeftButton, Qt::NoModifier, w.Marker(65));
-        QCOMPARE(w.s->GetValue(), 0.8);
-        QTest::mouseRelease(w.s, Qt::LeftButton, Qt::NoModifier, w.Marker(releaseX));
-    }
-    QCOMPARE(w.Values(), QList<double>({0.3}));
-    QCOMPARE(w.Firsts(), QList<int>({1}));
-    QCOMPARE(w.owner.resetUndos, 2);
-}
-
-void CustomSliderTest::trackPressPages_data()
-{
-    QTest::addColumn<int>("x");
-    QTest::addColumn<int>("modifiers");
-    QTest::addColumn<double>("expected");
-    QTest::newRow("left of the knob") << 20 << int(Qt::NoModifier) << 0.25;
-    QTest::newRow("right of the knob") << 190 << int(Qt::NoModifier) << 0.75;
-    QTest::newRow("ctrl pages finely") << 190 << int(Qt::ControlModifier) << 0.51;
-    QTest::newRow("just left of the widget") << -9 << int(Qt::NoModifier) << 0.25;
-}
-
-void CustomSliderTest::trackPressPages()
-{
-    QFETCH(int, x);
-    QFETCH(int, modifiers);
-    QFETCH(double, expected);
-    Shown w;
-    w.s->SetSteps(0.01, 0.1, 0.25);
-    w.s->SetValue(0.5, false);
-    w.Press(x, Qt::KeyboardModifiers(modifiers));
-    QCOMPARE(w.s->GetValue(), expected);
-    w.Release(x, Qt::KeyboardModifiers(modifiers));
-    QCOMPARE(w.Values(), QList<double>({expected}));
-    QCOMPARE(w.Firsts(), QList<int>({1}));
-    QCOMPARE(w.owner.resetUndos, 1);
 }
 
 // A knob drag turns the document's automatic proxy on while it lasts and
@@ -417,34 +387,28 @@ void CustomSliderTest::knobStates()
     QCOMPARE(w.valueChanged.count(), 0);
 }
 
+// A ramp paints the track in its colour space; a second one takes the half
+// right of the centre; without ramps the track is plain again.
 void CustomSliderTest::gradientPaintsTrack()
 {
     Shown w;
     w.s->SetValue(0.5, true);
     const QColor plain = w.OnTrack(20);
-    Gradient *ramp = Ramp({1, 0, 0, 1}, {0, 0, 1, 1});
-    w.s->SetGradients(ramp, nullptr);
-    ramp->DecRef();
+    AutoRef<Gradient> ramp(Ramp({1, 0, 0, 1}, {0, 0, 1, 1}));
+    w.s->SetGradients(ramp.get(), nullptr);
     const QColor left = w.OnTrack(20), right = w.OnTrack(190);
     QVERIFY(left.red() > 200 && left.blue() < 60);
     QVERIFY(right.blue() > 200 && right.red() < 60);
     w.s->SetColorSpaces(GCS_HSV, GCS_RGB);
     QVERIFY(w.OnTrack(85).green() < 40); // hue runs through magenta, never green
+    w.s->SetColorSpaces(GCS_RGB, GCS_RGB);
+    AutoRef<Gradient> green(Ramp({0, 1, 0, 1}, {0, 1, 0, 1}));
+    w.s->SetCentre(0.5);
+    w.s->SetGradients(ramp.get(), green.get());
+    QVERIFY(w.OnTrack(12).red() > 200); // the first ramp, squeezed into the left half
+    QVERIFY(w.OnTrack(170).green() > 200);
     w.s->SetGradients(nullptr, nullptr);
     QVERIFY(Close(w.OnTrack(20), plain));
-}
-
-void CustomSliderTest::secondGradientRightOfCentre()
-{
-    Shown w;
-    w.s->SetCentre(0.5);
-    w.s->SetValue(0.5, true);
-    Gradient *left = Ramp({1, 0, 0, 1}, {1, 0, 0, 1}), *right = Ramp({0, 1, 0, 1}, {0, 1, 0, 1});
-    w.s->SetGradients(left, right);
-    left->DecRef();
-    right->DecRef();
-    QVERIFY(w.OnTrack(40).red() > 200);
-    QVERIFY(w.OnTrack(170).green() > 200);
 }
 
 // A new value repaints the strip the knob swept, from the same back buffer;
