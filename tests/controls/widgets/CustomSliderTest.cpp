@@ -100,9 +100,6 @@ struct Shown
     int KnobY() const { return s->GetTrackRect().y1 + s->GetKnobTop() + 7; }
     QPoint At(int x) const { return QPoint(x, KnobY()); }
     QPoint Marker(int x) const { return QPoint(x, s->GetTrackRect().y1 + s->GetResetTop() + 2); }
-    void Press(int x, Qt::KeyboardModifiers m = Qt::NoModifier) { QTest::mousePress(s, Qt::LeftButton, m, At(x)); }
-    void Move(int x, Qt::KeyboardModifiers m = Qt::NoModifier) { MoveMouse(s, At(x), m); }
-    void Release(int x, Qt::KeyboardModifiers m = Qt::NoModifier) { QTest::mouseRelease(s, Qt::LeftButton, m, At(x)); }
     void Key(Qt::Key key, Qt::KeyboardModifiers m = Qt::NoModifier) { QTest::keyClick(s, key, m); }
     QColor Pixel(int x, int y) const
     {
@@ -312,15 +309,15 @@ void CustomSliderTest::dragDrivesDocument()
     Shown w;
     w.owner.doc = &doc;
     w.s->SetValue(0.5, false);
-    w.Press(105);
+    Run(w, "press 105");
     QVERIFY(doc.GetAutoProxy());
-    w.Move(125);
-    w.Release(125);
+    Run(w, "move 125");
+    Run(w, "release 125");
     QVERIFY(!doc.GetAutoProxy());
     QCOMPARE(renders.count(), 1);
-    w.Press(20);
+    Run(w, "press 20");
     QVERIFY(!doc.GetAutoProxy());
-    w.Release(20);
+    Run(w, "release 20");
     QCOMPARE(renders.count(), 1);
 }
 
@@ -379,9 +376,9 @@ void CustomSliderTest::knobStates()
     QVERIFY(Close(w.OnTrack(105), kKnob));
     w.s->SetDisabled(true);
     QVERIFY(w.OnTrack(105).lightness() < kKnob.lightness() - 10);
-    w.Press(105);
-    w.Move(150);
-    w.Release(150);
+    Run(w, "press 105");
+    Run(w, "move 150");
+    Run(w, "release 150");
     w.Key(Qt::Key_Right);
     QCOMPARE(w.pressed.count(), 1);
     QCOMPARE(w.valueChanged.count(), 0);
