@@ -4,6 +4,7 @@
 #include "inputcontrols/DisconnectWrite.h"
 #include "widgets/CustomSlider.h"
 #include "widgets/SkinImages.h"
+#include "widgets/SliderMapping.h"
 
 #include "orbane/AutoParam.h"
 #include "orbane/ElideLabel.h"
@@ -69,18 +70,6 @@ float64 SliderControl::StepFor(int32 places)
     if (uint32(places) == 0xFFFFFFFFu)
         return kAutoStep;
     return 1.0 / std::pow(10.0, places);
-}
-
-float64 SliderControl::RoundToStep(float64 value, float64 step)
-{
-    if (!(step > 0.0))
-        return value;
-    // Dividing by a whole number of steps per unit gives the double nearest
-    // the decimal (0.12, not 12 * 0.01).
-    const float64 perUnit = std::round(1.0 / step);
-    if (perUnit >= 1.0 && std::fabs(perUnit * step - 1.0) < 1e-12)
-        return std::floor(value * perUnit + 0.5) / perUnit;
-    return std::floor((value + step * 0.5) / step) * step;
 }
 
 const char *SliderControl::KnobImageName(int32 style, bool held)
@@ -369,7 +358,7 @@ void SliderControl::WriteValue(float64 value)
     bool integer = false;
     // A time is written as it is: frames need not fall on the decimal grid.
     if (!mTimeDisplay) {
-        value = RoundToStep(value, mStep);
+        value = SliderMapping::RoundHalfUp(value, mStep);
         integer = mIntegerDisplay;
     }
     if (!HasValueChanged(integer, value, mValue, tolerance))

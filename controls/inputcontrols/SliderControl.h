@@ -75,8 +75,6 @@ public:
 
     // The step values are rounded to: 1/10^places, or kAutoStep for -1.
     static float64 StepFor(int32 places);
-    // Rounds halves up onto the step's grid.
-    static float64 RoundToStep(float64 value, float64 step);
     // The look-pack names of the knob pair a knob style uses.
     static const char *KnobImageName(int32 style, bool held);
 

@@ -4,7 +4,6 @@
 
 #include "orbane/DIB.h"
 #include "orbane/Gradient.h"
-#include "orbane/Parser.h"
 
 #include <algorithm>
 #include <cmath>
@@ -20,24 +19,9 @@ constexpr float64 ValueEpsilon = 1.1920928955078125e-07;
 // within this of it.
 constexpr float64 CentreEpsilon = 1e-9;
 
-enum Symbol
-{
-    SYM_Value,
-    SYM_MinScale,
-    SYM_MaxScale,
-    SYM_MinAllowed,
-    SYM_MaxAllowed
-};
-const char *const SymbolNames[] = {"value", "minscale", "maxscale", "minallowed", "maxallowed"};
-
 float64 Clamp(float64 v, float64 lo, float64 hi)
 {
     return v < lo ? lo : v > hi ? hi : v;
-}
-
-float64 SignedPow(float64 v, float64 e)
-{
-    return v < 0.0 ? -std::pow(-v, e) : std::pow(v, e);
 }
 
 } // namespace
@@ -124,7 +108,7 @@ void CustomSlider::SetTickCount(int32 count)
     mTickCount = std::max(2, count);
     const float64 intervals = mTickCount - 1;
     mStepDown[STEP_Coarse] = mStepUp[STEP_Coarse] = (mMaxScale - mMinScale) / intervals;
-    if (mTwoSegment) {
+    if (IsTwoSegment()) {
         mStepDown[STEP_Coarse] = (mCentre - mMinScale) / intervals;
         mStepUp[STEP_Coarse] = (mMaxScale - mCentre) / intervals;
     }
@@ -134,8 +118,9 @@ void CustomSlider::SetStepCount(int32 count)
 {
     if (count <= 0)
         return;
-    const float64 down = (mTwoSegment ? mCentre - mMinScale : mMaxScale - mMinScale) / count;
-    const float64 up = (mTwoSegment ? mMaxScale - mCentre : mMaxScale - mMinScale) / count;
+    const bool twoSegment = IsTwoSegment();
+    const float64 down = (twoSegment ? mCentre - mMinScale : mMaxScale - mMinScale) / count;
+    const float64 up = (twoSegment ? mMaxScale - mCentre : mMaxScale - mMinScale) / count;
     mStepDown[STEP_Fine] = down / 10.0;
     mStepDown[STEP_Normal] = down;
     mStepUp[STEP_Fine] = up / 10.0;
@@ -145,7 +130,7 @@ void CustomSlider::SetStepCount(int32 count)
 void CustomSlider::SetCentre(float64 centre)
 {
     mCentre = centre;
-    mTwoSegment = centre != mMinScale && centre != mMaxScale;
+    mMapping.SetTwoSegment(centre != mMinScale && centre != mMaxScale);
     SetTrackRect(mTrackRect);
     Redraw(true);
 }
@@ -206,154 +191,23 @@ void CustomSlider::SetColorSpaces(int32 first, int32 second)
 
 void CustomSlider::SetMappingCallbacks(MapFunc forward, void *forwardData, MapFunc inverse, void *inverseData)
 {
-    mForward = forward;
-    mForwardData = forwardData;
-    mInverse = inverse;
-    mInverseData = inverseData;
+    mMapping.SetCallbacks(forward, forwardData, inverse, inverseData);
     Redraw(true);
 }
 
 bool CustomSlider::SetMappingExpressions(const char *forward, const char *inverse)
 {
-    auto compile = [this](const char *text, OrbString &expr, std::unique_ptr<Parser> &parser) {
-        expr = OrbString();
-        if (!text || !*text)
-            return true;
-        if (!parser) {
-            parser = std::make_unique<Parser>();
-            for (int32 i = 0; i < 5; ++i)
-                parser->DefineVar(SymbolNames[i], &mSymbols[i]);
-        }
-        if (!parser->SetExpression(text))
-            return false;
-        expr = OrbString(text);
-        return true;
-    };
-    const bool ok = compile(forward, mForwardExpr, mForwardParser) & compile(inverse, mInverseExpr, mInverseParser);
+    const bool ok = mMapping.SetExpressions(forward, inverse);
     Redraw(true);
     return ok;
 }
 
 // ---- mapping ----
 
-bool CustomSlider::HasMapping() const noexcept
+const SliderMapping &CustomSlider::Mapping() const
 {
-    return mForward || !mForwardExpr.IsEmpty();
-}
-
-float64 CustomSlider::ScaleForward(float64 value) const
-{
-    if (mForward)
-        return mForward(value, mForwardData);
-    if (!mForwardExpr.IsEmpty()) {
-        mSymbols[SYM_Value] = value;
-        mSymbols[SYM_MinScale] = mMinScale;
-        mSymbols[SYM_MaxScale] = mMaxScale;
-        mSymbols[SYM_MinAllowed] = mMinAllowed;
-        mSymbols[SYM_MaxAllowed] = mMaxAllowed;
-        return mForwardParser->Evaluate();
-    }
-    return mExponent == 1.0 ? value : SignedPow(value, 1.0 / mExponent);
-}
-
-float64 CustomSlider::ScaleInverse(float64 t) const
-{
-    if (mInverse)
-        return mInverse(t, mInverseData);
-    if (!mInverseExpr.IsEmpty()) {
-        mSymbols[SYM_Value] = t;
-        mSymbols[SYM_MinScale] = mMinScale;
-        mSymbols[SYM_MaxScale] = mMaxScale;
-        mSymbols[SYM_MinAllowed] = mMinAllowed;
-        mSymbols[SYM_MaxAllowed] = mMaxAllowed;
-        return mInverseParser->Evaluate();
-    }
-    return mExponent == 1.0 ? t : SignedPow(t, mExponent);
-}
-
-float64 CustomSlider::SegmentPixel(float64 v) const
-{
-    if (v == mCentre)
-        return mPixelCentre;
-    if (v < mCentre)
-        return mCentre == mMinScale ? mPixelMin
-                                    : mPixelMin + (mPixelCentre - mPixelMin) * (v - mMinScale) / (mCentre - mMinScale);
-    return mCentre == mMaxScale ? mPixelMax + 1
-                                : mPixelCentre + (mPixelMax - mPixelCentre) * (v - mCentre) / (mMaxScale - mCentre);
-}
-
-float64 CustomSlider::SegmentValue(float64 x) const
-{
-    if (x < mPixelCentre)
-        return mPixelCentre > mPixelMin
-                   ? mMinScale + (x - mPixelMin) * (mCentre - mMinScale) / (mPixelCentre - mPixelMin)
-                   : mCentre;
-    return mPixelMax > mPixelCentre ? mCentre + (x - mPixelCentre) * (mMaxScale - mCentre) / (mPixelMax - mPixelCentre)
-                                    : mCentre;
-}
-
-float64 CustomSlider::ValueToPixel(float64 value, float64 k) const
-{
-    if (mMaxScale == mMinScale)
-        return mPixelMin;
-    float64 x;
-    if (!mTwoSegment) {
-        float64 s = ScaleForward(value);
-        if (k != 1.0) {
-            const float64 anchor = ScaleForward(mScaleAnchor);
-            s = (s - anchor) / k + anchor;
-        }
-        const float64 s0 = ScaleForward(mMinScale), s1 = ScaleForward(mMaxScale);
-        x = s1 == s0 ? mPixelMin : mPixelMin + (mPixelMax - mPixelMin) * (s - s0) / (s1 - s0);
-    } else {
-        if (k != 1.0)
-            value = (value - mScaleAnchor) / k + mScaleAnchor;
-        x = SegmentPixel(value);
-    }
-    // A mapping that gives no number puts the knob at the start.
-    return std::isnan(x) ? mPixelMin : Clamp(x, mPixelMin, mPixelMax);
-}
-
-float64 CustomSlider::PixelToValue(float64 x, float64 k) const
-{
-    if (mTwoSegment) {
-        const float64 v = SegmentValue(x);
-        return k != 1.0 ? (v - mScaleAnchor) * k + mScaleAnchor : v;
-    }
-    const float64 s0 = ScaleForward(mMinScale), s1 = ScaleForward(mMaxScale);
-    const float64 span = mPixelMax - mPixelMin;
-    float64 t = span > 0.0 ? s0 + (x - mPixelMin) * (s1 - s0) / span : s0;
-    if (k != 1.0) {
-        const float64 anchor = ScaleForward(mScaleAnchor);
-        t = (t - anchor) * k + anchor;
-    }
-    return ScaleInverse(Clamp(t, std::min(s0, s1), std::max(s0, s1)));
-}
-
-float64 CustomSlider::Resolution(float64 value) const
-{
-    if (mMaxScale == mMinScale)
-        return 1.0;
-    if (mTwoSegment) {
-        const float64 xc = ValueToPixel(mCentre);
-        if (value < mCentre && mCentre != mMinScale)
-            return std::pow(10.0, std::ceil(std::log10(std::max(1.0, xc - mPixelMin))) -
-                                      std::floor(std::log10(mCentre - mMinScale)));
-        if (value > mCentre && mCentre != mMaxScale)
-            return std::pow(10.0, std::ceil(std::log10(std::max(1.0, mPixelMax - xc))) -
-                                      std::floor(std::log10(mMaxScale - mCentre)));
-        return 1.0;
-    }
-    float64 n = std::ceil(std::log10(std::max(1.0, mPixelMax - mPixelMin)));
-    if (mExponent != 1.0 || HasMapping() || !mInverseExpr.IsEmpty() || mInverse) {
-        const float64 p = std::floor(ValueToPixel(value) + 0.5);
-        const float64 q = p < mPixelMin + 1 ? p + 1 : p - 1;
-        const float64 apart = std::fabs(PixelToValue(p) - PixelToValue(q));
-        const float64 local = apart > 0.0 ? std::ceil(std::log10((mMaxScale - mMinScale) / apart)) : n + 2;
-        if (std::isfinite(local))
-            n = std::max(n, std::min(local, n + 2));
-    }
-    return std::pow(10.0, n - std::floor(std::log10(mMaxScale - mMinScale)));
+    mMapping.SetBounds({mMinScale, mMaxScale, mMinAllowed, mMaxAllowed, mCentre, mExponent});
+    return mMapping;
 }
 
 int32 CustomSlider::KnobX() const
@@ -366,9 +220,8 @@ void CustomSlider::SetTrackRect(const OrbRectT<int32> &rect)
     CustomController::SetTrackRect(rect);
     // The knob stays wholly on the track: its centre runs from half a knob
     // in from the left to half a knob in from the right.
-    mPixelMin = rect.x1 - mKnobRect.x1;
-    mPixelMax = std::max(mPixelMin, float64(rect.x2 - mKnobRect.x2 - (mKnobImage ? 0 : 1)));
-    mPixelCentre = (mPixelMin + mPixelMax) / 2.0;
+    const float64 pixelMin = rect.x1 - mKnobRect.x1;
+    mMapping.SetTrack(pixelMin, std::max(pixelMin, float64(rect.x2 - mKnobRect.x2 - (mKnobImage ? 0 : 1))));
 }
 
 void CustomSlider::OnSize(int32 width, int32 height)
@@ -385,23 +238,11 @@ bool CustomSlider::IsResetShown() const
     return HasDefault() && mResetHeight > 0 && std::fabs(mValue - mDefault) > ValueEpsilon;
 }
 
-float64 CustomSlider::RoundToStep(float64 value, float64 step) const
-{
-    return step > 0.0 ? std::trunc((value + step / 2.0) / step) * step : value;
-}
-
 float64 CustomSlider::MapValue(float64 value)
 {
     if (!mInteger || !mSnapToStep)
         return value;
-    if (!mTwoSegment)
-        return RoundToStep(value, mStepDown[STEP_Normal]);
-    const float64 atCentre = std::trunc(mCentre + 0.5);
-    if (value == mCentre)
-        return atCentre;
-    const bool below = value < mCentre;
-    const float64 mapped = RoundToStep(value, below ? mStepDown[STEP_Normal] : mStepUp[STEP_Normal]);
-    return (below ? mapped > mCentre : mapped < mCentre) ? atCentre : mapped;
+    return Mapping().SnapToStep(value, mStepDown[STEP_Normal], mStepUp[STEP_Normal]);
 }
 
 void CustomSlider::SetValue(float64 value, bool redraw)
@@ -430,17 +271,11 @@ float64 CustomSlider::StepSize(int32 direction, int32 level) const
 {
     level = Level(level);
     float64 step;
-    if (!HasMapping()) {
-        const bool above = mTwoSegment && (mValue > mCentre || (mValue == mCentre && direction > 0));
+    if (!mMapping.HasMapping()) {
+        const bool above = IsTwoSegment() && (mValue > mCentre || (mValue == mCentre && direction > 0));
         step = above ? mStepUp[level] : mStepDown[level];
     } else {
-        const float64 span = mPixelMax - mPixelMin;
-        const float64 x =
-            Clamp(ValueToPixel(mValue) + direction * std::pow(10.0, level - 3) * span, mPixelMin, mPixelMax);
-        float64 v = PixelToValue(x);
-        const float64 r = Resolution(v) / (level == STEP_Fine ? 0.1 : 1.0);
-        v = std::floor(r * v + 0.5) / r;
-        step = std::fabs(v - mValue);
+        step = Mapping().TrackStep(mValue, direction, level);
     }
     return mInteger && step < 1.0 ? 1.0 : step;
 }
@@ -448,7 +283,7 @@ float64 CustomSlider::StepSize(int32 direction, int32 level) const
 void CustomSlider::Step(int32 direction, int32 level)
 {
     float64 v = mValue + direction * StepSize(direction, level);
-    if (mTwoSegment) {
+    if (IsTwoSegment()) {
         if (direction < 0 && mValue > mCentre + CentreEpsilon && v < mCentre)
             v = mCentre;
         else if (direction > 0 && mValue < mCentre - CentreEpsilon && v > mCentre)

@@ -1,30 +1,26 @@
 #pragma once
 
 #include "widgets/CustomController.h"
+#include "widgets/SliderMapping.h"
 
-#include "orbane/OrbString.h"
 #include "orbane/ScriptVal.h"
 #include "orbane/TagList.h"
-
-#include <memory>
 
 class QMouseEvent;
 
 namespace Orbane {
 
 class Gradient;
-class Parser;
 
 // The inspector's horizontal number slider: a stretched track image with an
 // optional colour ramp, a knob at the value and a reset marker under the
-// track at the default. Value and pixel meet in ValueToPixel and
-// PixelToValue: a power mapping (or callbacks, or expressions) over the soft
-// range, or two linear segments split at the centre.
+// track at the default. Value and pixel meet in a SliderMapping, which the
+// slider keeps and feeds with its range.
 class CustomSlider : public CustomController
 {
     Q_OBJECT
 public:
-    using MapFunc = float64 (*)(float64 value, void *data);
+    using MapFunc = SliderMapping::MapFunc;
     enum StepLevel : int32
     {
         STEP_Fine = 0,
@@ -67,7 +63,7 @@ public:
     float64 GetStepDown(int32 level) const noexcept { return mStepDown[Level(level)]; }
     float64 GetStepUp(int32 level) const noexcept { return mStepUp[Level(level)]; }
     int32 GetTickCount() const noexcept { return mTickCount; }
-    bool IsTwoSegment() const noexcept { return mTwoSegment; }
+    bool IsTwoSegment() const noexcept { return mMapping.IsTwoSegment(); }
 
     // A colour ramp in the track; the second one paints the part right of
     // the centre. Each holds a reference.
@@ -80,25 +76,18 @@ public:
     // "minallowed" and "maxallowed". An expression that does not compile is
     // dropped (false); empty texts restore the power mapping.
     bool SetMappingExpressions(const char *forward, const char *inverse);
-    const OrbString &GetForwardExpression() const noexcept { return mForwardExpr; }
 
-    // The mapping, usable without painting. `k` scales about the anchor
-    // (0.1 for a fine drag).
-    float64 ScaleForward(float64 value) const;
-    float64 ScaleInverse(float64 t) const;
-    float64 ValueToPixel(float64 value, float64 k = 1.0) const;
-    float64 PixelToValue(float64 x, float64 k = 1.0) const;
-    // The power of ten a value is rounded by: one digit more than a pixel
-    // of track tells apart.
-    float64 Resolution(float64 value) const;
+    // The mapping with the slider's present range. `k` scales about the
+    // anchor (0.1 for a fine drag).
+    const SliderMapping &Mapping() const;
+    float64 ValueToPixel(float64 value, float64 k = 1.0) const { return Mapping().ValueToPixel(value, k); }
+    float64 PixelToValue(float64 x, float64 k = 1.0) const { return Mapping().PixelToValue(x, k); }
+    float64 Resolution(float64 value) const { return Mapping().Resolution(value); }
     // The step one key press of `level` makes from the current value.
     float64 StepSize(int32 direction, int32 level) const;
     void Step(int32 direction, int32 level);
 
-    float64 PixelMin() const noexcept { return mPixelMin; }
-    float64 PixelMax() const noexcept { return mPixelMax; }
-    float64 PixelCentre() const noexcept { return mPixelCentre; }
-    float64 GetScaleAnchor() const noexcept { return mScaleAnchor; }
+    float64 GetScaleAnchor() const noexcept { return mMapping.GetAnchor(); }
     // The knob's column: the value's pixel rounded.
     int32 KnobX() const;
     bool IsDragging() const noexcept { return mDragKnob; }
@@ -127,10 +116,6 @@ protected:
 
 private:
     static int32 Level(int32 level) noexcept { return level < 0 ? 0 : level > 2 ? 2 : level; }
-    bool HasMapping() const noexcept;
-    float64 SegmentPixel(float64 value) const;
-    float64 SegmentValue(float64 x) const;
-    float64 RoundToStep(float64 value, float64 step) const;
     QRect KnobHitRect() const;
     QRect ResetHitRect() const;
     bool OnTrackRows(int32 y) const;
@@ -154,7 +139,6 @@ private:
     bool mRepeating = false;
     int32 mTimerId = 0;
     int32 mRepeatCount = 0;
-    float64 mScaleAnchor = 0.0;
     bool mDragKnob = false;
     bool mPageDown = false;
     bool mPageUp = false;
@@ -165,27 +149,17 @@ private:
     bool mFirstChange = false;
     float64 mStepDown[3] = {1.0, 1.0, 1.0};
     float64 mStepUp[3] = {1.0, 1.0, 1.0};
-    bool mTwoSegment = false;
     bool mFineKey = false;
     bool mCoarseKey = false;
     float64 mPressValue = 0.0;
     int32 mLastKnobX = -1;
-    float64 mPixelMin = 0.0;
-    float64 mPixelMax = 0.0;
-    float64 mPixelCentre = 0.0;
     bool mHoverKnob = false;
     bool mHoverTrack = false;
     bool mHoverReset = false;
-    MapFunc mForward = nullptr;
-    void *mForwardData = nullptr;
-    MapFunc mInverse = nullptr;
-    void *mInverseData = nullptr;
-    OrbString mForwardExpr;
-    OrbString mInverseExpr;
-    std::unique_ptr<Parser> mForwardParser;
-    std::unique_ptr<Parser> mInverseParser;
-    // The expressions' variables, bound by name in both parsers.
-    mutable float64 mSymbols[5] = {};
+    // Track pixels, two-segment switch, scale anchor and the custom
+    // mappings. Its range is copied from the value fields at each use, so
+    // that no setter of the base (SetExponent) can leave it behind.
+    mutable SliderMapping mMapping;
     Gradient *mGradient = nullptr;
     Gradient *mGradient2 = nullptr;
     int32 mColorSpace = 0;

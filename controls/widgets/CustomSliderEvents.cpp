@@ -86,7 +86,7 @@ void CustomSlider::mousePressEvent(QMouseEvent *event)
     if (KnobHitRect().contains(x, y)) {
         mDragKnob = mFirstChange = true;
         mLastX = x;
-        mScaleAnchor = mValue;
+        mMapping.SetAnchor(mValue);
         mGrabOffset = x - ValueToPixel(mValue);
         MoveHandler(x, y, event->modifiers());
         Redraw(true);
@@ -135,23 +135,8 @@ void CustomSlider::MoveHandler(int32 x, int32 y, Qt::KeyboardModifiers modifiers
 
 void CustomSlider::DragTo(int32 x, float64 k)
 {
-    const float64 offset = x - mGrabOffset;
-    float64 v = PixelToValue(offset, k);
-    const float64 tol = 0.5 * k;
-    bool snapped = false;
-    // Within half a pixel the knob snaps back to where it started, then to
-    // the default; a snapped value is kept exactly as it is.
-    if (std::fabs(ValueToPixel(v, k) - offset) <= tol) {
-        if (std::fabs(ValueToPixel(v) - ValueToPixel(mPressValue)) <= tol)
-            v = mPressValue, snapped = true;
-        else if (HasDefault() && std::fabs(ValueToPixel(v) - ValueToPixel(mDefault)) <= tol)
-            v = mDefault, snapped = true;
-    }
-    if (!snapped) {
-        const float64 r = Resolution(v) / k;
-        v = std::floor(r * v + 0.5) / r;
-    }
-    v = Clamp(v, mMinScale, mMaxScale);
+    const std::optional<float64> def = HasDefault() ? std::optional<float64>(mDefault) : std::nullopt;
+    const float64 v = Mapping().DragValue(x - mGrabOffset, k, mPressValue, def);
     update();
     SetSliderValue(v);
 }
@@ -254,7 +239,7 @@ void CustomSlider::ReAnchor()
 {
     // The scaling changes under the cursor: restart it from where the knob
     // is, so the knob stays under the cursor.
-    mScaleAnchor = mValue;
+    mMapping.SetAnchor(mValue);
     mGrabOffset = mLastX - ValueToPixel(mValue);
 }
 
@@ -308,7 +293,7 @@ void CustomSlider::keyReleaseEvent(QKeyEvent *event)
 
 void CustomSlider::OnEditStartDrag(TimeCodeEdit *)
 {
-    mScaleAnchor = mValue;
+    mMapping.SetAnchor(mValue);
     mFirstChange = true;
     OwnerAutoProxy(true);
 }
@@ -320,11 +305,12 @@ void CustomSlider::OnEditDrag(float64 dist, TimeCodeEdit *edit)
     if (!(range > 0.0))
         range = mMaxScale - mMinScale;
     const float64 unit = range > 0.0 ? std::pow(10.0, std::floor(std::log10(range)) - 3) : 0.001;
-    const float64 wanted = mScaleAnchor + unit * dist;
+    const float64 anchor = mMapping.GetAnchor();
+    const float64 wanted = anchor + unit * dist;
     const float64 v = Clamp(wanted, mMinScale, mMaxScale);
     SetSliderValue(v);
     if (v != wanted && edit)
-        edit->SetDragDistance((v - mScaleAnchor) / unit);
+        edit->SetDragDistance((v - anchor) / unit);
 }
 
 void CustomSlider::OnEditEndDrag(TimeCodeEdit *)
@@ -363,10 +349,10 @@ void CustomSlider::PaintTrack(QPainter &painter, int32 knobY)
     key.serials[1] = mGradient2 ? mGradient2->Serial() : 0;
     key.spaces[0] = mColorSpace;
     key.spaces[1] = mColorSpace2;
-    key.from = int32(mPixelMin) + mKnobRect.x1 - 1;
-    key.to = int32(mPixelMax) + mKnobRect.x2;
-    key.centre = int32(mPixelCentre);
-    key.twoSegment = mTwoSegment;
+    key.from = int32(mMapping.PixelMin()) + mKnobRect.x1 - 1;
+    key.to = int32(mMapping.PixelMax()) + mKnobRect.x2;
+    key.centre = int32(mMapping.PixelCentre());
+    key.twoSegment = IsTwoSegment();
     if (!mTrack || !(key == mTrackKey)) {
         StoreImage(mTrack, nullptr);
         mTrack = new DIB(key.width, image->Height(), key.ratio);
@@ -389,8 +375,8 @@ void CustomSlider::PaintGradient(DIB &track)
     if (w < 3 || h < 3)
         return;
     const int32 from = std::max(1, mTrackKey.from), to = std::min(w - 2, mTrackKey.to);
-    const int32 split = int32(mPixelCentre);
-    const bool halves = mTwoSegment && mGradient2;
+    const int32 split = int32(mMapping.PixelCentre());
+    const bool halves = IsTwoSegment() && mGradient2;
     QPainter painter(&track.GetImage());
     for (int32 i = from; i <= to; ++i) {
         const bool right = halves && i >= split;

@@ -124,7 +124,6 @@ private slots:
     void typedValues_data();
     void typedValues();
     void typingKeepsEditBox();
-    void typedExpression();
     void gradientTrack();
 };
 
@@ -148,15 +147,9 @@ void SliderControlTest::drags_data()
     using Path = QList<int>;
     // 0..1 over 200 pixels: 0.005 a pixel, shown to three places.
     QTest::newRow("plain right") << Range(0, 1) << 0.5 << Path{10, 20} << none << 0.6 << 1;
-    QTest::newRow("ctrl ten times slower, one more place") << Range(0, 1) << 0.5 << Path{3} << ctrl << 0.5015 << 1;
-    QTest::newRow("clamped at the high end") << Range(0, 1) << 0.5 << Path{300} << none << 1.0 << 1;
     // Back within half a pixel: exactly the press value, and no undo step.
     QTest::newRow("back to the press value") << Range(0, 1) << 0.123456 << Path{10, 0} << none << 0.123456 << 0;
-    // 0.25 is 50 pixels left of 0.5; the default 0.2523 lies 0.46 pixels away.
-    const TagList withDefault = Range(0, 1, {{kDefault, 0.2523}});
-    QTest::newRow("onto the default") << withDefault << 0.5 << Path{-25, -50} << none << 0.2523 << 1;
-    QTest::newRow("past the default") << withDefault << 0.5 << Path{-25, -51} << none << 0.245 << 1;
-    QTest::newRow("Alt-click resets") << withDefault << 0.5 << Path{0} << alt << 0.2523 << 1;
+    QTest::newRow("Alt-click resets") << Range(0, 1, {{kDefault, 0.2523}}) << 0.5 << Path{0} << alt << 0.2523 << 1;
     QTest::newRow("Alt-click without a default tag: 0") << Range(-1, 1) << 0.5 << Path{0} << alt << 0.0 << 1;
     QTest::newRow("places 2: 0.127 writes 0.13")
         << Range(0, 0.2, {{kPlaces, 2}}) << 0.1 << Path{27} << none << 0.13 << 1;
@@ -164,9 +157,10 @@ void SliderControlTest::drags_data()
         << Range(0, 0.2, {{kPlaces, -1}}) << 0.1 << Path{23} << none << 0.123 << 1;
     QTest::newRow("places 2: less than a step writes nothing")
         << Range(0, 1, {{kPlaces, 2}}) << 0.5 << Path{3} << ctrl << 0.5 << 0;
-    // Integer snapping adds a half, then truncates toward zero.
+    // Integer snapping adds a half, then truncates toward zero; it needs both tags.
     QTest::newRow("integer snap: -2.7 stored as -2")
         << Range(-10, 10, {{kInteger, 1}, {kSnap, 1}}) << 0.0 << Path{-27} << none << -2.0 << 1;
+    QTest::newRow("snap without integer") << Range(-10, 10, {{kSnap, 1}}) << 0.0 << Path{-27} << none << -2.7 << 1;
     // The track fraction is the value squared: half way along it is sqrt(0.5).
     QTest::newRow("expression mapping") << Range(0, 1, {{kForwardExpr, "value^2"}, {kInverseExpr, "sqrt(value)"}})
                                         << 0.0 << Path{100} << none << 0.707 << 1;
@@ -208,8 +202,6 @@ void SliderControlTest::keys_data()
     // From 0.5 on 0..1 with 100 steps (normal 0.01, fine 0.001) and 11 ticks (coarse 0.1).
     QTest::newRow("Home") << int(Qt::Key_Home) << none << 0 << 0.0;
     QTest::newRow("End") << int(Qt::Key_End) << none << 0 << 1.0;
-    QTest::newRow("Right") << int(Qt::Key_Right) << none << 0 << 0.51;
-    QTest::newRow("Page Down") << int(Qt::Key_PageDown) << none << 0 << 0.49;
     QTest::newRow("Shift+Page Up coarse") << int(Qt::Key_PageUp) << shift << 0 << 0.6;
     QTest::newRow("Ctrl+Page Down fine") << int(Qt::Key_PageDown) << ctrl << 0 << 0.499;
     QTest::newRow("Right held, 4 repeats") << int(Qt::Key_Right) << none << 4 << 0.55;
@@ -310,8 +302,10 @@ void SliderControlTest::typedValues_data()
     QTest::newRow("places -1: step 1e-7") << Range(0, 1, {{kPlaces, -1}}) << "0.12345678" << 0.1234568 << "0.123457";
     QTest::newRow("time code") << Range(0, 480, {{kTimeDisplay, 1}, {kPlaces, 0}}) << "00:00:02:06" << 54.0
                                << "00:00:02:06";
+    QTest::newRow("expression") << Range(0, 2, {{kPlaces, 3}}) << "= value * 2 + 0.1" << 1.1 << "1.100";
 }
 
+// What is typed is one undo step; undo shows the value before it again.
 void SliderControlTest::typedValues()
 {
     QFETCH(TagList, attrs);
@@ -321,11 +315,17 @@ void SliderControlTest::typedValues()
     ToolFixture f;
     Input *in = f.AddNumber("Blend", 0.5, attrs);
     InputControl *c = Slider(f, in);
+    const QString before = EditOf(c)->text();
     Type(EditOf(c), typed);
     QTest::keyClick(EditOf(c), Qt::Key_Return);
     QCOMPARE(f.NumberOf(in), written);
     QCOMPARE(EditOf(c)->text(), shown);
+    if (typed.startsWith('='))
+        QCOMPARE(QString::fromStdString(c->GetExpressionData(0).str()), typed.mid(2));
     QCOMPARE(f.doc.UndoNames(), QStringList{"Change Blend"});
+    f.doc.Undo();
+    QCOMPARE(f.NumberOf(in), 0.5);
+    QCOMPARE(EditOf(c)->text(), before);
 }
 
 // A value that arrives while the user types leaves the text alone; Enter
@@ -347,22 +347,6 @@ void SliderControlTest::typingKeepsEditBox()
     QCOMPARE(edit->text(), QString("0.700"));
     in->SetValue(AutoNumber(0.4), f.doc.GetCurrentTime());
     QCOMPARE(edit->text(), QString("0.400"));
-}
-
-void SliderControlTest::typedExpression()
-{
-    ToolFixture f;
-    Input *in = f.AddNumber("Blend", 0.25, Range(0, 1, {{kPlaces, 3}}));
-    InputControl *c = Slider(f, in);
-    Type(EditOf(c), "= value * 2 + 0.1");
-    QTest::keyClick(EditOf(c), Qt::Key_Return);
-    QCOMPARE(f.NumberOf(in), 0.6);
-    QCOMPARE(QString::fromStdString(c->GetExpressionData(0).str()), QString("value * 2 + 0.1"));
-    QCOMPARE(EditOf(c)->text(), QString("0.600"));
-    QCOMPARE(f.doc.UndoNames().size(), 1);
-    f.doc.Undo();
-    QCOMPARE(f.NumberOf(in), 0.25);
-    QCOMPARE(EditOf(c)->text(), QString("0.250"));
 }
 
 // The ramp once painted no colour until a resize.

@@ -2,6 +2,7 @@
 
 #include "WidgetTestSupport.h"
 
+#include "orbane/AutoRef.h"
 #include "orbane/DIB.h"
 #include "orbane/Gradient.h"
 #include "orbane/TimeCodeEdit.h"
@@ -9,85 +10,11 @@
 #include <QPaintEvent>
 #include <QtTest>
 
-#include <cmath>
-#include <functional>
-
 using namespace Orbane;
 
 namespace {
 
-// The mappings the tables name. Two segments have their centre at 1; a
-// centre at the range's start keeps the track linear.
-void Apply(CustomSlider *slider, const QByteArray &mode)
-{
-    static const QHash<QByteArray, std::function<void(CustomSlider *)>> mappings{
-        {"linear", [](CustomSlider *) {}},
-        {"exponent 2", [](CustomSlider *s) { s->SetExponent(2.0); }},
-        {"two segments", [](CustomSlider *s) { s->SetCentre(1.0); }},
-        {"centre at an end", [](CustomSlider *s) { s->SetCentre(s->GetMinScale()); }},
-        {"cube callbacks",
-         [](CustomSlider *s) {
-             s->SetMappingCallbacks([](double v, void *) { return v * v * v; }, nullptr,
-                                    [](double t, void *) { return std::cbrt(t); }, nullptr);
-         }},
-        {"square expressions",
-         [](CustomSlider *s) { QVERIFY(s->SetMappingExpressions("value*value", "sqrt(value)")); }},
-        {"expressions with variables",
-         [](CustomSlider *s) {
-             QVERIFY(s->SetMappingExpressions("(value-minscale)/(maxscale-minscale)",
-                                              "minscale+value*(maxscale-minscale)"));
-         }},
-        {"steep callbacks",
-         [](CustomSlider *s) {
-             s->SetMappingCallbacks([](double v, void *) { return std::pow(v, 10.0); }, nullptr,
-                                    [](double t, void *) { return std::pow(t, 0.1); }, nullptr);
-         }},
-        {"steep expressions", [](CustomSlider *s) { QVERIFY(s->SetMappingExpressions("value^10", "value^0.1")); }},
-        {"steepest expressions",
-         [](CustomSlider *s) { QVERIFY(s->SetMappingExpressions("value^1000", "value^0.001")); }},
-    };
-    QVERIFY(mappings.contains(mode));
-    mappings.value(mode)(slider);
-}
-
-void AddMappingColumns()
-{
-    QTest::addColumn<QByteArray>("mode");
-    QTest::addColumn<double>("min");
-    QTest::addColumn<double>("max");
-}
-
 const QColor kKnob(200, 200, 200), kHeld(240, 160, 60), kMarker(150, 150, 150);
-
-// A slider whose track runs from pixel 5 to pixel 205 (an 11-pixel knob on a
-// 211-pixel widget): 200 pixels for the soft range.
-struct SliderFixture
-{
-    static constexpr int Width = 211, Height = 24;
-
-    CustomSlider *slider;
-    DIB *knob = new DIB(11, 14), *held = new DIB(11, 14), *marker = new DIB(7, 5);
-
-    explicit SliderFixture(double min = 0.0, double max = 1.0, CustomSlider *s = new CustomSlider) : slider(s)
-    {
-        knob->Fill(kKnob);
-        held->Fill(kHeld);
-        marker->Fill(kMarker);
-        slider->SetKnobImage(knob, held);
-        slider->SetResetImage(marker);
-        slider->SetAllowedRange(min, max, false);
-        slider->SetScale(min, max, false);
-        slider->SetRange(min, max);
-        slider->SetTrackRect(OrbRectT<int32>(0, 0, Width, Height));
-        slider->resize(Width, Height);
-    }
-    ~SliderFixture()
-    {
-        delete slider;
-        for (DIB *dib : {knob, held, marker})
-            dib->Recycle();
-    }
-};
 
 // A mouse move with modifiers and the button held, which QTest::mouseMove
 // cannot send.
@@ -126,37 +53,53 @@ protected:
     }
 };
 
-// A slider shown in its owner, range 0..1 over 200 pixels (0.005 a pixel),
-// with spies on its signals.
+// A slider shown in its owner, with spies on its signals. Its track runs
+// from pixel 5 to pixel 205 (an 11-pixel knob on a 211-pixel widget): the
+// range 0..1 is 0.005 a pixel.
 struct Shown
 {
+    static constexpr int Width = 211, Height = 24;
+
     TestOwner owner;
-    SliderFixture f;
+    DIB *knob = new DIB(11, 14), *held = new DIB(11, 14), *marker = new DIB(7, 5);
     CustomSlider *s;
     QSignalSpy valueChanged, drag, pressed;
 
     explicit Shown(double min = 0.0, double max = 1.0, CustomSlider *slider = new CustomSlider)
-        : f(min, max, slider), s(slider), valueChanged(s, SIGNAL(ValueChanged(float64))),
+        : s(slider), valueChanged(s, SIGNAL(ValueChanged(float64))),
           drag(s, SIGNAL(dragSlider(CustomController *, int))), pressed(s, SIGNAL(Pressed(CustomController *)))
     {
+        knob->Fill(kKnob);
+        held->Fill(kHeld);
+        marker->Fill(kMarker);
+        s->SetKnobImage(knob, held);
+        s->SetResetImage(marker);
+        s->SetAllowedRange(min, max, false);
+        s->SetScale(min, max, false);
+        s->SetRange(min, max);
+        s->SetTrackRect(OrbRectT<int32>(0, 0, Width, Height));
+        s->resize(Width, Height);
         s->setParent(&owner);
         s->SetOwner(&owner);
-        owner.resize(SliderFixture::Width, SliderFixture::Height);
+        owner.resize(Width, Height);
         owner.show();
         QVERIFY(QTest::qWaitForWindowExposed(&owner));
         QApplication::setActiveWindow(&owner);
         s->setFocus();
         owner.resetUndos = 0;
     }
-    ~Shown() { s->setParent(nullptr); }
+    ~Shown()
+    {
+        s->setParent(nullptr);
+        delete s;
+        for (DIB *dib : {knob, held, marker})
+            dib->Recycle();
+    }
 
     // The row through the middle of the knob, and the reset marker's row.
     int KnobY() const { return s->GetTrackRect().y1 + s->GetKnobTop() + 7; }
     QPoint At(int x) const { return QPoint(x, KnobY()); }
     QPoint Marker(int x) const { return QPoint(x, s->GetTrackRect().y1 + s->GetResetTop() + 2); }
-    void Press(int x, Qt::KeyboardModifiers m = Qt::NoModifier) { QTest::mousePress(s, Qt::LeftButton, m, At(x)); }
-    void Move(int x, Qt::KeyboardModifiers m = Qt::NoModifier) { MoveMouse(s, At(x), m); }
-    void Release(int x, Qt::KeyboardModifiers m = Qt::NoModifier) { QTest::mouseRelease(s, Qt::LeftButton, m, At(x)); }
     void Key(Qt::Key key, Qt::KeyboardModifiers m = Qt::NoModifier) { QTest::keyClick(s, key, m); }
     QColor Pixel(int x, int y) const
     {
@@ -168,6 +111,29 @@ struct Shown
     // The "first of a gesture" flag of each drag signal.
     QList<int> Firsts() const { return Column<int>(drag, 1); }
 };
+
+// One step of a gesture: "press X", "move X" or "release X" on the knob's
+// row, or on the marker's row after "marker", with "ctrl" at the end for the
+// Control key held; "ctrl down" and "ctrl up" press and let go of it.
+void Run(Shown &w, const QString &step)
+{
+    if (step == "ctrl down")
+        return QTest::keyPress(w.s, Qt::Key_Control, Qt::ControlModifier);
+    if (step == "ctrl up")
+        return QTest::keyRelease(w.s, Qt::Key_Control);
+    QStringList words = step.split(' ');
+    const bool marker = words.first() == "marker";
+    if (marker)
+        words.removeFirst();
+    const Qt::KeyboardModifiers m(words.last() == "ctrl" ? Qt::ControlModifier : Qt::NoModifier);
+    const QPoint at = marker ? w.Marker(words[1].toInt()) : w.At(words[1].toInt());
+    if (words[0] == "press")
+        QTest::mousePress(w.s, Qt::LeftButton, m, at);
+    else if (words[0] == "move")
+        MoveMouse(w.s, at, m);
+    else
+        QTest::mouseRelease(w.s, Qt::LeftButton, m, at);
+}
 
 bool Close(const QColor &a, const QColor &b, int tol = 3)
 {
@@ -188,188 +154,39 @@ class CustomSliderTest : public QObject
 {
     Q_OBJECT
 private slots:
-    void valueToPixel_data();
-    void valueToPixel();
-    void fineScaling();
-    void flatRange();
-    void resolution_data();
-    void resolution();
-    void badExpressionIsDropped();
-    void mapValue_data();
-    void mapValue();
     void scaleRange();
     void steps_data();
     void steps();
-    void knobKeepsItsGrabPoint();
-    void ctrlChangeReAnchors_data();
-    void ctrlChangeReAnchors();
+    void gestures_data();
+    void gestures();
     void keySteps();
-    void markerClickResets();
-    void trackPressPages_data();
-    void trackPressPages();
     void dragDrivesDocument();
     void editDrag();
     void knobAndMarkerDrawn();
     void knobStates();
     void gradientPaintsTrack();
-    void secondGradientRightOfCentre();
     void repaintsOnlyWhatChanged();
 };
-
-// Value to pixel at one point, and pixel to value and back along the track.
-void CustomSliderTest::valueToPixel_data()
-{
-    AddMappingColumns();
-    QTest::addColumn<double>("value");
-    QTest::addColumn<double>("pixel");
-    QTest::newRow("linear") << QByteArray("linear") << 0.0 << 1.0 << 0.5 << 105.0;
-    QTest::newRow("below clamps") << QByteArray("linear") << 0.0 << 1.0 << -3.0 << 5.0;
-    QTest::newRow("above clamps") << QByteArray("linear") << 0.0 << 1.0 << 9.0 << 205.0;
-    QTest::newRow("negative range") << QByteArray("linear") << -10.0 << -5.0 << -6.0 << 165.0;
-    QTest::newRow("exponent 2") << QByteArray("exponent 2") << 0.0 << 1.0 << 0.25 << 105.0;
-    QTest::newRow("exponent 2 about zero") << QByteArray("exponent 2") << -1.0 << 1.0 << -0.25 << 55.0;
-    QTest::newRow("callback") << QByteArray("cube callbacks") << -2.0 << 2.0 << 1.0 << 117.5;
-    QTest::newRow("expression") << QByteArray("square expressions") << 0.0 << 2.0 << 1.0 << 55.0;
-    QTest::newRow("expression with variables") << QByteArray("expressions with variables") << 2.0 << 6.0 << 3.0 << 55.0;
-    QTest::newRow("two segments below") << QByteArray("two segments") << 0.0 << 10.0 << 0.5 << 55.0;
-    QTest::newRow("two segments centre") << QByteArray("two segments") << 0.0 << 10.0 << 1.0 << 105.0;
-    QTest::newRow("two segments above") << QByteArray("two segments") << 0.0 << 10.0 << 5.5 << 155.0;
-    QTest::newRow("centre at an end is linear") << QByteArray("centre at an end") << 0.0 << 10.0 << 5.0 << 105.0;
-}
-
-void CustomSliderTest::valueToPixel()
-{
-    QFETCH(QByteArray, mode);
-    QFETCH(double, min);
-    QFETCH(double, max);
-    QFETCH(double, value);
-    QFETCH(double, pixel);
-    SliderFixture f(min, max);
-    Apply(f.slider, mode);
-    QVERIFY(qAbs(f.slider->ValueToPixel(value) - pixel) < 1e-9);
-    for (double x = 5.0; x <= 205.0; x += 2.5) {
-        const double v = f.slider->PixelToValue(x);
-        QVERIFY(v >= min - 1e-9 && v <= max + 1e-9);
-        QVERIFY2(qAbs(f.slider->ValueToPixel(v) - x) < 1e-6, qPrintable(QString::number(x)));
-    }
-    // Beyond the track the value stops at the range's ends.
-    if (mode != "two segments") {
-        QVERIFY(qAbs(f.slider->PixelToValue(-50.0) - min) < 1e-9);
-        QVERIFY(qAbs(f.slider->PixelToValue(400.0) - max) < 1e-9);
-    }
-}
-
-// A scale below 1 stretches the track about the anchor (0 here).
-void CustomSliderTest::fineScaling()
-{
-    SliderFixture f;
-    QCOMPARE(f.slider->ValueToPixel(0.01, 0.1), 25.0);
-    QVERIFY(qAbs(f.slider->PixelToValue(25.0, 0.1) - 0.01) < 1e-12);
-    f.slider->SetCentre(0.5);
-    QVERIFY(qAbs(f.slider->ValueToPixel(0.01, 0.1) - 25.0) < 1e-9);
-    QVERIFY(qAbs(f.slider->PixelToValue(25.0, 0.1) - 0.01) < 1e-12);
-}
-
-void CustomSliderTest::flatRange()
-{
-    SliderFixture f(2.0, 2.0);
-    QCOMPARE(f.slider->ValueToPixel(-5.0), 5.0);
-    QCOMPARE(f.slider->ValueToPixel(7.0), 5.0);
-    QCOMPARE(f.slider->Resolution(2.0), 1.0);
-}
-
-void CustomSliderTest::resolution_data()
-{
-    AddMappingColumns();
-    QTest::addColumn<double>("value");
-    QTest::addColumn<double>("resolution");
-    // 200 pixels need three digits across the range.
-    QTest::newRow("unit range") << QByteArray("linear") << 0.0 << 1.0 << 0.3 << 1000.0;
-    QTest::newRow("hundred") << QByteArray("linear") << 0.0 << 100.0 << 30.0 << 10.0;
-    QTest::newRow("exponent, steep end") << QByteArray("exponent 2") << 0.0 << 1.0 << 0.0001 << 1e5;
-    QTest::newRow("exponent, flat end") << QByteArray("exponent 2") << 0.0 << 1.0 << 1.0 << 1000.0;
-    // A steep mapping needs more digits where a pixel covers less of the
-    // range, never more than two beyond the linear case.
-    QTest::newRow("callback, steep end") << QByteArray("steep callbacks") << 0.0 << 1.0 << 1.0 << 1e4;
-    QTest::newRow("callback, flat end") << QByteArray("steep callbacks") << 0.0 << 1.0 << 0.5 << 1000.0;
-    QTest::newRow("expression, steep end") << QByteArray("steep expressions") << 0.0 << 1.0 << 1.0 << 1e4;
-    QTest::newRow("expression, capped") << QByteArray("steepest expressions") << 0.0 << 1.0 << 1.0 << 1e5;
-    QTest::newRow("two segments below") << QByteArray("two segments") << 0.0 << 10.0 << 0.5 << 100.0;
-    QTest::newRow("two segments above") << QByteArray("two segments") << 0.0 << 10.0 << 5.0 << 100.0;
-    QTest::newRow("two segments at centre") << QByteArray("two segments") << 0.0 << 10.0 << 1.0 << 1.0;
-}
-
-void CustomSliderTest::resolution()
-{
-    QFETCH(QByteArray, mode);
-    QFETCH(double, min);
-    QFETCH(double, max);
-    QFETCH(double, value);
-    QFETCH(double, resolution);
-    SliderFixture f(min, max);
-    Apply(f.slider, mode);
-    QCOMPARE(f.slider->Resolution(value), resolution);
-}
-
-void CustomSliderTest::badExpressionIsDropped()
-{
-    SliderFixture f;
-    QVERIFY(!f.slider->SetMappingExpressions("value*", "value"));
-    QVERIFY(f.slider->GetForwardExpression().IsEmpty());
-    QVERIFY(!f.slider->SetMappingExpressions("nosuchvar", ""));
-    QCOMPARE(f.slider->ValueToPixel(0.5), 105.0);
-}
-
-void CustomSliderTest::mapValue_data()
-{
-    QTest::addColumn<bool>("integer");
-    QTest::addColumn<bool>("snap");
-    QTest::addColumn<double>("centre");
-    QTest::addColumn<double>("stepDown");
-    QTest::addColumn<double>("value");
-    QTest::addColumn<double>("mapped");
-    const double linear = -100.0; // no centre inside the range
-    QTest::newRow("truncates toward zero") << true << true << linear << 1.0 << -2.7 << -2.0;
-    QTest::newRow("step of five") << true << true << linear << 5.0 << 8.0 << 10.0;
-    QTest::newRow("negative step of five") << true << true << linear << 5.0 << -7.0 << 0.0;
-    QTest::newRow("snap alone keeps value") << false << true << linear << 1.0 << -2.7 << -2.7;
-    QTest::newRow("below the centre") << true << true << 2.4 << 1.0 << 1.2 << 1.0;
-    QTest::newRow("crossing the centre") << true << true << 2.4 << 4.0 << 2.3 << 2.0;
-}
-
-void CustomSliderTest::mapValue()
-{
-    QFETCH(bool, integer);
-    QFETCH(bool, snap);
-    QFETCH(double, centre);
-    QFETCH(double, stepDown);
-    QFETCH(double, value);
-    QFETCH(double, mapped);
-    SliderFixture f(-10.0, 10.0);
-    if (centre > -10.0)
-        f.slider->SetCentre(centre);
-    f.slider->SetInteger(integer);
-    f.slider->SetSnapToStep(snap);
-    f.slider->SetStepsDown(0.1, stepDown, 5.0);
-    QCOMPARE(f.slider->MapValue(value), mapped);
-}
 
 // SetRange orders its ends and clamps value and centre into them; where an
 // end stays, the scale the user set at that end is kept.
 void CustomSliderTest::scaleRange()
 {
-    SliderFixture f(-100.0, 100.0);
-    f.slider->SetValue(50.0, false);
-    f.slider->SetCentre(-60.0);
-    f.slider->SetRange(10.0, -10.0);
-    QCOMPARE(f.slider->GetMinScale(), -10.0);
-    QCOMPARE(f.slider->GetMaxScale(), 10.0);
-    QCOMPARE(f.slider->GetValue(), 10.0);
-    QCOMPARE(f.slider->GetCentre(), -10.0);
-    f.slider->SetScale(-20.0, 20.0, false);
-    f.slider->SetRange(-10.0, 50.0);
-    QCOMPARE(f.slider->GetMinScale(), -20.0);
-    QCOMPARE(f.slider->GetMaxScale(), 50.0);
+    Shown w(-100.0, 100.0);
+    w.s->SetValue(50.0, false);
+    w.s->SetCentre(-60.0);
+    w.s->SetRange(10.0, -10.0);
+    QCOMPARE(w.s->GetMinScale(), -10.0);
+    QCOMPARE(w.s->GetMaxScale(), 10.0);
+    QCOMPARE(w.s->GetValue(), 10.0);
+    QCOMPARE(w.s->GetCentre(), -10.0);
+    // A centre at an end of the range leaves the track linear.
+    w.s->SetCentre(-10.0);
+    QVERIFY(!w.s->IsTwoSegment());
+    w.s->SetScale(-20.0, 20.0, false);
+    w.s->SetRange(-10.0, 50.0);
+    QCOMPARE(w.s->GetMinScale(), -20.0);
+    QCOMPARE(w.s->GetMaxScale(), 50.0);
 }
 
 // Step and tick counts divide each side of the centre; one tick counts as two.
@@ -391,73 +208,68 @@ void CustomSliderTest::steps()
     QFETCH(int, stepCount);
     QFETCH(int, tickCount);
     QFETCH(QList<double>, expected);
-    SliderFixture f(0.0, 8.0);
+    Shown w(0.0, 8.0);
     if (centre >= 0.0)
-        f.slider->SetCentre(centre);
-    f.slider->SetStepCount(stepCount);
-    f.slider->SetTickCount(tickCount);
+        w.s->SetCentre(centre);
+    w.s->SetStepCount(stepCount);
+    w.s->SetTickCount(tickCount);
     const auto normal = CustomSlider::STEP_Normal, coarse = CustomSlider::STEP_Coarse;
-    QCOMPARE(QList<double>({f.slider->GetStepDown(normal), f.slider->GetStepUp(normal), f.slider->GetStepDown(coarse),
-                            f.slider->GetStepUp(coarse)}),
+    QCOMPARE(QList<double>(
+                 {w.s->GetStepDown(normal), w.s->GetStepUp(normal), w.s->GetStepDown(coarse), w.s->GetStepUp(coarse)}),
              expected);
 }
 
-// A press off the knob's centre moves nothing; the drag then moves the value
-// by the pixels the mouse travels, as one gesture.
-void CustomSliderTest::knobKeepsItsGrabPoint()
+// Mouse gestures on a slider with the default 0.3 (its marker at x 65) and
+// the steps 0.01, 0.1 and 0.25: the values signalled; the first change of a
+// gesture says so; every release closes the owner's undo step.
+void CustomSliderTest::gestures_data()
 {
+    QTest::addColumn<double>("start");
+    QTest::addColumn<QStringList>("steps");
+    QTest::addColumn<QList<double>>("values");
+    using Steps = QStringList;
+    using Values = QList<double>;
+    // The knob of 0.123456 is at x 30: a press at 33 keeps the 3 pixels.
+    QTest::newRow("press off the knob's centre")
+        << 0.123456 << Steps{"press 33", "move 33", "move 53", "move 73", "release 73"} << Values{0.223, 0.323};
+    // A change of Ctrl re-anchors at the current value, the knob under the cursor.
+    QTest::newRow("Ctrl let go") << 0.5 << Steps{"press 105", "move 155 ctrl", "ctrl up", "move 165", "release 165"}
+                                 << Values{0.525, 0.575};
+    QTest::newRow("Ctrl pressed") << 0.5
+                                  << Steps{"press 105", "move 155", "ctrl down", "move 165 ctrl", "release 165 ctrl"}
+                                  << Values{0.75, 0.755};
+    QTest::newRow("marker let go elsewhere") << 0.8 << Steps{"marker press 65", "marker release 120"} << Values{};
+    QTest::newRow("marker click resets") << 0.8 << Steps{"marker press 65", "marker release 65"} << Values{0.3};
+    QTest::newRow("page left of the knob") << 0.5 << Steps{"press 20", "release 20"} << Values{0.25};
+    QTest::newRow("page right of the knob") << 0.5 << Steps{"press 190", "release 190"} << Values{0.75};
+    QTest::newRow("Ctrl pages finely") << 0.5 << Steps{"press 190 ctrl", "release 190 ctrl"} << Values{0.51};
+    QTest::newRow("page from just left of the widget") << 0.5 << Steps{"press -9", "release -9"} << Values{0.25};
+}
+
+void CustomSliderTest::gestures()
+{
+    QFETCH(double, start);
+    QFETCH(QStringList, steps);
+    QFETCH(QList<double>, values);
     Shown w;
     QSignalSpy released(w.s, SIGNAL(Released(CustomController *)));
-    w.s->SetValue(0.123456, false);
-    QCOMPARE(w.s->KnobX(), 30);
-    w.Press(33);
+    w.s->SetSteps(0.01, 0.1, 0.25);
+    w.s->SetDefault(0.3, false);
+    w.s->SetValue(start, false);
+    for (const QString &step : steps)
+        Run(w, step);
+    QCOMPARE(w.Values(), values);
+    QList<int> firsts;
+    for (int i = 0; i < values.size(); ++i)
+        firsts << (i == 0 ? 1 : 0);
+    QCOMPARE(w.Firsts(), firsts);
+    if (!values.isEmpty())
+        QCOMPARE(PointerArg<CustomController>(w.drag.at(0).at(0)), w.s);
     QCOMPARE(PointerArg<CustomController>(w.pressed.at(0).at(0)), w.s);
-    w.Move(33);
-    QCOMPARE(w.valueChanged.count(), 0);
-    w.Move(53);
-    w.Move(73);
-    w.Release(73);
-    QCOMPARE(w.Values(), QList<double>({0.223, 0.323}));
-    QCOMPARE(w.Firsts(), QList<int>({1, 0}));
-    QCOMPARE(PointerArg<CustomController>(w.drag.at(0).at(0)), w.s);
-    QCOMPARE(released.count(), 1);
-    QCOMPARE(w.owner.resetUndos, 1);
+    const int releases = steps.filter("release").size();
+    QCOMPARE(released.count(), releases);
+    QCOMPARE(w.owner.resetUndos, releases);
     QVERIFY(!w.s->IsDragging());
-}
-
-// Pressing or letting go of Ctrl in a drag re-anchors at the current value:
-// the knob stays under the cursor and the new rate applies from there.
-void CustomSliderTest::ctrlChangeReAnchors_data()
-{
-    QTest::addColumn<int>("before");
-    QTest::addColumn<int>("after");
-    QTest::addColumn<double>("atSwitch");
-    QTest::addColumn<double>("end");
-    const int none = Qt::NoModifier, ctrl = Qt::ControlModifier;
-    QTest::newRow("Ctrl let go") << ctrl << none << 0.525 << 0.575;
-    QTest::newRow("Ctrl pressed") << none << ctrl << 0.75 << 0.755;
-}
-
-void CustomSliderTest::ctrlChangeReAnchors()
-{
-    QFETCH(int, before);
-    QFETCH(int, after);
-    QFETCH(double, atSwitch);
-    QFETCH(double, end);
-    Shown w;
-    w.s->SetValue(0.5, false);
-    w.Press(105);
-    w.Move(155, Qt::KeyboardModifiers(before));
-    if (after)
-        QTest::keyPress(w.s, Qt::Key_Control, Qt::ControlModifier);
-    else
-        QTest::keyRelease(w.s, Qt::Key_Control);
-    QCOMPARE(w.s->GetValue(), atSwitch);
-    QCOMPARE(w.s->GetScaleAnchor(), atSwitch);
-    w.Move(165, Qt::KeyboardModifiers(after));
-    QCOMPARE(w.s->GetValue(), end);
-    w.Release(165, Qt::KeyboardModifiers(after));
-    QCOMPARE(w.owner.resetUndos, 1);
 }
 
 // Integer sliders step by at least 1 at every level; on two segments a step
@@ -488,50 +300,6 @@ void CustomSliderTest::keySteps()
     QCOMPARE(w.s->GetValue(), 1.0);
 }
 
-// A click on the marker goes back to the default when the button is let go
-// over it; let go elsewhere, nothing changes.
-void CustomSliderTest::markerClickResets()
-{
-    Shown w;
-    w.s->SetDefault(0.3, false);
-    w.s->SetValue(0.8, false);
-    for (int releaseX : {120, 65}) {
-        QTest::mousePress(w.s, Qt::LeftButton, Qt::NoModifier, w.Marker(65));
-        QCOMPARE(w.s->GetValue(), 0.8);
-        QTest::mouseRelease(w.s, Qt::LeftButton, Qt::NoModifier, w.Marker(releaseX));
-    }
-    QCOMPARE(w.Values(), QList<double>({0.3}));
-    QCOMPARE(w.Firsts(), QList<int>({1}));
-    QCOMPARE(w.owner.resetUndos, 2);
-}
-
-void CustomSliderTest::trackPressPages_data()
-{
-    QTest::addColumn<int>("x");
-    QTest::addColumn<int>("modifiers");
-    QTest::addColumn<double>("expected");
-    QTest::newRow("left of the knob") << 20 << int(Qt::NoModifier) << 0.25;
-    QTest::newRow("right of the knob") << 190 << int(Qt::NoModifier) << 0.75;
-    QTest::newRow("ctrl pages finely") << 190 << int(Qt::ControlModifier) << 0.51;
-    QTest::newRow("just left of the widget") << -9 << int(Qt::NoModifier) << 0.25;
-}
-
-void CustomSliderTest::trackPressPages()
-{
-    QFETCH(int, x);
-    QFETCH(int, modifiers);
-    QFETCH(double, expected);
-    Shown w;
-    w.s->SetSteps(0.01, 0.1, 0.25);
-    w.s->SetValue(0.5, false);
-    w.Press(x, Qt::KeyboardModifiers(modifiers));
-    QCOMPARE(w.s->GetValue(), expected);
-    w.Release(x, Qt::KeyboardModifiers(modifiers));
-    QCOMPARE(w.Values(), QList<double>({expected}));
-    QCOMPARE(w.Firsts(), QList<int>({1}));
-    QCOMPARE(w.owner.resetUndos, 1);
-}
-
 // A knob drag turns the document's automatic proxy on while it lasts and
 // asks for one render at the end; a page step does neither.
 void CustomSliderTest::dragDrivesDocument()
@@ -541,15 +309,15 @@ void CustomSliderTest::dragDrivesDocument()
     Shown w;
     w.owner.doc = &doc;
     w.s->SetValue(0.5, false);
-    w.Press(105);
+    Run(w, "press 105");
     QVERIFY(doc.GetAutoProxy());
-    w.Move(125);
-    w.Release(125);
+    Run(w, "move 125");
+    Run(w, "release 125");
     QVERIFY(!doc.GetAutoProxy());
     QCOMPARE(renders.count(), 1);
-    w.Press(20);
+    Run(w, "press 20");
     QVERIFY(!doc.GetAutoProxy());
-    w.Release(20);
+    Run(w, "release 20");
     QCOMPARE(renders.count(), 1);
 }
 
@@ -608,42 +376,36 @@ void CustomSliderTest::knobStates()
     QVERIFY(Close(w.OnTrack(105), kKnob));
     w.s->SetDisabled(true);
     QVERIFY(w.OnTrack(105).lightness() < kKnob.lightness() - 10);
-    w.Press(105);
-    w.Move(150);
-    w.Release(150);
+    Run(w, "press 105");
+    Run(w, "move 150");
+    Run(w, "release 150");
     w.Key(Qt::Key_Right);
     QCOMPARE(w.pressed.count(), 1);
     QCOMPARE(w.valueChanged.count(), 0);
 }
 
+// A ramp paints the track in its colour space; a second one takes the half
+// right of the centre; without ramps the track is plain again.
 void CustomSliderTest::gradientPaintsTrack()
 {
     Shown w;
     w.s->SetValue(0.5, true);
     const QColor plain = w.OnTrack(20);
-    Gradient *ramp = Ramp({1, 0, 0, 1}, {0, 0, 1, 1});
-    w.s->SetGradients(ramp, nullptr);
-    ramp->DecRef();
+    AutoRef<Gradient> ramp(Ramp({1, 0, 0, 1}, {0, 0, 1, 1}));
+    w.s->SetGradients(ramp.get(), nullptr);
     const QColor left = w.OnTrack(20), right = w.OnTrack(190);
     QVERIFY(left.red() > 200 && left.blue() < 60);
     QVERIFY(right.blue() > 200 && right.red() < 60);
     w.s->SetColorSpaces(GCS_HSV, GCS_RGB);
     QVERIFY(w.OnTrack(85).green() < 40); // hue runs through magenta, never green
+    w.s->SetColorSpaces(GCS_RGB, GCS_RGB);
+    AutoRef<Gradient> green(Ramp({0, 1, 0, 1}, {0, 1, 0, 1}));
+    w.s->SetCentre(0.5);
+    w.s->SetGradients(ramp.get(), green.get());
+    QVERIFY(w.OnTrack(12).red() > 200); // the first ramp, squeezed into the left half
+    QVERIFY(w.OnTrack(170).green() > 200);
     w.s->SetGradients(nullptr, nullptr);
     QVERIFY(Close(w.OnTrack(20), plain));
-}
-
-void CustomSliderTest::secondGradientRightOfCentre()
-{
-    Shown w;
-    w.s->SetCentre(0.5);
-    w.s->SetValue(0.5, true);
-    Gradient *left = Ramp({1, 0, 0, 1}, {1, 0, 0, 1}), *right = Ramp({0, 1, 0, 1}, {0, 1, 0, 1});
-    w.s->SetGradients(left, right);
-    left->DecRef();
-    right->DecRef();
-    QVERIFY(w.OnTrack(40).red() > 200);
-    QVERIFY(w.OnTrack(170).green() > 200);
 }
 
 // A new value repaints the strip the knob swept, from the same back buffer;
