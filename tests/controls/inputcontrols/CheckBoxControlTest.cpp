@@ -269,7 +269,7 @@ void CheckBoxControlTest::undoRenotifiesEveryControl()
     InputControl *first = CheckBox(f, in);
     InputControl *second = CheckBox(f, in);
     // However many controls, the layout description is read once.
-    QCOMPARE(InputControl::LayoutReadCount("Controls.CheckBox.Layout"), 1);
+    QCOMPARE(ToolFixture::LayoutReadCount("Controls.CheckBox.Layout"), 1);
     Click(first);
     QCOMPARE(f.NumberOf(in), 1.0);
     QCOMPARE(BoxOf(second)->GetCheck(), 1);

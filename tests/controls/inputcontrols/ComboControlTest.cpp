@@ -348,7 +348,7 @@ void ComboControlTest::labelPosition()
     InputControl *c = f.Create(CLSID_InputControl_Combo, {f.AddNumber("Mode", 0.0, attrs)});
     f.Create(CLSID_InputControl_Combo, {f.AddNumber("Mode2", 0.0, attrs)});
     const char *item = position ? "Controls.Combo.Layout.Vertical" : "Controls.Combo.Layout.Horizontal";
-    QCOMPARE(InputControl::LayoutReadCount(item), 1);
+    QCOMPARE(ToolFixture::LayoutReadCount(item), 1);
     const ElideLabel *labelWidget = c->findChild<ElideLabel *>("label");
     const QRect label = labelWidget->geometry(), combo = ComboOf(c)->geometry();
     QCOMPARE(labelWidget->text(), QString("Blend"));
