@@ -52,10 +52,8 @@ class LabelledInputControlTest : public QObject
     Q_OBJECT
 private slots:
     void initTestCase();
-    void labelRule_data();
-    void labelRule();
-    void textsRule_data();
-    void textsRule();
+    void labelTexts_data();
+    void labelTexts();
     void attributeRows_data();
     void attributeRows();
 };
@@ -66,69 +64,55 @@ void LabelledInputControlTest::initTestCase()
     QVERIFY2(ToolFixture::LoadControls(&error), error.c_str());
 }
 
-void LabelledInputControlTest::labelRule_data()
+void LabelledInputControlTest::labelTexts_data()
 {
     QTest::addColumn<QString>("cls");
-    QTest::addColumn<TagList>("attrs");
+    QTest::addColumn<TagList>("attrs"); // of the Input
+    QTest::addColumn<TagList>("tags");  // a later SetAttrs list
     QTest::addColumn<QStringList>("texts");
+    QTest::addColumn<bool>("changed");
+    const TagList given{{0x30040000, "Gain"}, {0x30040001, "Opt"}};
+    const QStringList same{"Gain", "Opt"};
     for (const char *cls : kClasses) {
+        // The label rule: the label text, then the Input's name, then its identifier.
         QTest::addRow("%s: label text first", cls)
-            << cls << TagList{{0x30020014, "Gain Name"}, {0x30040000, "Gain"}, {0x30040001, "Second"}}
-            << QStringList{"Gain", "Second"};
+            << cls << TagList{{0x30020014, "Gain Name"}, {0x30040000, "Gain"}, {0x30040001, "Opt"}} << TagList{} << same
+            << false;
         QTest::addRow("%s: then the Input's name", cls)
-            << cls << TagList{{0x30020014, "Gain Name"}} << QStringList{"Gain Name", ""};
-        QTest::addRow("%s: then the identifier", cls) << cls << TagList{} << QStringList{"GainID", ""};
+            << cls << TagList{{0x30020014, "Gain Name"}} << TagList{} << QStringList{"Gain Name", ""} << false;
+        QTest::addRow("%s: then the identifier", cls)
+            << cls << TagList{} << TagList{} << QStringList{"GainID", ""} << false;
+        // A list gives only the texts whose tags it carries.
+        QTest::addRow("%s: same texts", cls) << cls << given << given << same << false;
+        QTest::addRow("%s: new label", cls)
+            << cls << given << TagList{{0x30040000, "Flip"}} << QStringList{"Flip", "Opt"} << true;
+        QTest::addRow("%s: the Input's name", cls)
+            << cls << given << TagList{{0x30020014, "Named"}} << QStringList{"Named", "Opt"} << true;
+        QTest::addRow("%s: label text before name", cls)
+            << cls << given << TagList{{0x30020014, "Named"}, {0x30040000, "Gain"}} << same << false;
+        QTest::addRow("%s: second text cleared", cls)
+            << cls << given << TagList{{0x30040001, ""}} << QStringList{"Gain", ""} << true;
     }
 }
 
-void LabelledInputControlTest::labelRule()
+// Open shows the texts; later ones are shown again only where they changed.
+void LabelledInputControlTest::labelTexts()
 {
     QFETCH(QString, cls);
     QFETCH(TagList, attrs);
-    QFETCH(QStringList, texts);
-    ToolFixture f;
-    InputControl *c = Make(f, cls, attrs);
-    QVERIFY(c && LabelOf(c));
-    QCOMPARE(Texts(c), texts);
-    QCOMPARE(LabelOf(c)->text(), LabelShowsSecond(cls) ? texts[1] : texts[0]);
-}
-
-void LabelledInputControlTest::textsRule_data()
-{
-    QTest::addColumn<QString>("cls");
-    QTest::addColumn<TagList>("tags");
-    QTest::addColumn<QStringList>("texts"); // after the tags
-    QTest::addColumn<bool>("changed");
-    for (const char *cls : kClasses) {
-        QTest::addRow("%s: no text tags", cls) << cls << TagList{} << QStringList{"Gain", "Opt"} << false;
-        QTest::addRow("%s: same texts", cls)
-            << cls << TagList{{0x30040000, "Gain"}, {0x30040001, "Opt"}} << QStringList{"Gain", "Opt"} << false;
-        QTest::addRow("%s: new label", cls)
-            << cls << TagList{{0x30040000, "Flip"}} << QStringList{"Flip", "Opt"} << true;
-        QTest::addRow("%s: the Input's name", cls)
-            << cls << TagList{{0x30020014, "Named"}} << QStringList{"Named", "Opt"} << true;
-        QTest::addRow("%s: label text before name", cls)
-            << cls << TagList{{0x30020014, "Named"}, {0x30040000, "Gain"}} << QStringList{"Gain", "Opt"} << false;
-        QTest::addRow("%s: second text cleared", cls)
-            << cls << TagList{{0x30040001, ""}} << QStringList{"Gain", ""} << true;
-    }
-}
-
-// Texts are taken only from the tags a list carries, and shown again only
-// where they changed.
-void LabelledInputControlTest::textsRule()
-{
-    QFETCH(QString, cls);
     QFETCH(TagList, tags);
     QFETCH(QStringList, texts);
     QFETCH(bool, changed);
     ToolFixture f;
-    InputControl *c = Make(f, cls, TagList{{0x30040000, "Gain"}, {0x30040001, "Opt"}});
+    InputControl *c = Make(f, cls, attrs);
+    QVERIFY(c && LabelOf(c));
+    const auto shown = [&](const QStringList &t) { return LabelShowsSecond(cls) ? t[1] : t[0]; };
+    QCOMPARE(LabelOf(c)->text(), shown(Texts(c)));
     LabelOf(c)->setText("shown");
     QVERIFY(c->SetAttrsTagList(c->GetCurrentInput(), tags));
     c->UpdateDisplay(nullptr, nullptr);
     QCOMPARE(Texts(c), texts);
-    QCOMPARE(LabelOf(c)->text(), changed ? (LabelShowsSecond(cls) ? texts[1] : texts[0]) : QString("shown"));
+    QCOMPARE(LabelOf(c)->text(), changed ? shown(texts) : QString("shown"));
 }
 
 void LabelledInputControlTest::attributeRows_data()
