@@ -15,10 +15,10 @@
 #include "framework/FFICasts.h"
 #include "framework/ListTags.h"
 #include "framework/PointTags.h"
-#include "framework/PolyLineTags.h"
 #include "framework/RectangleTags.h"
 #include "framework/SliderTags.h"
 #include "framework/VariantRegistration.h"
+#include "polyline/PolyLineTags.h"
 
 #include "orbane/ClassIDs.h"
 #include "orbane/OverlayControl.h"

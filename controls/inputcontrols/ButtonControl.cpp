@@ -23,81 +23,45 @@ OrbColor ToOrbColor(const QColor &c)
 } // namespace
 
 ButtonControl::ButtonControl(const Registry *reg, const ScriptVal &args, const TagList &tags)
-    : InputControl(reg, args, tags), mLabel(new ElideLabel(this)), mButton(new CustomButton(this)),
+    : LabelledInputControl(reg, args, tags), mButton(new CustomButton(this)),
       mScriptText(tags.GetString(BTNCS_Execute, ""))
 {
     mFlags |= CF_ActionOnly;
-    mLabel->setObjectName("label");
+    ListAttr(BTNCS_Execute, &mScriptText);
+    ShowDisabledWithTexts();
     mButton->setObjectName("button");
     // The click's modifiers reach the press through the first connection.
     connect(mButton, SIGNAL(ButtonPressed(uint64, bool)), this, SLOT(RememberModifiers(uint64)));
     connect(mButton, SIGNAL(ButtonPressed(uint64, bool)), this, SLOT(OnButtonPressed()));
-    RegisterChild("label", mLabel);
     RegisterChild("button", mButton);
 }
 
 ButtonControl::~ButtonControl() = default;
 
-bool ButtonControl::GetAttrsTagList(TagList &tags) const
-{
-    InputControl::GetAttrsTagList(tags);
-    mTexts.AddTo(tags);
-    tags.Set(BTNCS_Execute, mScriptText.c_str());
-    return true;
-}
-
-bool ButtonControl::AddInput(Input *input, const TagList *tags)
-{
-    if (!InputControl::AddInput(input, tags))
-        return false;
-    mTexts.Read(input);
-    return true;
-}
-
 bool ButtonControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
 {
-    if (!InputControl::Open(host, rect, tags))
+    if (!LabelledInputControl::Open(host, rect, tags))
         return false;
     mButton->SetFont(GetControlFont());
     mButton->SetBackgroundColor(ToOrbColor(GetBackgroundColor()));
     mButton->show();
-    mButton->setEnabled(!IsDisabled());
-    mLabel->setElideMode(ElideLabel::Elide_Right);
-    ShowTexts();
     mButton->update();
-    mTexts.changed = false;
     LoadLayout("Controls.Button.Layout");
     return true;
 }
 
 void ButtonControl::ShowTexts()
 {
-    mButton->SetLabel(mTexts.label);
-    mLabel->setText(QString::fromStdString(mTexts.second.str()));
-    mLabel->setVisible(!mTexts.second.IsEmpty());
+    mButton->setEnabled(!IsDisabled());
+    mButton->SetLabel(GetLabelTexts().label);
+    Label()->setText(QString::fromStdString(GetLabelTexts().second.str()));
+    Label()->setVisible(!GetLabelTexts().second.IsEmpty());
 }
 
 bool ButtonControl::SetAttrsTagList(Input *input, const TagList &tags)
 {
-    const bool wasDisabled = IsDisabled();
-    InputControl::SetAttrsTagList(input, tags);
-    mTexts.Take(tags);
     mScriptText = OrbID(tags.GetString(BTNCS_Execute, mScriptText.c_str()));
-    if (IsDisabled() != wasDisabled)
-        mTexts.changed = true;
-    if (mTexts.changed)
-        NotifyChanged(nullptr, nullptr, nullptr);
-    return true;
-}
-
-bool ButtonControl::UpdateDisplay(Input *input, const TagList *tags)
-{
-    if (IsOpen() && mTexts.changed) {
-        mButton->setEnabled(!IsDisabled());
-        ShowTexts();
-        mTexts.changed = false;
-    }
-    return InputControl::UpdateDisplay(input, tags);
+    return LabelledInputControl::SetAttrsTagList(input, tags);
 }
 
 void ButtonControl::RememberModifiers(uint64 modifiers)
@@ -139,7 +103,8 @@ bool ButtonControl::RunScript()
     const ButtonScript script(mScriptText.c_str(), ChunkName());
     if (script.Run(GetDoc(), tool, this, mModifiers, &error))
         return true;
-    qWarning("Button \"%s\" of tool \"%s\": %s", mTexts.label.c_str(), tool ? tool->GetName() : "?", error.c_str());
+    qWarning("Button \"%s\" of tool \"%s\": %s", GetLabelTexts().label.c_str(), tool ? tool->GetName() : "?",
+             error.c_str());
     return false;
 }
 

@@ -17,8 +17,7 @@ namespace Orbane {
 
 namespace {
 
-// The class layout description, read when the first instance is made.
-ScriptVal gLayout;
+constexpr const char *kLayoutItem = "Controls.CheckBox.Layout";
 
 int32 RoundValue(float64 value)
 {
@@ -33,37 +32,18 @@ OrbColor ToOrbColor(const QColor &c)
 } // namespace
 
 CheckBoxControl::CheckBoxControl(const Registry *reg, const ScriptVal &args, const TagList &tags)
-    : InputControl(reg, args, tags), mLabel(new ElideLabel(this)), mCheckBox(new OrbCheckBox(this))
+    : LabelledInputControl(reg, args, tags), mCheckBox(new OrbCheckBox(this))
 {
     mTriState = tags.GetBool(CBC_TriState, false);
-    mLabel->setObjectName("label");
+    AddAttr(CBC_TriState, &mTriState, Attr_CopyAndList);
     connect(mCheckBox, SIGNAL(CheckChanged(int32, uint64)), this, SLOT(OnCheckChanged(int32, uint64)));
-    RegisterChild("label", mLabel);
     RegisterChild("checkbox", mCheckBox);
-    if (gLayout.IsNil())
-        gLayout = ReadLayoutItem("Controls.CheckBox.Layout");
+    Label()->setFocusProxy(mCheckBox);
+    ClassLayout(kLayoutItem);
     mCheckBox->SetBasicCols(OrbColor(), OrbColor(), OrbColor(), ToOrbColor(Theme::Accent()));
 }
 
 CheckBoxControl::~CheckBoxControl() = default;
-
-bool CheckBoxControl::CopyAttr(Tag tag, void *out)
-{
-    if (tag == CBC_TriState && out) {
-        *static_cast<int32 *>(out) = mTriState ? 1 : 0;
-        // False: the value was supplied.
-        return false;
-    }
-    return InputControl::CopyAttr(tag, out);
-}
-
-bool CheckBoxControl::GetAttrsTagList(TagList &tags) const
-{
-    InputControl::GetAttrsTagList(tags);
-    mTexts.AddTo(tags);
-    tags.Set(CBC_TriState, mTriState);
-    return true;
-}
 
 bool CheckBoxControl::SetAttrsTagList(Input *input, const TagList &tags)
 {
@@ -75,31 +55,16 @@ bool CheckBoxControl::SetAttrsTagList(Input *input, const TagList &tags)
         }
     }
     mCheckBox->AllowWrap(tags.GetBool(CBA_AllowWrap, false));
-    InputControl::SetAttrsTagList(input, tags);
-    mTexts.Take(tags);
-    if (mTexts.changed)
-        NotifyChanged(nullptr, nullptr, nullptr);
-    return true;
-}
-
-bool CheckBoxControl::AddInput(Input *input, const TagList *tags)
-{
-    if (!InputControl::AddInput(input, tags))
-        return false;
-    mTexts.Read(input);
-    return true;
+    return LabelledInputControl::SetAttrsTagList(input, tags);
 }
 
 bool CheckBoxControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
 {
-    if (!InputControl::Open(host, rect, tags))
+    if (!LabelledInputControl::Open(host, rect, tags))
         return false;
     mCheckBox->SetStyle(mTriState ? CustomButton::Style_TriState : CustomButton::Style_TwoState);
     mCheckBox->SetFont(GetControlFont());
     mCheckBox->SetBackgroundColor(ToOrbColor(GetBackgroundColor()));
-    mLabel->setElideMode(ElideLabel::Elide_Right);
-    mLabel->setFocusProxy(mCheckBox);
-    ShowTexts();
     if (GetCurrentInput()) {
         const AutoNumber now(GetCurrentInput(), GetCurrentTime());
         if (now)
@@ -107,21 +72,18 @@ bool CheckBoxControl::Open(QWidget *host, const QRect &rect, const TagList *tags
     }
     mCheckBox->SetValue(mValue);
     mCheckBox->show();
-    CreateLayout(gLayout, true, nullptr);
+    PlaceChildren(ClassLayout(kLayoutItem), true);
     if (Layout::LayoutObj *row = FindLayoutObj("checkbox"))
         mRowHeight = row->GetHeight();
-    if (Layout::LayoutObj *where = FindLayoutObj("expression"); where && where->AsContainer())
-        CreateExpressionEdit(where->AsContainer(), 0);
-    mTexts.changed = false;
     return true;
 }
 
 void CheckBoxControl::ShowTexts()
 {
-    mCheckBox->SetLabel(mTexts.label);
-    mLabel->setText(QString::fromStdString(mTexts.second.str()));
+    mCheckBox->SetLabel(GetLabelTexts().label);
+    Label()->setText(QString::fromStdString(GetLabelTexts().second.str()));
     // An empty second label gives its room to the box.
-    mLabel->setVisible(!mTexts.second.IsEmpty());
+    Label()->setVisible(!GetLabelTexts().second.IsEmpty());
 }
 
 bool CheckBoxControl::WrapsLabel() const
@@ -134,7 +96,7 @@ int32 CheckBoxControl::WrappedRowHeight() const
 {
     const QFontMetrics metrics(QApplication::font());
     const QRect box(0, 0, mCheckBox->width() - kBoxRoom, 1000);
-    const QString text = QString::fromStdString(mTexts.label.str());
+    const QString text = QString::fromStdString(GetLabelTexts().label.str());
     const int single = metrics.boundingRect(box, 0x321, text).height();
     const int wrapped = metrics.boundingRect(box, 0x1021, text).height();
     return mRowHeight + wrapped - single;
@@ -145,10 +107,10 @@ bool CheckBoxControl::SetSize(int32 &width, int32 &height, const TagList *tags)
     if (WrapsLabel()) {
         Layout::LayoutObj *row = FindLayoutObj("checkbox");
         row->SetAttrs(TagList{{INPA_LayoutHeight, mRowHeight}});
-        InputControl::SetSize(width, height, tags);
+        LabelledInputControl::SetSize(width, height, tags);
         row->SetAttrs(TagList{{INPA_LayoutHeight, WrappedRowHeight()}});
     }
-    return InputControl::SetSize(width, height, tags);
+    return LabelledInputControl::SetSize(width, height, tags);
 }
 
 bool CheckBoxControl::NotifyChanged(Input *input, Parameter *value, const TagList *tags)
@@ -160,19 +122,14 @@ bool CheckBoxControl::NotifyChanged(Input *input, Parameter *value, const TagLis
     if (rounded == mValue)
         return true;
     mValue = rounded;
-    return InputControl::NotifyChanged(input, value, tags);
+    return LabelledInputControl::NotifyChanged(input, value, tags);
 }
 
 bool CheckBoxControl::UpdateDisplay(Input *input, const TagList *tags)
 {
-    if (IsOpen()) {
+    if (IsOpen())
         mCheckBox->SetValue(mValue);
-        if (mTexts.changed) {
-            ShowTexts();
-            mTexts.changed = false;
-        }
-    }
-    return InputControl::UpdateDisplay(input, tags);
+    return LabelledInputControl::UpdateDisplay(input, tags);
 }
 
 void CheckBoxControl::OnCheckChanged(int32 state, uint64)
@@ -186,7 +143,7 @@ void CheckBoxControl::OnCheckChanged(int32 state, uint64)
 bool CheckBoxControl::OnDisconnect(Input *input, const TagList *tags)
 {
     WriteOnDisconnect(input, float64(mValue));
-    return InputControl::OnDisconnect(input, tags);
+    return LabelledInputControl::OnDisconnect(input, tags);
 }
 
 } // namespace Orbane

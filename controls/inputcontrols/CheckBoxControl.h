@@ -1,18 +1,16 @@
 #pragma once
 
-#include "orbane/InputControl.h"
-#include "orbane/LabelTexts.h"
+#include "framework/LabelledInputControl.h"
 
 namespace Orbane {
 
-class ElideLabel;
 class OrbCheckBox;
 
 // Shows an integer Input as a check box with a label, optionally with a
 // third, mixed state (CBC_TriState), stored in the Input as -1. The label
 // may wrap onto several lines (Input attribute 0x10050001); the control then
 // grows in height with its text.
-class CheckBoxControl : public InputControl
+class CheckBoxControl : public LabelledInputControl
 {
     Q_OBJECT
 public:
@@ -25,30 +23,28 @@ public:
     ~CheckBoxControl() override;
 
     std::size_t SizeOf() const override { return sizeof(CheckBoxControl); }
-    bool CopyAttr(Tag tag, void *out) override;
-    bool GetAttrsTagList(TagList &tags) const override;
 
     using InputControl::SetAttrsTagList;
     bool SetAttrsTagList(Input *input, const TagList &tags) override;
-    bool AddInput(Input *input, const TagList *tags) override;
     bool Open(QWidget *host, const QRect &rect, const TagList *tags) override;
     bool SetSize(int32 &width, int32 &height, const TagList *tags) override;
     bool NotifyChanged(Input *input, Parameter *value, const TagList *tags) override;
     bool UpdateDisplay(Input *input, const TagList *tags) override;
     bool OnDisconnect(Input *input, const TagList *tags) override;
 
+protected:
+    // The box shows the label text, the label widget the second text.
+    void ShowTexts() override;
+
 private slots:
     void OnCheckChanged(int32 state, uint64 modifiers);
 
 private:
-    void ShowTexts();
     bool WrapsLabel() const;
     int32 WrappedRowHeight() const;
 
     int32 mValue = 0; // -1: the mixed state
     bool mTriState = false;
-    LabelTexts mTexts;
-    ElideLabel *mLabel;
     OrbCheckBox *mCheckBox;
     int32 mRowHeight = 0;
 };

@@ -18,18 +18,10 @@ enum LabelPosition : int32
     Label_Vertical = 1,
 };
 
-// The class layout descriptions, each read when the first instance that
-// places its label that way is made.
-ScriptVal gHorizontalLayout;
-ScriptVal gVerticalLayout;
-
-const ScriptVal &LayoutFor(int32 labelPosition)
+// The class layout description of a label position.
+const char *LayoutItemFor(int32 labelPosition)
 {
-    ScriptVal &layout = labelPosition == Label_Vertical ? gVerticalLayout : gHorizontalLayout;
-    if (layout.IsNil())
-        layout = InputControl::ReadLayoutItem(labelPosition == Label_Vertical ? "Controls.Combo.Layout.Vertical"
-                                                                              : "Controls.Combo.Layout.Horizontal");
-    return layout;
+    return labelPosition == Label_Vertical ? "Controls.Combo.Layout.Vertical" : "Controls.Combo.Layout.Horizontal";
 }
 
 QString ToQString(const OrbString &s)
@@ -40,20 +32,23 @@ QString ToQString(const OrbString &s)
 } // namespace
 
 ComboControl::ComboControl(const Registry *reg, const ScriptVal &args, const TagList &tags)
-    : InputControl(reg, args, tags), mLabel(new ElideLabel(this)), mCombo(new OrbComboBox(this))
+    : LabelledInputControl(reg, args, tags), mCombo(new OrbComboBox(this))
 {
     mLabelPosition =
         tags.GetInt(CC_LabelPosition, Label_Horizontal) == Label_Vertical ? Label_Vertical : Label_Horizontal;
     mAlphaSort = tags.GetBool(CC_AlphaSort, false);
-    mLabel->setObjectName("label");
+    AddAttr(CC_LabelPosition, &mLabelPosition, Attr_CopyAndList);
+    AddAttr(CC_AlphaSort, &mAlphaSort, Attr_CopyAndList);
     mCombo->setObjectName("combo");
     connect(mCombo, SIGNAL(activated(int)), this, SLOT(OnCombo(int)));
     connect(mCombo, SIGNAL(highlighted(int)), this, SLOT(TestCombo(int)));
     connect(mCombo, SIGNAL(popupShow()), this, SLOT(PopupShow()));
     connect(mCombo, SIGNAL(popupHide()), this, SLOT(PopupHide()));
-    RegisterChild("label", mLabel);
     RegisterChild("combo", mCombo);
-    LayoutFor(mLabelPosition);
+    Label()->setFocusProxy(mCombo);
+    // Each description is read when the first instance that places its
+    // label that way is made.
+    ClassLayout(LayoutItemFor(mLabelPosition));
 }
 
 ComboControl::~ComboControl() = default;
@@ -64,36 +59,13 @@ bool ComboControl::IsIDVariant() const
     return reg && reg->ClassID() != CLSID_InputControl_Combo;
 }
 
-bool ComboControl::CopyAttr(Tag tag, void *out)
-{
-    if (out && (tag == CC_LabelPosition || tag == CC_AlphaSort)) {
-        *static_cast<int32 *>(out) = tag == CC_LabelPosition ? mLabelPosition : int32(mAlphaSort);
-        // False: the value was supplied.
-        return false;
-    }
-    return InputControl::CopyAttr(tag, out);
-}
-
-bool ComboControl::GetAttrsTagList(TagList &tags) const
-{
-    InputControl::GetAttrsTagList(tags);
-    mTexts.AddTo(tags);
-    tags.Set(CC_LabelPosition, mLabelPosition);
-    tags.Set(CC_AlphaSort, mAlphaSort);
-    return true;
-}
-
 bool ComboControl::SetAttrsTagList(Input *input, const TagList &tags)
 {
     if (tags.FindQuery(CC_AlphaSort) && tags.GetBool(CC_AlphaSort, mAlphaSort) != mAlphaSort) {
         mAlphaSort = !mAlphaSort;
         FillRows();
     }
-    InputControl::SetAttrsTagList(input, tags);
-    mTexts.Take(tags);
-    if (mTexts.changed)
-        NotifyChanged(nullptr, nullptr, nullptr);
-    return true;
+    return LabelledInputControl::SetAttrsTagList(input, tags);
 }
 
 bool ComboControl::AddInput(Input *input, const TagList *tags)
@@ -107,11 +79,11 @@ bool ComboControl::AddInput(Input *input, const TagList *tags)
         }
         FillRows();
     }
+    // The host's AddInput, not the base's: the texts, too, are the first Input's.
     if (!InputControl::AddInput(input, tags))
         return false;
-    if (GetCurrentInput() == input) {
-        mTexts.Read(input);
-    }
+    if (GetCurrentInput() == input)
+        ReadTexts(input);
     return true;
 }
 
@@ -130,31 +102,25 @@ void ComboControl::FillRows()
 
 bool ComboControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
 {
-    if (!InputControl::Open(host, rect, tags))
+    if (!LabelledInputControl::Open(host, rect, tags))
         return false;
-    mLabel->setElideMode(ElideLabel::Elide_Right);
-    mLabel->setFocusProxy(mCombo);
-    ShowTexts();
     if (Input *in = GetCurrentInput()) {
         const AutoParameter now(in->GetValue(GetCurrentTime()));
         if (now)
             mSelection = SelectionFor(now);
     }
     mCombo->ShowItem(mSelection);
-    mLabel->show();
+    Label()->show();
     mCombo->show();
-    CreateLayout(LayoutFor(mLabelPosition), true, nullptr);
     // Only a number can come from a typed expression.
-    if (Layout::LayoutObj *where = FindLayoutObj("expression"); where && where->AsContainer() && !IsIDVariant())
-        CreateExpressionEdit(where->AsContainer(), 0);
-    mTexts.changed = false;
+    PlaceChildren(ClassLayout(LayoutItemFor(mLabelPosition)), !IsIDVariant());
     return true;
 }
 
 void ComboControl::ShowTexts()
 {
-    mLabel->setText(ToQString(mTexts.label));
-    mLabel->setToolTip(ToQString(mTexts.second));
+    Label()->setText(ToQString(GetLabelTexts().label));
+    Label()->setToolTip(ToQString(GetLabelTexts().second));
 }
 
 int32 ComboControl::SelectionFor(const Parameter *value) const
@@ -174,25 +140,23 @@ int32 ComboControl::SelectionFor(const Parameter *value) const
 bool ComboControl::NotifyChanged(Input *input, Parameter *value, const TagList *tags)
 {
     if (!value)
-        return InputControl::NotifyChanged(input, value, tags);
+        return LabelledInputControl::NotifyChanged(input, value, tags);
     const int32 selection = SelectionFor(value);
     if (selection == mSelection)
         return true;
     mSelection = selection;
-    return InputControl::NotifyChanged(input, value, tags);
+    return LabelledInputControl::NotifyChanged(input, value, tags);
 }
 
 bool ComboControl::UpdateDisplay(Input *input, const TagList *tags)
 {
-    // A preview leaves the list as it is: the user is still choosing.
-    if (IsOpen() && !mPreviewing) {
+    // A preview leaves the list and the texts as they are: the user is
+    // still choosing.
+    if (mPreviewing)
+        return InputControl::UpdateDisplay(input, tags);
+    if (IsOpen())
         mCombo->ShowItem(mSelection);
-        if (mTexts.changed) {
-            ShowTexts();
-            mTexts.changed = false;
-        }
-    }
-    return InputControl::UpdateDisplay(input, tags);
+    return LabelledInputControl::UpdateDisplay(input, tags);
 }
 
 AutoParameter ComboControl::ValueOf(int32 index) const
@@ -291,7 +255,7 @@ bool ComboControl::OnDisconnect(Input *input, const TagList *tags)
         if (!gestureOpen)
             ResetUndo(nullptr);
     }
-    return InputControl::OnDisconnect(input, tags);
+    return LabelledInputControl::OnDisconnect(input, tags);
 }
 
 } // namespace Orbane

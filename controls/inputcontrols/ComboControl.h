@@ -1,14 +1,12 @@
 #pragma once
 
+#include "framework/LabelledInputControl.h"
 #include "inputcontrols/ComboItems.h"
 
 #include "orbane/AutoParam.h"
-#include "orbane/InputControl.h"
-#include "orbane/LabelTexts.h"
 
 namespace Orbane {
 
-class ElideLabel;
 class OrbComboBox;
 
 // Shows an Input as a drop-down list of items with a label. Registered
@@ -21,7 +19,7 @@ class OrbComboBox;
 // While the list is open, the item under the mouse or the keyboard is
 // written at once, so the user sees its effect before choosing; the choice
 // (or Escape, which puts the value back) ends that gesture as one undo step.
-class ComboControl : public InputControl
+class ComboControl : public LabelledInputControl
 {
     Q_OBJECT
 public:
@@ -35,8 +33,6 @@ public:
     ~ComboControl() override;
 
     std::size_t SizeOf() const override { return sizeof(ComboControl); }
-    bool CopyAttr(Tag tag, void *out) override;
-    bool GetAttrsTagList(TagList &tags) const override;
 
     using InputControl::SetAttrsTagList;
     bool SetAttrsTagList(Input *input, const TagList &tags) override;
@@ -48,6 +44,10 @@ public:
 
     bool IsIDVariant() const;
 
+protected:
+    // The label shows the label text, with the second text as its tip.
+    void ShowTexts() override;
+
 private slots:
     void OnCombo(int row);
     void TestCombo(int row);
@@ -57,7 +57,6 @@ private slots:
 
 private:
     void FillRows();
-    void ShowTexts();
     int32 SelectionFor(const Parameter *value) const;
     void Select(int row, bool final);
     AutoParameter ValueOf(int32 index) const;
@@ -75,9 +74,7 @@ private:
     bool mPreviewing = false;
     // The open list's gesture has not been ended by a choice yet.
     bool mGesture = false;
-    LabelTexts mTexts;
     AutoParameter mBeforePopup;
-    ElideLabel *mLabel;
     OrbComboBox *mCombo;
 };
 

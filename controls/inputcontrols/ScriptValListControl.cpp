@@ -3,10 +3,10 @@
 #include "framework/ListTags.h"
 #include "inputcontrols/ScriptValTreeWidget.h"
 
+#include "orbane/ElideLabel.h"
 #include "orbane/Input.h"
 
 #include <QHeaderView>
-#include <QLabel>
 #include <QStyle>
 #include <QStyleOptionViewItem>
 
@@ -27,34 +27,17 @@ uint32 RowsFrom(const TagList &tags, uint32 def)
 } // namespace
 
 ScriptValListControl::ScriptValListControl(const Registry *reg, const ScriptVal &args, const TagList &tags)
-    : InputControl(reg, args, tags), mTree(new ScriptValTreeWidget(this)), mLabel(new QLabel(this))
+    : LabelledInputControl(reg, args, tags), mTree(new ScriptValTreeWidget(this))
 {
     mRows = RowsFrom(tags, kDefaultRows);
+    AddAttr(LC_Rows, &mRows, Attr_CopyAndList);
+    // The list's label is a plain one: it is cut at the right, not elided.
+    Label()->setElideMode(ElideLabel::Elide_None);
     mTree->setObjectName("list");
-    mLabel->setObjectName("label");
     RegisterChild("list", mTree);
-    RegisterChild("label", mLabel);
 }
 
 ScriptValListControl::~ScriptValListControl() = default;
-
-bool ScriptValListControl::CopyAttr(Tag tag, void *out)
-{
-    if (tag == LC_Rows && out) {
-        *static_cast<int32 *>(out) = int32(mRows);
-        // False: the value was supplied.
-        return false;
-    }
-    return InputControl::CopyAttr(tag, out);
-}
-
-bool ScriptValListControl::GetAttrsTagList(TagList &tags) const
-{
-    InputControl::GetAttrsTagList(tags);
-    mTexts.AddTo(tags);
-    tags.Set(LC_Rows, TagValue(mRows));
-    return true;
-}
 
 bool ScriptValListControl::SetAttrsTagList(Input *input, const TagList &tags)
 {
@@ -62,19 +45,7 @@ bool ScriptValListControl::SetAttrsTagList(Input *input, const TagList &tags)
         mRows = RowsFrom(tags, mRows);
         ApplyTreeHeight();
     }
-    InputControl::SetAttrsTagList(input, tags);
-    mTexts.Take(tags);
-    if (mTexts.changed)
-        NotifyChanged(nullptr, nullptr, nullptr);
-    return true;
-}
-
-bool ScriptValListControl::AddInput(Input *input, const TagList *tags)
-{
-    if (!InputControl::AddInput(input, tags))
-        return false;
-    mTexts.Read(input);
-    return true;
+    return LabelledInputControl::SetAttrsTagList(input, tags);
 }
 
 void ScriptValListControl::SetupTree()
@@ -119,12 +90,11 @@ void ScriptValListControl::ApplyTreeHeight()
 
 bool ScriptValListControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
 {
-    if (!InputControl::Open(host, rect, tags))
+    if (!LabelledInputControl::Open(host, rect, tags))
         return false;
-    mLabel->setText(QString::fromStdString(mTexts.label.str()));
-    mLabel->setAlignment(Qt::AlignLeft);
-    mLabel->setWordWrap(false);
-    mLabel->show();
+    Label()->setAlignment(Qt::AlignLeft);
+    Label()->setWordWrap(false);
+    Label()->show();
     SetupTree();
     mTree->show();
     if (Input *in = GetCurrentInput()) {
@@ -133,7 +103,6 @@ bool ScriptValListControl::Open(QWidget *host, const QRect &rect, const TagList 
     }
     LoadLayout("Controls.ScriptValList.Layout");
     ApplyTreeHeight();
-    mTexts.changed = false;
     // The tree shows the value from the start, not from the first change.
     UpdateDisplay(GetCurrentInput(), nullptr);
     return true;
@@ -141,7 +110,7 @@ bool ScriptValListControl::Open(QWidget *host, const QRect &rect, const TagList 
 
 bool ScriptValListControl::SetSize(int32 &width, int32 &height, const TagList *tags)
 {
-    const bool sized = InputControl::SetSize(width, height, tags);
+    const bool sized = LabelledInputControl::SetSize(width, height, tags);
     const int32 room =
         mTree->width() - 2 * mTree->frameWidth() - mTree->style()->pixelMetric(QStyle::PM_ScrollBarExtent);
     const int32 keys = room * 2 / 5;
@@ -155,7 +124,7 @@ bool ScriptValListControl::NotifyChanged(Input *input, Parameter *value, const T
     // No gate: a table may change inside while the parameter stays the same.
     if (value)
         Hold(value);
-    return InputControl::NotifyChanged(input, value, tags);
+    return LabelledInputControl::NotifyChanged(input, value, tags);
 }
 
 bool ScriptValListControl::UpdateDisplay(Input *input, const TagList *tags)
@@ -165,12 +134,8 @@ bool ScriptValListControl::UpdateDisplay(Input *input, const TagList *tags)
         const AutoParameter held = mHeldValue;
         if (const auto *table = dynamic_cast<const ScriptValParam *>(held.get()); table && table->Value.IsTable())
             mTree->Fill(mTree->invisibleRootItem(), table->Value, false);
-        if (mTexts.changed) {
-            mLabel->setText(QString::fromStdString(mTexts.label.str()));
-            mTexts.changed = false;
-        }
     }
-    return InputControl::UpdateDisplay(input, tags);
+    return LabelledInputControl::UpdateDisplay(input, tags);
 }
 
 } // namespace Orbane

@@ -1,10 +1,8 @@
 #pragma once
 
-#include "orbane/AutoParam.h"
-#include "orbane/InputControl.h"
-#include "orbane/LabelTexts.h"
+#include "framework/LabelledInputControl.h"
 
-class QLabel;
+#include "orbane/AutoParam.h"
 
 namespace Orbane {
 
@@ -14,7 +12,7 @@ class ScriptValTreeWidget;
 // read-only two-column tree of keys and values under a label, sorted by key.
 // The user may select rows and copy them as tab-separated text. The tree is
 // LC_Rows rows tall (6 by default) and scrolls beyond that.
-class ScriptValListControl : public InputControl
+class ScriptValListControl : public LabelledInputControl
 {
     Q_OBJECT
 public:
@@ -24,12 +22,9 @@ public:
     ~ScriptValListControl() override;
 
     std::size_t SizeOf() const override { return sizeof(ScriptValListControl); }
-    bool CopyAttr(Tag tag, void *out) override;
-    bool GetAttrsTagList(TagList &tags) const override;
 
     using InputControl::SetAttrsTagList;
     bool SetAttrsTagList(Input *input, const TagList &tags) override;
-    bool AddInput(Input *input, const TagList *tags) override;
     bool Open(QWidget *host, const QRect &rect, const TagList *tags) override;
     bool SetSize(int32 &width, int32 &height, const TagList *tags) override;
     bool NotifyChanged(Input *input, Parameter *value, const TagList *tags) override;
@@ -46,9 +41,7 @@ private:
 
     AutoParameter mHeldValue;
     ScriptValTreeWidget *mTree;
-    QLabel *mLabel;
     uint32 mRows = kDefaultRows;
-    LabelTexts mTexts;
 };
 
 } // namespace Orbane

@@ -19,8 +19,7 @@ namespace Orbane {
 
 namespace {
 
-// The class layout description, read when the first instance is made.
-ScriptVal gLayout;
+constexpr const char *kLayoutItem = "Controls.Slider.Layout";
 
 const char *const kCaptionNames[3] = {"minlabel", "midlabel", "maxlabel"};
 // Each caption keeps to its end of the track, the middle one centred,
@@ -31,13 +30,12 @@ const Qt::Alignment kCaptionAlign[3] = {Qt::AlignLeft | Qt::AlignVCenter, Qt::Al
 } // namespace
 
 SliderControl::SliderControl(const Registry *reg, const ScriptVal &args, const TagList &tags)
-    : InputControl(reg, args, tags), mLabel(new ElideLabel(this)), mEdit(new TimeCodeEdit(this)),
+    : LabelledInputControl(reg, args, tags), mEdit(new TimeCodeEdit(this)),
       mSlider(new CustomSlider), mCaptions{new QLabel(this), new QLabel(this), new QLabel(this)}
 {
     // The slider is made without a parent, as every painted widget is.
     mSlider->setParent(this);
     mSlider->SetOwner(this);
-    mLabel->setObjectName("label");
     mEdit->setObjectName("edit");
     mSlider->setObjectName("slider");
     connect(mSlider, SIGNAL(ValueChanged(float64)), this, SLOT(OnValueChanged(float64)));
@@ -46,7 +44,6 @@ SliderControl::SliderControl(const Registry *reg, const ScriptVal &args, const T
     connect(mEdit, SIGNAL(textEdited(QString)), this, SLOT(OnValueEdit()));
     // Dragging the edit box sideways drives the slider.
     mSlider->AttachEdit(mEdit);
-    RegisterChild("label", mLabel);
     RegisterChild("edit", mEdit);
     RegisterChild("slider", mSlider);
     for (int32 i = 0; i < 3; ++i) {
@@ -55,8 +52,9 @@ SliderControl::SliderControl(const Registry *reg, const ScriptVal &args, const T
         mCaptions[i]->hide();
         RegisterChild(kCaptionNames[i], mCaptions[i]);
     }
-    if (gLayout.IsNil())
-        gLayout = ReadLayoutItem("Controls.Slider.Layout");
+    Label()->setFocusProxy(mSlider);
+    AddAttrRows();
+    ClassLayout(kLayoutItem);
 }
 
 SliderControl::~SliderControl() = default;
@@ -87,41 +85,22 @@ const char *SliderControl::KnobImageName(int32 style, bool held)
 
 // ---- attributes ----
 
-bool SliderControl::CopyAttr(Tag tag, void *out)
+void SliderControl::AddAttrRows()
 {
-    if (!out)
-        return InputControl::CopyAttr(tag, out);
-    const float64 *number = tag == SLA_MinAllowed   ? &mAllowedLow
-                            : tag == SLA_MaxAllowed ? &mAllowedHigh
-                            : tag == SLA_MinScale   ? &mScaleLow
-                            : tag == SLA_MaxScale   ? &mScaleHigh
-                            : tag == SLA_Default    ? &mDefault
-                            : tag == SLA_Centre     ? &mCentre
-                                                    : nullptr;
-    const int32 *integer = tag == IC_TickFreq         ? &mTickCount
-                           : tag == SLA_StepCount     ? &mStepCount
-                           : tag == SLA_DecimalPlaces ? &mPlaces
-                           : tag == SLA_KnobStyle     ? &mKnobStyle
-                                                      : nullptr;
-    if (number)
-        *static_cast<float64 *>(out) = *number;
-    else if (integer)
-        *static_cast<int32 *>(out) = *integer;
-    else
-        return InputControl::CopyAttr(tag, out);
-    // False: the value was supplied.
-    return false;
-}
-
-bool SliderControl::GetAttrsTagList(TagList &tags) const
-{
-    InputControl::GetAttrsTagList(tags);
-    mTexts.AddTo(tags);
-    tags.Set(IC_TickFreq, mTickCount);
-    tags.Set(SLCS_LowName, mLowText);
-    tags.Set(SLCS_MidName, mMidText);
-    tags.Set(SLCS_HighName, mHighText);
-    return true;
+    for (const auto &[tag, field] : {std::pair<Tag, const float64 *>{SLA_MinAllowed, &mAllowedLow},
+                                     {SLA_MaxAllowed, &mAllowedHigh},
+                                     {SLA_MinScale, &mScaleLow},
+                                     {SLA_MaxScale, &mScaleHigh},
+                                     {SLA_Default, &mDefault},
+                                     {SLA_Centre, &mCentre}})
+        AddAttr(tag, field, Attr_Copy);
+    AddAttr(IC_TickFreq, &mTickCount, Attr_CopyAndList);
+    AddAttr(SLA_StepCount, &mStepCount, Attr_Copy);
+    AddAttr(SLA_DecimalPlaces, &mPlaces, Attr_Copy);
+    AddAttr(SLA_KnobStyle, &mKnobStyle, Attr_Copy);
+    ListAttr(SLCS_LowName, &mLowText);
+    ListAttr(SLCS_MidName, &mMidText);
+    ListAttr(SLCS_HighName, &mHighText);
 }
 
 bool SliderControl::SetAttrsTagList(Input *input, const TagList &tags)
@@ -131,10 +110,10 @@ bool SliderControl::SetAttrsTagList(Input *input, const TagList &tags)
         ReadOwnAttrs(input, tags);
     else
         InputControl::SetAttrsTagList(input, tags);
-    mTexts.Take(tags);
+    TakeTexts(tags);
     if (IsDisabled() != wasDisabled)
-        mTexts.changed = true;
-    if (mTexts.changed || mKnobStyleChanged)
+        MarkTextsChanged();
+    if (TextsChanged() || mKnobStyleChanged)
         NotifyChanged(nullptr, nullptr, nullptr);
     else if (IsOpen())
         mSlider->Redraw(true);
@@ -194,7 +173,7 @@ void SliderControl::ReadCaptions(const TagList &tags)
         const OrbString text(tags.GetString(ids[i], ""));
         if (text != *texts[i]) {
             *texts[i] = text;
-            mTexts.changed = true;
+            MarkTextsChanged();
         }
     }
 }
@@ -239,11 +218,10 @@ void SliderControl::PassToSlider()
 
 bool SliderControl::AddInput(Input *input, const TagList *tags)
 {
-    if (!InputControl::AddInput(input, tags))
+    if (!LabelledInputControl::AddInput(input, tags))
         return false;
     mInputIndex = input->GetAttrs().GetInt(SLA_InputIndex, 0);
-    mTexts.Read(input);
-    mLabel->setText(QString::fromStdString(mTexts.label.str()));
+    Label()->setText(QString::fromStdString(GetLabelTexts().label.str()));
     const AutoParameter now(input, GetCurrentTime());
     if (now) {
         NotifyChanged(input, now.get(), nullptr);
@@ -254,30 +232,24 @@ bool SliderControl::AddInput(Input *input, const TagList *tags)
 
 bool SliderControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
 {
-    if (!InputControl::Open(host, rect, tags))
+    if (!LabelledInputControl::Open(host, rect, tags))
         return false;
     for (QWidget *child :
-         {static_cast<QWidget *>(mLabel), static_cast<QWidget *>(mEdit), static_cast<QWidget *>(mCaptions[0]),
+         {static_cast<QWidget *>(Label()), static_cast<QWidget *>(mEdit), static_cast<QWidget *>(mCaptions[0]),
           static_cast<QWidget *>(mCaptions[1]), static_cast<QWidget *>(mCaptions[2])})
         child->setFont(GetControlFont());
-    mLabel->setElideMode(ElideLabel::Elide_Right);
-    mLabel->setFocusProxy(mSlider);
     if (GetCurrentInput()) {
         const AutoNumber now(GetCurrentInput(), GetCurrentTime());
         if (now)
             mValue = now->Value;
     }
-    ShowTexts();
     ApplyKnobStyle();
     mEdit->SetValue(mValue, mPlaces);
     mSlider->SetValue(mValue, false);
-    mLabel->show();
+    Label()->show();
     mEdit->show();
     mSlider->show();
-    CreateLayout(gLayout, true, nullptr);
-    if (Layout::LayoutObj *where = FindLayoutObj("expression"); where && where->AsContainer())
-        CreateExpressionEdit(where->AsContainer(), 0);
-    mTexts.changed = false;
+    PlaceChildren(ClassLayout(kLayoutItem), true);
     mKnobStyleChanged = false;
     return true;
 }
@@ -285,7 +257,7 @@ bool SliderControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
 bool SliderControl::NotifyChanged(Input *input, Parameter *value, const TagList *tags)
 {
     if (!value)
-        return InputControl::NotifyChanged(input, value, tags);
+        return LabelledInputControl::NotifyChanged(input, value, tags);
     const auto *number = dynamic_cast<const Number *>(value);
     if (!number)
         return true;
@@ -295,7 +267,7 @@ bool SliderControl::NotifyChanged(Input *input, Parameter *value, const TagList 
     if (!HasValueChanged(mIntegerDisplay && !mTimeDisplay, number->Value, mValue, mStep * 0.5))
         return true;
     mValue = number->Value;
-    return InputControl::NotifyChanged(input, value, tags);
+    return LabelledInputControl::NotifyChanged(input, value, tags);
 }
 
 bool SliderControl::UpdateDisplay(Input *input, const TagList *tags)
@@ -309,18 +281,13 @@ bool SliderControl::UpdateDisplay(Input *input, const TagList *tags)
             ApplyKnobStyle();
             mKnobStyleChanged = false;
         }
-        if (mTexts.changed) {
-            ShowTexts();
-            update();
-            mTexts.changed = false;
-        }
     }
-    return InputControl::UpdateDisplay(input, tags);
+    return LabelledInputControl::UpdateDisplay(input, tags);
 }
 
 void SliderControl::ShowTexts()
 {
-    mLabel->setText(QString::fromStdString(mTexts.label.str()));
+    LabelledInputControl::ShowTexts();
     const OrbString *texts[3] = {&mLowText, &mMidText, &mHighText};
     bool anyCaption = false;
     for (int32 i = 0; i < 3; ++i) {
@@ -342,12 +309,12 @@ void SliderControl::ApplyKnobStyle()
 bool SliderControl::OnDisconnect(Input *input, const TagList *tags)
 {
     WriteOnDisconnect(input, mValue);
-    return InputControl::OnDisconnect(input, tags);
+    return LabelledInputControl::OnDisconnect(input, tags);
 }
 
 Input *SliderControl::GetInputFrom(const QWidget *child) const
 {
-    return child == mEdit ? InputControl::GetInputFrom(child) : nullptr;
+    return child == mEdit ? LabelledInputControl::GetInputFrom(child) : nullptr;
 }
 
 // ---- edits ----
@@ -409,7 +376,7 @@ void SliderControl::OnOK()
     // places than the Input holds.
     if (typed)
         ApplyEdit();
-    InputControl::OnOK();
+    LabelledInputControl::OnOK();
     UpdateDisplay(nullptr, nullptr);
 }
 

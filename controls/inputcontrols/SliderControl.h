@@ -1,7 +1,7 @@
 #pragma once
 
-#include "orbane/InputControl.h"
-#include "orbane/LabelTexts.h"
+#include "framework/LabelledInputControl.h"
+
 #include "orbane/OrbString.h"
 
 #include <limits>
@@ -11,14 +11,13 @@ class QLabel;
 namespace Orbane {
 
 class CustomSlider;
-class ElideLabel;
 class TimeCodeEdit;
 
 // Shows a number Input as a label, an edit box and the painted number
 // slider, with up to three captions under the slider. Values the user
 // drags or types are rounded to the Input's decimal places before they are
 // written; the control shows what the host notifies back, not what it wrote.
-class SliderControl : public InputControl
+class SliderControl : public LabelledInputControl
 {
     Q_OBJECT
 public:
@@ -61,8 +60,6 @@ public:
     ~SliderControl() override;
 
     std::size_t SizeOf() const override { return sizeof(SliderControl); }
-    bool CopyAttr(Tag tag, void *out) override;
-    bool GetAttrsTagList(TagList &tags) const override;
 
     using InputControl::SetAttrsTagList;
     bool SetAttrsTagList(Input *input, const TagList &tags) override;
@@ -83,6 +80,10 @@ public:
     int32 GetDecimalPlaces() const noexcept { return mPlaces; }
     int32 GetInputIndex() const noexcept { return mInputIndex; }
 
+protected:
+    // The label and the captions under the track.
+    void ShowTexts() override;
+
 public slots:
     // Enter in the edit box, or the box losing focus: what was typed is applied.
     void OnOK() override;
@@ -93,6 +94,7 @@ private slots:
     void OnValueEdit();
 
 private:
+    void AddAttrRows();
     void ReadOwnAttrs(Input *input, const TagList &tags);
     void ReadRanges(const TagList &tags);
     void ReadCaptions(const TagList &tags);
@@ -100,7 +102,6 @@ private:
     void PassToEdit();
     void PassToSlider();
     void ApplyKnobStyle();
-    void ShowTexts();
     void ApplyEdit();
     // Rounds as the settings say and writes where it changed the Input.
     void WriteValue(float64 value);
@@ -123,7 +124,6 @@ private:
     bool mSliderDisabled = false;
     int32 mKnobStyle = 0;
     bool mKnobStyleChanged = false;
-    LabelTexts mTexts;
     bool mValueReceived = false;
     int32 mInputIndex = 0;
     OrbString mLowText;
@@ -131,7 +131,6 @@ private:
     OrbString mHighText;
     const QWidget *mPendingEdit = nullptr;
 
-    ElideLabel *mLabel;
     TimeCodeEdit *mEdit;
     CustomSlider *mSlider;
     QLabel *mCaptions[3];

@@ -156,13 +156,9 @@ public:
     // not evaluate for one of them.
     bool SetExpressions(const char *text, const TagList *tags);
 
-    // The class layout description in the look-pack item `itemName` (key 1
-    // of its table), nil where there is none. Controls keep it in a static
-    // of their class and read it once.
+    // The layout description in the look-pack item `itemName` (key 1 of its
+    // table), nil where there is none.
     static ScriptVal ReadLayoutItem(const char *itemName);
-    // How often the item was read, by ReadLayoutItem or LoadLayout, in this
-    // process: tests check that a class reads its description once.
-    static int32 LayoutReadCount(const char *itemName);
 
     // Does a notified value differ from the one shown? With integer display
     // two values that round to the same integer are the same; otherwise they

@@ -71,10 +71,8 @@ enum InputTag : Tag
     INPA_InputControl = 0x88020010,  // class ID of an inspector control that shows the Input (repeatable)
     INPA_PreviewControl = 0x88020011, // class ID of a viewer overlay that edits the Input (repeatable)
     INPA_LayoutHeight = 0x10020007,  // a layout object's height
-    INPA_IDItem = 0x88030000,        // add an item by identifier (repeatable)
     LINKS_Name = 0x30040000,         // label text
     LINKS_SecondName = 0x30040001,   // second label text
-    LINKS_AddItem = 0x38040000,      // add an item by name (repeatable)
 };
 
 } // namespace Orbane

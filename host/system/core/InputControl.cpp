@@ -14,28 +14,11 @@
 
 #include <algorithm>
 #include <cmath>
-#include <map>
-#include <mutex>
 #include <string>
 
 namespace Orbane {
 
 const OrbID InputControl::ClassID("InputControl");
-
-namespace {
-
-// Reads of layout items, by item name; the UI thread is the only writer, the
-// lock keeps a test thread's look honest.
-std::mutex gReadLock;
-std::map<std::string, int32> gLayoutReads;
-
-void CountLayoutRead(const char *itemName)
-{
-    std::lock_guard<std::mutex> lock(gReadLock);
-    ++gLayoutReads[itemName ? itemName : ""];
-}
-
-} // namespace
 
 _InputControl::_InputControl(const Registry *reg, const ScriptVal &args, const TagList &tags) : Object(reg, args, tags)
 {
@@ -318,16 +301,8 @@ ScriptVal InputControl::ReadLayoutItem(const char *itemName)
 {
     if (!itemName)
         return ScriptVal();
-    CountLayoutRead(itemName);
     const ScriptVal *description = LookPackItem(OrbID(itemName)).GetItemData().FindKeyConst(ScriptVal(1));
     return description ? *description : ScriptVal();
-}
-
-int32 InputControl::LayoutReadCount(const char *itemName)
-{
-    std::lock_guard<std::mutex> lock(gReadLock);
-    const auto it = gLayoutReads.find(itemName ? itemName : "");
-    return it == gLayoutReads.end() ? 0 : it->second;
 }
 
 bool InputControl::HasValueChanged(bool integer, float64 value, float64 current, float64 tolerance)

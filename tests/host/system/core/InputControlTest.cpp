@@ -51,7 +51,6 @@ private slots:
     void expressionWrites_data();
     void expressionWrites();
     void disabledAttribute();
-    void loadLayoutCountsReads();
 };
 
 void InputControlTest::bindsUntilDisconnect()
@@ -261,18 +260,6 @@ void InputControlTest::disabledAttribute()
     QVERIFY(c->SetAttrsTagList(TagList{{ICA_Disabled, 0}}));
     c->UpdateDisplay(nullptr, nullptr);
     QVERIFY(c->isEnabled());
-}
-
-void InputControlTest::loadLayoutCountsReads()
-{
-    const int32 before = InputControl::LayoutReadCount("Controls.Default.Layout");
-    ToolFixture f;
-    Bound(f, {f.AddNumber("A", 0.0)});
-    Bound(f, {f.AddNumber("B", 0.0)});
-    QCOMPARE(InputControl::LayoutReadCount("Controls.Default.Layout"), before + 2);
-    QVERIFY(InputControl::ReadLayoutItem("Controls.Default.Layout").IsTable());
-    QVERIFY(InputControl::ReadLayoutItem(nullptr).IsNil());
-    QCOMPARE(InputControl::LayoutReadCount("Controls.Default.Layout"), before + 3);
 }
 
 QTEST_MAIN(InputControlTest)

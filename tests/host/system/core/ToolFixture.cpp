@@ -10,6 +10,7 @@
 #include <QTest>
 
 #include <algorithm>
+#include <dlfcn.h>
 
 namespace Orbane {
 namespace Test {
@@ -96,6 +97,13 @@ void ToolFixture::Destroy(InputControl *control)
 bool ToolFixture::LoadControls(std::string *error)
 {
     return LoadControlModule(error);
+}
+
+int32 ToolFixture::LayoutReadCount(const char *itemName)
+{
+    using Count = int32 (*)(const char *);
+    const auto count = reinterpret_cast<Count>(dlsym(RTLD_DEFAULT, "orbanecontrols_LayoutReadCount"));
+    return count ? count(itemName) : -1;
 }
 
 float64 ToolFixture::NumberOf(const Input *input) const

@@ -41,6 +41,9 @@ public:
     // The control library as the host loads it: dlopen of ORBANE_CONTROLS
     // with RTLD_NOW | RTLD_GLOBAL, once per process.
     static bool LoadControls(std::string *error);
+    // How often the loaded control library read the class layout item
+    // `itemName` from the look pack; -1 where the library is not loaded.
+    static int32 LayoutReadCount(const char *itemName);
     // Current value of a Number Input at the document's time.
     float64 NumberOf(const Input *input) const;
 

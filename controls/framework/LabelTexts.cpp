@@ -1,4 +1,4 @@
-#include "orbane/LabelTexts.h"
+#include "framework/LabelTexts.h"
 
 #include "orbane/InputControl.h"
 #include "orbane/TagList.h"

@@ -1,4 +1,4 @@
-#include "framework/PolyLineTags.h"
+#include "polyline/PolyLineTags.h"
 
 #include "framework/TagTable.h"
 
