@@ -68,7 +68,11 @@ void PointControlTest::pickTolerance()
     ViewerFixture f;
     Input *p = f.AddPoint("P", 0.5, 0.5, PointAttrs());
     QVERIFY(f.Show());
+    // Logical pixels at any device pixel ratio (a second run is at 2).
+    const qreal dpr = qEnvironmentVariableIsSet("QT_SCALE_FACTOR") ? qgetenv("QT_SCALE_FACTOR").toDouble() : 1.0;
+    QCOMPARE(f.viewer.devicePixelRatioF(), dpr);
     QCOMPARE(f.viewer.Info().PickTolerance, 6);
+    QCOMPARE(f.viewer.Info().HandleScale, 1.0f);
     const QPoint from = f.At({0.5, 0.5}, offset);
     f.Hover(from);
     const uint64 inputAt = f.OverlayOf(p)->ControlCommand(&f.viewer.Info(), CCMD_GetInputAt, 0, nullptr);
