@@ -44,6 +44,7 @@ private slots:
     void nudge();
     void pressOnLinkedHandleMovesNothing();
     void lineToPreviousPoint();
+    void hoverClaimsAndHighlights();
 };
 
 void PointControlTest::initTestCase()
@@ -171,6 +172,24 @@ void PointControlTest::lineToPreviousPoint()
     shot = f.Grab();
     QVERIFY(Lit(shot, f.At({0.75, 0.5})));
     QVERIFY(Dark(shot, f.At({0.5, 0.625})));
+}
+
+void PointControlTest::hoverClaimsAndHighlights()
+{
+    ViewerFixture f;
+    Input *p = f.AddPoint("P", 0.5, 0.5, PointAttrs());
+    QVERIFY(f.Show());
+    const QPoint edge = f.At({0.5, 0.5}, QPoint(2, 0));
+    // The overlay's light grey, then the warm highlight while the mouse is over it.
+    QVERIFY(qBlue(f.Grab().pixel(edge)) > 200);
+    f.Hover(f.At({0.5, 0.5}, QPoint(5, 5)));
+    QCOMPARE(f.viewer.HoverControl(), f.OverlayOf(p));
+    QImage shot = f.Grab();
+    QVERIFY2(qRed(shot.pixel(edge)) > 200 && qBlue(shot.pixel(edge)) < 100,
+             qPrintable(QString::number(shot.pixel(edge), 16)));
+    f.Hover(f.At({0.5, 0.5}, QPoint(6, 0)));
+    QCOMPARE(f.viewer.HoverControl(), nullptr);
+    QVERIFY(qBlue(f.Grab().pixel(edge)) > 200);
 }
 
 QTEST_MAIN(PointControlTest)
