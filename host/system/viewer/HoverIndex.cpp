@@ -66,13 +66,12 @@ HoverIndex::Result HoverIndex::Hover(const std::vector<PreviewControl *> &overla
             Refresh(mEntries[std::size_t(i)], info);
     Collect(info.MouseInViewer(), mCandidates);
     Result result;
-    std::vector<PreviewControl *> sticky;
+    mSticky.clear();
     for (const int32 i : mCandidates) {
         PreviewControl *overlay = mEntries[std::size_t(i)].overlay;
         if (overlay->IsActive() && Ask(overlay, info, result))
-            sticky.push_back(overlay);
+            mSticky.push_back(overlay);
     }
-    mSticky = std::move(sticky);
     return result;
 }
 
