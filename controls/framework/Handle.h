@@ -1,5 +1,7 @@
 #pragma once
 
+#include "framework/HandleHit.h"
+
 #include "orbane/OrbPointT.h"
 #include "orbane/Types.h"
 
@@ -63,17 +65,6 @@ struct Handle
     uint32 part = 1;        // non-zero
     int32 item = -1;
     int32 priority = HP_Point;
-};
-
-// What a hit test found: the part and item of the winning handle, or part 0.
-struct HandleHit
-{
-    uint32 part = 0;
-    int32 item = -1;
-
-    explicit operator bool() const noexcept { return part != 0; }
-    bool operator==(const HandleHit &o) const noexcept { return part == o.part && item == o.item; }
-    bool operator!=(const HandleHit &o) const noexcept { return !(*this == o); }
 };
 
 } // namespace Orbane
