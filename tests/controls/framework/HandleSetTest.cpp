@@ -32,10 +32,20 @@ TEST(HandleSetTest, EveryPartOfARectangle)
         OrbPoint mouse;
         uint32 part;
     } rows[] = {
-        {{52, 0}, 1},     {{0, 27}, 2},   {{-50, 5}, 4}, {{10, -35}, 8}, {{50, 30}, 3}, {{-52, 31}, 6},
-        {{-46, -26}, 12}, {{53, -33}, 9}, {{0, 0}, 16},  {{43, 0}, 16},  {{47, 0}, 1}, // edge above body where both are
-                                                                                       // hit
-        {{57, 0}, 0},     {{0, 40}, 0},
+        {{52, 0}, 1},
+        {{0, 27}, 2},
+        {{-50, 5}, 4},
+        {{10, -35}, 8},
+        {{50, 30}, 3},
+        {{-52, 31}, 6},
+        {{-46, -26}, 12},
+        {{53, -33}, 9},
+        {{0, 0}, 16},
+        {{43, 0}, 16},
+        {{47, 0}, 1}, // edge above body where both are
+                      // hit
+        {{57, 0}, 0},
+        {{0, 40}, 0},
     };
     const HandleSet set = Rectangle();
     for (const auto &row : rows) {
