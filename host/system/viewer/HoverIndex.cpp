@@ -42,6 +42,13 @@ bool Ask(PreviewControl *overlay, PreviewInfo &info, HoverIndex::Result &result)
     return claims || (answer & 2);
 }
 
+// A switched-off overlay keeps the hover it had: it stays to be asked once
+// it is back.
+bool IsIn(const std::vector<PreviewControl *> &list, const PreviewControl *overlay)
+{
+    return std::find(list.begin(), list.end(), overlay) != list.end();
+}
+
 } // namespace
 
 void HoverIndex::Touch(const PreviewControl *overlay)
@@ -66,10 +73,11 @@ HoverIndex::Result HoverIndex::Hover(const std::vector<PreviewControl *> &overla
             Refresh(mEntries[std::size_t(i)], info);
     Collect(info.MouseInViewer(), mCandidates);
     Result result;
+    mPrevSticky.swap(mSticky);
     mSticky.clear();
     for (const int32 i : mCandidates) {
         PreviewControl *overlay = mEntries[std::size_t(i)].overlay;
-        if (overlay->IsActive() && Ask(overlay, info, result))
+        if (overlay->IsActive() ? Ask(overlay, info, result) : IsIn(mPrevSticky, overlay))
             mSticky.push_back(overlay);
     }
     return result;

@@ -79,7 +79,8 @@ private:
     std::unordered_map<const PreviewControl *, int32> mSlots;
     std::vector<int32> mUnbounded;
     std::vector<int32> mStale;
-    std::vector<PreviewControl *> mSticky; // claimed or asked for a redraw last time
+    std::vector<PreviewControl *> mSticky;     // claimed or asked for a redraw last time
+    std::vector<PreviewControl *> mPrevSticky; // scratch
 
     // The grid: cell (col, row) lists mCellItems[mCellStart[c] .. mCellStart[c + 1]).
     OrbRect mArea;

@@ -120,6 +120,7 @@ private slots:
     void initTestCase();
     void agreesWithThePlainWalk_data();
     void agreesWithThePlainWalk();
+    void switchedOffHoverIsLetGoWhenBack();
 
 private:
     Registry mTestOverlayClass;
@@ -177,6 +178,26 @@ void HoverIndexTest::agreesWithThePlainWalk()
     // The index earns its keep: far fewer overlays are asked.
     if (count >= 100)
         QVERIFY2(askedIndexed * 4 < askedPlain, qPrintable(QString("%1 of %2").arg(askedIndexed).arg(askedPlain)));
+}
+
+// An overlay switched off keeps its hover; back on, away from the mouse, it
+// must still be asked to let go of it.
+void HoverIndexTest::switchedOffHoverIsLetGoWhenBack()
+{
+    Scene indexed(false, {{0.25, 0.5}, {0.75, 0.5}}, {false, false});
+    Scene plain(true, {{0.25, 0.5}, {0.75, 0.5}}, {false, false});
+    for (Scene *s : {&indexed, &plain}) {
+        QVERIFY(s->f.Show());
+        s->Collect();
+        s->f.Hover(s->f.At({0.25, 0.5}));
+        s->Overlay(0)->SetActive(0, nullptr);
+        s->f.Hover(s->f.At({0.75, 0.5}));
+        s->Overlay(0)->SetActive(1, nullptr);
+        s->f.Hover(s->f.At({0.75, 0.5}, QPoint(2, 0)));
+    }
+    QCOMPARE(plain.Overlay(0)->hover, false);
+    QCOMPARE(indexed.Overlay(0)->hover, false);
+    QCOMPARE(indexed.Overlay(0)->redraws, plain.Overlay(0)->redraws);
 }
 
 QTEST_MAIN(HoverIndexTest)
