@@ -1,6 +1,7 @@
 // A viewer with many point overlays (a chain, each joined to the one before)
 // against a naive QPainter loop that draws the same squares and lines: the
-// cost of a repaint, and of finding the handle under a press.
+// cost of a repaint, and of finding the handle under a press; and hovering
+// with the viewer's spatial index against the plain walk over every overlay.
 #include "BenchModule.h"
 
 #include "orbane/AutoParam.h"
@@ -16,6 +17,7 @@
 #include <QMouseEvent>
 #include <QPainter>
 
+#include <chrono>
 #include <cmath>
 #include <memory>
 #include <vector>
@@ -185,10 +187,48 @@ void BM_NaiveLoop_HitTest(benchmark::State &state)
     state.SetItemsProcessed(state.iterations() * state.range(0));
 }
 
+// Hovering over the viewer along a fixed path that passes handles (so that
+// hovers claim and let go), with the spatial index and with the plain walk
+// that asks every overlay, in turns within the same run. The row's time is
+// the indexed hover's; `index/plain` is the ratio of the two.
+void BM_Viewer_HoverIndexVsPlainWalk(benchmark::State &state)
+{
+    if (!LoadControlModule())
+        return state.SkipWithError("the control library did not load");
+    const int count = int(state.range(0));
+    ViewerRig rig(count);
+    std::vector<QPointF> path;
+    const std::vector<OrbPoint> points = Points(count);
+    for (int i = 0; i < 64; ++i)
+        path.push_back(rig.viewer.ImageToWidget(points[std::size_t(i * 37 % count)]) + QPointF(i % 5 - 2, i % 3 - 1));
+    int64_t asked = 0;
+    const auto hoverPath = [&](bool plain) {
+        rig.viewer.SetPlainHover(plain);
+        const auto start = std::chrono::steady_clock::now();
+        for (const QPointF &at : path) {
+            SendMouse(&rig.viewer, QEvent::MouseMove, at, Qt::NoButton);
+            asked += plain ? 0 : rig.viewer.HoverAsked();
+        }
+        return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
+    };
+    double indexed = 0.0, plain = 0.0;
+    for (auto _ : state) {
+        const double t = hoverPath(false);
+        indexed += t;
+        plain += hoverPath(true);
+        state.SetIterationTime(t);
+    }
+    // The ratio and how many overlays an indexed hover asks on average.
+    state.counters["index/plain"] = plain > 0.0 ? indexed / plain : 0.0;
+    state.counters["asked"] = double(asked) / double(state.iterations() * int64_t(path.size()));
+    state.SetItemsProcessed(state.iterations() * int64_t(path.size()));
+}
+
 BENCHMARK(BM_Viewer_DrawPointOverlays)->Arg(100)->Arg(1000)->Unit(benchmark::kMicrosecond);
 BENCHMARK(BM_NaiveQPainter_DrawPoints)->Arg(100)->Arg(1000)->Unit(benchmark::kMicrosecond);
 BENCHMARK(BM_Viewer_PressHitTest)->Arg(100)->Arg(1000)->Unit(benchmark::kMicrosecond);
 BENCHMARK(BM_Viewer_HoverHitTest)->Arg(100)->Arg(1000)->Unit(benchmark::kMicrosecond);
 BENCHMARK(BM_NaiveLoop_HitTest)->Arg(100)->Arg(1000)->Unit(benchmark::kMicrosecond);
+BENCHMARK(BM_Viewer_HoverIndexVsPlainWalk)->Arg(10)->Arg(1000)->UseManualTime()->Unit(benchmark::kMicrosecond);
 
 } // namespace

@@ -3,22 +3,19 @@
 #include "framework/CrosshairTags.h"
 
 #include "orbane/AutoParam.h"
-#include "orbane/ControlCommands.h"
 #include "orbane/GPainter.h"
 #include "orbane/Input.h"
 #include "orbane/Point.h"
 #include "orbane/PreviewInfo.h"
-
-#include <algorithm>
-#include <cmath>
 
 namespace Orbane {
 
 using Graphics::GPainter;
 
 CrosshairControl::CrosshairControl(const Registry *reg, const ScriptVal &args, const TagList &tags)
-    : PreviewControl(reg, args, tags)
+    : HandleOverlay(reg, args, tags)
 {
+    EnableFade();
     CrosshairControl::SetAttrsTagList(nullptr, tags);
 }
 
@@ -41,7 +38,7 @@ bool CrosshairControl::CopyAttr(Tag tag, void *out)
         value = mGrabOffset.y;
         break;
     default:
-        return PreviewControl::CopyAttr(tag, out);
+        return HandleOverlay::CopyAttr(tag, out);
     }
     if (!out)
         return true;
@@ -76,7 +73,7 @@ bool CrosshairControl::SetAttrsTagList(Input *input, const TagList &tags)
     mGrabOffset.y = tags.GetDouble(PCA_GrabOffsetY, mGrabOffset.y);
     mHideWhileDragging = tags.GetInt(PCA_HideWhileDragging, mHideWhileDragging);
     UpdateDisplay(nullptr, nullptr);
-    return PreviewControl::SetAttrsTagList(input, tags);
+    return HandleOverlay::SetAttrsTagList(input, tags);
 }
 
 void CrosshairControl::NotifyChanged(Input *input, Parameter *value, const TagList *tags)
@@ -89,18 +86,17 @@ void CrosshairControl::NotifyChanged(Input *input, Parameter *value, const TagLi
             return;
         mValue = OrbPoint(point->X, point->Y);
     }
-    PreviewControl::NotifyChanged(input, value, tags);
+    HandleOverlay::NotifyChanged(input, value, tags);
 }
 
 bool CrosshairControl::OnDisconnect(Input *input, const TagList *tags)
 {
-    return PreviewControl::OnDisconnect(input, tags);
+    return HandleOverlay::OnDisconnect(input, tags);
 }
 
 void CrosshairControl::DrawControls(PreviewInfo *info, const TagList *tags)
 {
-    if (info->Highlight || mDragType == DRAG_Handle)
-        mFade = mDrawnFade = 1.0f;
+    SettleFade(*info);
     mDrawnPoint = mValue;
     GPainter *p = info->GetPainter();
     if (p && (info->DrawPass == 1 || info->DrawPass == 2) && mStyle < 5) {
@@ -109,7 +105,7 @@ void CrosshairControl::DrawControls(PreviewInfo *info, const TagList *tags)
         if (info->ShowDrag && info->HotControl == this && mStartGrab != OrbPoint())
             DrawCrosshair(*p, *info, at - mStartGrab);
     }
-    PreviewControl::DrawControls(info, tags);
+    HandleOverlay::DrawControls(info, tags);
 }
 
 DragType CrosshairControl::ControlDown(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
@@ -118,21 +114,20 @@ DragType CrosshairControl::ControlDown(PreviewInfo *info, const OrbPointI &mouse
         mGrabOffset = HandleOffset(*info);
         if (tags && (tags->GetLong(PCA_EventFlags, 0) & PEF_StartGrab) && mStartGrab == OrbPoint())
             mStartGrab = mGrabOffset;
-        const Zone zone = HitZone(mGrabOffset, info->PickTolerance, ArmReach * info->HandleScale, mStyle == 0);
-        mDragX = zone.x;
-        mDragY = zone.y;
-        if (zone.Hit()) {
+        const HandleHit hit = PressHit(*info);
+        Pick(hit);
+        if (hit) {
             mFollowOrig = mDrawnPoint;
             mDragType = DRAG_Handle;
             mPressPoint = info->TransformOut(Handle());
         }
     }
-    return PreviewControl::ControlDown(info, mouse, tags);
+    return HandleOverlay::ControlDown(info, mouse, tags);
 }
 
 void CrosshairControl::ControlMove(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
 {
-    PreviewControl::ControlMove(info, mouse, tags);
+    HandleOverlay::ControlMove(info, mouse, tags);
     const OrbPoint pointer(info->MouseX - mDisplayOffsetX, info->MouseY - mDisplayOffsetY);
     OrbPoint to = info->TransformIn(info->TransformOut(pointer) + mGrabOffset);
     const bool following = mFollowCursor && mDragType == DRAG_Linked;
@@ -142,9 +137,10 @@ void CrosshairControl::ControlMove(PreviewInfo *info, const OrbPointI &mouse, co
         return;
     if (mDragType == DRAG_Handle) {
         // An arm moves its own axis only.
-        if (!mDragX)
+        const Zone dragged = Dragged();
+        if (!dragged.x)
             to.x = mFollowOrig.x;
-        if (!mDragY)
+        if (!dragged.y)
             to.y = mFollowOrig.y;
         Write(to, tags);
         // What follows the mouse sees it held at its grab offset to the point.
@@ -164,40 +160,44 @@ void CrosshairControl::ControlUp(PreviewInfo *info, const OrbPointI &mouse, cons
         SetAttrsTagList(TagList{{PCA_FollowCursor, 0}});
     }
     mStartGrab = OrbPoint();
-    PreviewControl::ControlUp(info, mouse, tags);
-    mDragX = mDragY = 0;
+    HandleOverlay::ControlUp(info, mouse, tags);
 }
 
 uint64 CrosshairControl::ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags)
 {
+    // One image pixel on each axis: the width's on X, the height's on Y.
     uint64 result = 0;
     if (NudgeCommand(info, command, data, tags, mValue, 1.0 / info->ImageHeight, result))
         return result;
-    if (command == CCMD_GetInputAt) {
-        const Zone zone = HitZone(HandleOffset(*info), info->PickTolerance, ArmReach * info->HandleScale, mStyle == 0);
-        if (GetMainInput() && mStyle < 5 && zone.Hit())
-            return uint64(reinterpret_cast<uintptr_t>(GetMainInput()));
-    } else if (command == CCMD_HitTest) {
-        return HitTest(*info, data);
-    }
-    return PreviewControl::ControlCommand(info, command, data, tags);
+    return HandleOverlay::ControlCommand(info, command, data, tags);
 }
 
-CrosshairControl::Zone CrosshairControl::HitZone(OrbPoint d, float64 t, float64 reach, bool arms) noexcept
+void CrosshairControl::BuildHandles(const PreviewInfo &info, HandleSet &handles) const
 {
-    const bool inX = std::fabs(d.x) < t, inY = std::fabs(d.y) < t;
-    if (inX && inY)
-        return {true, true};
-    if (arms && inX && -reach < d.y && d.y < t)
-        return {false, true};
-    if (arms && inY && -reach < d.x && d.x < t)
-        return {true, false};
-    return {};
+    handles.Clear();
+    if (mStyle >= 5)
+        return;
+    const OrbPoint at = info.TransformOut(Handle());
+    handles.AddBox(at, {}, {}, PART_Centre, HP_Point);
+    if (mStyle != 0)
+        return;
+    // The arms' far ends take the tolerance only for hover.
+    handles.AddBox(at, {}, {0.0, ArmReach}, PART_Y, HP_Edge, HG_Left | HG_Right | HG_Bottom);
+    handles.AddBox(at, {}, {ArmReach, 0.0}, PART_X, HP_Edge, HG_Left | HG_Bottom | HG_Top);
 }
 
-float32 CrosshairControl::FadeAt(float64 distance) noexcept
+// Every hover outside a claimed spot also takes the grab offset, as a press
+// there would.
+HandleHit CrosshairControl::HoverHit(PreviewInfo &info)
 {
-    return float32(std::clamp(1.0 - (distance - 10.0) / 100.0, 0.5, 1.0));
+    if (mStyle < 5)
+        mGrabOffset = HandleOffset(info);
+    return HandleOverlay::HoverHit(info);
+}
+
+float64 CrosshairControl::FadeDistance(const PreviewInfo &info) const
+{
+    return HandleOffset(info).Length();
 }
 
 OrbPoint CrosshairControl::HandleOffset(const PreviewInfo &info) const
@@ -213,58 +213,26 @@ void CrosshairControl::Write(OrbPoint to, const TagList *tags)
     SetInputs(value.get(), GetCurrentTime(), 0, &valueTags);
 }
 
-// One image pixel on each axis: the width's on X, the height's on Y.
-uint64 CrosshairControl::HitTest(PreviewInfo &info, uint64 data)
-{
-    const uint8 oldX = mHoverX, oldY = mHoverY;
-    mHoverX = mHoverY = 0;
-    if (!(data & 1) && mStyle < 5) {
-        mGrabOffset = HandleOffset(info);
-        const float64 reach = ArmReach * info.HandleScale + info.PickTolerance;
-        const Zone zone = HitZone(mGrabOffset, info.PickTolerance, reach, mStyle == 0);
-        mHoverX = zone.x;
-        mHoverY = zone.y;
-        if (zone.Hit())
-            data |= 1;
-    }
-    if (!info.Highlight && mDragType != DRAG_Handle) {
-        mFade = FadeAt(HandleOffset(info).Length());
-        if (std::fabs(mFade - mDrawnFade) > 0.05f) {
-            mDrawnFade = mFade;
-            data |= 2;
-        }
-    } else {
-        if (mDrawnFade != 1.0f)
-            data |= 2;
-        mFade = mDrawnFade = 1.0f;
-    }
-    if (mHoverX != oldX || mHoverY != oldY)
-        data |= 2;
-    return data;
-}
-
 void CrosshairControl::DrawCrosshair(GPainter &p, const PreviewInfo &info, OrbPoint at)
 {
     if (mDragType == DRAG_Handle && mHideWhileDragging)
         return;
-    const bool dragging = mDragType == DRAG_Handle;
-    CrosshairGeometry::Hot hot;
-    hot.centre = (mHoverX && mHoverY) || (dragging && mDragX && mDragY);
-    hot.xArm = (mHoverX && !mHoverY) || (dragging && mDragX && !mDragY);
-    hot.yArm = (mHoverY && !mHoverX) || (dragging && mDragY && !mDragX);
+    const CrosshairGeometry::PartFills fills{HandleFill(info, PART_Centre), HandleFill(info, PART_X),
+                                             HandleFill(info, PART_Y)};
     mGeometry.Build(mStyle);
-    mGeometry.SetColors(info.GetColor(OrbColor()).Faded(mFade), info.GetShadow(OrbColor()).Faded(mFade), hot);
+    mGeometry.SetColors(fills, info.GetColor(OrbColor()).Faded(Fade()), HandleShadow(info));
     mGeometry.Bind(p);
     p.PushMatrix();
     p.Translate(at.x, at.y);
     p.Scale(info.HandleScale, info.HandleScale, 1.0);
     mGeometry.Draw(p);
     p.PopMatrix();
-    if (dragging && (mDragX || mDragY)) {
+    const Zone dragged = Dragged();
+    if (mDragType == DRAG_Handle && dragged.Hit()) {
         p.PushMatrix();
         p.Translate(mPressPoint.x, mPressPoint.y);
         p.Scale(info.HandleScale, info.HandleScale, 1.0);
-        mGeometry.DrawFeedback(p, mDragX, mDragY);
+        mGeometry.DrawFeedback(p, dragged.x, dragged.y);
         p.PopMatrix();
     }
     CrosshairGeometry::Unbind(p);

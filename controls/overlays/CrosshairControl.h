@@ -2,7 +2,7 @@
 
 #include "overlays/CrosshairGeometry.h"
 
-#include "orbane/PreviewControl.h"
+#include "framework/HandleOverlay.h"
 
 namespace Orbane {
 
@@ -13,16 +13,26 @@ class GPainter;
 // The handle of tool centres: a crosshair in one of five styles (CHC_Style).
 // Style 0 has an X arm and a Y arm that drag along one axis only. The
 // crosshair fades with the mouse's distance, can follow the cursor, and can
-// hide while it is dragged.
-class CrosshairControl : public PreviewControl
+// hide while it is dragged. Its handles are the centre (both axes) and, in
+// style 0, the two arms; a hover reaches a tolerance further along an arm
+// than a press does.
+class CrosshairControl : public HandleOverlay
 {
 public:
+    // Part bits of the handles: an arm moves its own axis, the centre both.
+    enum Part : uint32
+    {
+        PART_X = 1,
+        PART_Y = 2,
+        PART_Centre = PART_X | PART_Y,
+    };
     // The parts of the crosshair a mouse position is over.
     struct Zone
     {
         bool x = false;
         bool y = false;
         bool Hit() const noexcept { return x || y; }
+        static Zone Of(HandleHit hit) noexcept { return {(hit.part & PART_X) != 0, (hit.part & PART_Y) != 0}; }
     };
 
     CrosshairControl(const Registry *reg, const ScriptVal &args, const TagList &tags);
@@ -32,7 +42,7 @@ public:
     bool CopyAttr(Tag tag, void *out) override;
     bool GetAttrsTagList(TagList &tags) const override;
 
-    using PreviewControl::SetAttrsTagList;
+    using HandleOverlay::SetAttrsTagList;
     bool SetAttrsTagList(Input *input, const TagList &tags) override;
     void NotifyChanged(Input *input, Parameter *value, const TagList *tags) override;
     bool OnDisconnect(Input *input, const TagList *tags) override;
@@ -48,25 +58,23 @@ public:
     OrbPoint DrawnPoint() const { return mDrawnPoint; }
     OrbPoint FollowOrig() const { return mFollowOrig; }
     OrbPoint StartGrab() const { return mStartGrab; }
-    Zone Dragged() const { return {mDragX != 0, mDragY != 0}; }
-    Zone Hovered() const { return {mHoverX != 0, mHoverY != 0}; }
-    float32 Fade() const { return mFade; }
+    Zone Dragged() const { return Zone::Of(Handles().PickedHit()); }
+    Zone Hovered() const { return Zone::Of(Handles().PoisedHit()); }
 
     // How far the arms reach from the centre, in handle pixels.
     static constexpr float64 ArmReach = 23.0;
-    // The part hit at `offset` (handle minus mouse, viewer units): the
-    // centre within `tolerance` on both axes; with `arms`, the Y arm up to
-    // `reach` above it and the X arm up to `reach` to its right.
-    static Zone HitZone(OrbPoint offset, float64 tolerance, float64 reach, bool arms) noexcept;
-    // Opacity at `distance` viewer units from the mouse: full within 10,
-    // half from 60 on.
-    static float32 FadeAt(float64 distance) noexcept;
+
+protected:
+    // The centre: within the tolerance on both axes. In style 0 the Y arm
+    // reaches ArmReach above it and the X arm ArmReach to its right.
+    void BuildHandles(const PreviewInfo &info, HandleSet &handles) const override;
+    HandleHit HoverHit(PreviewInfo &info) override;
+    float64 FadeDistance(const PreviewInfo &info) const override;
 
 private:
     OrbPoint Handle() const { return {mValue.x + mDisplayOffsetX, mValue.y + mDisplayOffsetY}; }
     OrbPoint HandleOffset(const PreviewInfo &info) const;
     void Write(OrbPoint to, const TagList *tags);
-    uint64 HitTest(PreviewInfo &info, uint64 data);
     void DrawCrosshair(Graphics::GPainter &p, const PreviewInfo &info, OrbPoint at);
 
     OrbPoint mValue{0.5, 0.5};
@@ -78,10 +86,7 @@ private:
     OrbPoint mFollowOrig;
     OrbPoint mGrabOffset;
     OrbPoint mStartGrab;
-    uint8 mDragX = 0, mDragY = 0;
-    uint8 mHoverX = 0, mHoverY = 0;
     OrbPoint mPressPoint;
-    float32 mFade = 0.5f, mDrawnFade = 0.5f;
 
     CrosshairGeometry mGeometry;
 };

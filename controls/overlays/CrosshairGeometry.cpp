@@ -22,8 +22,6 @@ enum Pair : int32
     PAIR_Feedback,
 };
 
-// The highlight of the part under the mouse or being dragged.
-constexpr GColor kHot(1.0f, 0.8f, 0.25f);
 // The guides of a one-axis drag reach past any viewer.
 constexpr float64 kGuide = 4000.0;
 
@@ -102,16 +100,14 @@ void CrosshairGeometry::Build(int32 style)
     }
 }
 
-void CrosshairGeometry::SetColors(const GColor &fill, const GColor &shadow, Hot hot)
+void CrosshairGeometry::SetColors(const PartFills &fills, const GColor &fill, const GColor &shadow)
 {
-    if (!mColors.empty() && fill == mFill && shadow == mShadow && hot == mHot)
+    if (!mColors.empty() && fills == mFills && fill == mFill && shadow == mShadow)
         return;
+    mFills = fills;
     mFill = fill;
     mShadow = shadow;
-    mHot = hot;
-    const GColor lit = kHot.WithAlpha(fill.a);
-    mColors = {hot.centre ? lit : fill, shadow, hot.xArm ? lit : fill, shadow,
-               hot.yArm ? lit : fill,   shadow, fill.Faded(0.5f),      shadow.Faded(0.5f)};
+    mColors = {fills.centre, shadow, fills.xArm, shadow, fills.yArm, shadow, fill.Faded(0.5f), shadow.Faded(0.5f)};
     ++mUploads;
 }
 

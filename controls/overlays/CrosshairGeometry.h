@@ -18,18 +18,22 @@ class GPainter;
 class CrosshairGeometry
 {
 public:
-    // The parts that take the highlight.
-    struct Hot
+    // The fill colours of the parts: the highlight of a poised or picked
+    // part is the overlay's to choose.
+    struct PartFills
     {
-        bool centre = false;
-        bool xArm = false;
-        bool yArm = false;
-        bool operator==(const Hot &o) const noexcept { return centre == o.centre && xArm == o.xArm && yArm == o.yArm; }
+        Graphics::GColor centre, xArm, yArm;
+        bool operator==(const PartFills &o) const noexcept
+        {
+            return centre == o.centre && xArm == o.xArm && yArm == o.yArm;
+        }
     };
 
     // Styles 0 to 4 have shapes; others draw nothing.
     void Build(int32 style);
-    void SetColors(const Graphics::GColor &fill, const Graphics::GColor &shadow, Hot hot);
+    // `fill` and `shadow` are the overlay's own; the drag feedback is drawn
+    // in them at half strength.
+    void SetColors(const PartFills &fills, const Graphics::GColor &fill, const Graphics::GColor &shadow);
     // How often the colour pairs were made: once per change of their inputs.
     int32 ColorUploads() const { return mUploads; }
 
@@ -49,7 +53,7 @@ private:
     std::vector<uint32> mIndices;
     std::vector<Graphics::GColor> mColors; // (fill, shadow) per part
     Graphics::GColor mFill, mShadow;
-    Hot mHot;
+    PartFills mFills;
     int32 mUploads = 0;
 };
 

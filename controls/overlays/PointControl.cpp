@@ -3,18 +3,15 @@
 #include "framework/PointTags.h"
 
 #include "orbane/AutoParam.h"
-#include "orbane/ControlCommands.h"
 #include "orbane/GPainter.h"
 #include "orbane/Input.h"
 #include "orbane/Point.h"
 #include "orbane/PreviewInfo.h"
 
-#include <cmath>
-
 namespace Orbane {
 
 PointControl::PointControl(const Registry *reg, const ScriptVal &args, const TagList &tags)
-    : PreviewControl(reg, args, tags)
+    : HandleOverlay(reg, args, tags)
 {
     // A script's creation tags: the previous point and the grab offset.
     PointControl::SetAttrsTagList(nullptr, tags);
@@ -28,7 +25,7 @@ PointControl::~PointControl()
 bool PointControl::CopyAttr(Tag tag, void *out)
 {
     if (!out || (tag != PCA_GrabOffsetX && tag != PCA_GrabOffsetY))
-        return PreviewControl::CopyAttr(tag, out);
+        return HandleOverlay::CopyAttr(tag, out);
     *static_cast<float64 *>(out) = tag == PCA_GrabOffsetX ? mGrabOffset.x : mGrabOffset.y;
     // False: the value was supplied.
     return false;
@@ -61,7 +58,7 @@ bool PointControl::SetAttrsTagList(Input *input, const TagList &tags)
     mGrabOffset.x = tags.GetDouble(PCA_GrabOffsetX, mGrabOffset.x);
     mGrabOffset.y = tags.GetDouble(PCA_GrabOffsetY, mGrabOffset.y);
     UpdateDisplay(nullptr, nullptr);
-    return PreviewControl::SetAttrsTagList(input, tags);
+    return HandleOverlay::SetAttrsTagList(input, tags);
 }
 
 bool PointControl::RemoveInput(Input *input, const TagList *tags)
@@ -69,7 +66,7 @@ bool PointControl::RemoveInput(Input *input, const TagList *tags)
     const bool wasPrev = input && input == mPrevInput;
     if (wasPrev)
         DetachFromInput(mPrevInput);
-    return PreviewControl::RemoveInput(input, tags) || wasPrev;
+    return HandleOverlay::RemoveInput(input, tags) || wasPrev;
 }
 
 void PointControl::NotifyChanged(Input *input, Parameter *value, const TagList *tags)
@@ -84,12 +81,12 @@ void PointControl::NotifyChanged(Input *input, Parameter *value, const TagList *
     else if (input != mPrevInput)
         moved = true;
     if (moved)
-        PreviewControl::NotifyChanged(input, value, tags);
+        HandleOverlay::NotifyChanged(input, value, tags);
 }
 
 void PointControl::SetActive(int32 active, const TagList *tags)
 {
-    PreviewControl::SetActive(active, tags);
+    HandleOverlay::SetActive(active, tags);
     if (active)
         ActivateOverlaysOf(mPrevInput);
 }
@@ -102,18 +99,14 @@ void PointControl::DrawControls(PreviewInfo *info, const TagList *tags)
         return;
     if (Graphics::GPainter *p = info->GetPainter()) {
         const OrbPoint at = info->TransformOut(mDrawnPoint);
-        const float64 s = info->HandleScale;
-        p->Color(info->GetColor(OrbColor()), info->GetShadow(OrbColor()));
-        p->PushMatrix();
-        p->Translate(at.x, at.y);
-        p->Scale(s, s);
+        BeginHandle(*p, *info, at, 1);
         p->Begin(Graphics::GP_LineLoop);
         p->Vertex(-HalfSize, -HalfSize);
         p->Vertex(HalfSize, -HalfSize);
         p->Vertex(HalfSize, HalfSize);
         p->Vertex(-HalfSize, HalfSize);
         p->End();
-        p->PopMatrix();
+        EndHandle(*p);
         // A previous point given by tags alone has no handle to join.
         if (mPrevInput) {
             const OrbPoint prev = info->TransformOut(mDrawnPrev);
@@ -123,7 +116,7 @@ void PointControl::DrawControls(PreviewInfo *info, const TagList *tags)
             p->End();
         }
     }
-    PreviewControl::DrawControls(info, tags);
+    HandleOverlay::DrawControls(info, tags);
 }
 
 DragType PointControl::ControlDown(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
@@ -134,18 +127,19 @@ DragType PointControl::ControlDown(PreviewInfo *info, const OrbPointI &mouse, co
         if (mPrevInput && info->HotControl->GetMainInput() == mPrevInput)
             mDragType = DRAG_Linked;
     } else {
-        const OrbPoint offset = HandleOffset(*info);
-        if (Hits(offset, info->PickTolerance)) {
-            mGrabOffset = offset;
+        const HandleHit hit = PressHit(*info);
+        if (hit) {
+            mGrabOffset = HandleOffset(*info);
             mDragType = DRAG_Handle;
+            Pick(hit);
         }
     }
-    return PreviewControl::ControlDown(info, mouse, tags);
+    return HandleOverlay::ControlDown(info, mouse, tags);
 }
 
 void PointControl::ControlMove(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
 {
-    PreviewControl::ControlMove(info, mouse, tags);
+    HandleOverlay::ControlMove(info, mouse, tags);
     if (mDragType != DRAG_Handle)
         return;
     const OrbPoint to(mGrabOffset.x / info->ViewWidth + info->MouseX, mGrabOffset.y / info->ViewHeight + info->MouseY);
@@ -155,25 +149,19 @@ void PointControl::ControlMove(PreviewInfo *info, const OrbPointI &mouse, const 
     SetInputs(value.get(), GetCurrentTime(), 0, nullptr);
 }
 
-void PointControl::ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
-{
-    PreviewControl::ControlUp(info, mouse, tags);
-}
-
 uint64 PointControl::ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags)
 {
     // One image pixel of the width on both axes, also for non-square images.
     uint64 result = 0;
     if (NudgeCommand(info, command, data, tags, mValue, 1.0 / info->ImageWidth, result))
         return result;
-    if (command == CCMD_GetInputAt && GetMainInput() && Hits(HandleOffset(*info), info->PickTolerance))
-        return uint64(reinterpret_cast<uintptr_t>(GetMainInput()));
-    return PreviewControl::ControlCommand(info, command, data, tags);
+    return HandleOverlay::ControlCommand(info, command, data, tags);
 }
 
-bool PointControl::Hits(OrbPoint offset, int32 tolerance) noexcept
+void PointControl::BuildHandles(const PreviewInfo &info, HandleSet &handles) const
 {
-    return std::fabs(std::trunc(offset.x)) < tolerance && std::fabs(std::trunc(offset.y)) < tolerance;
+    handles.Clear();
+    handles.AddPixelSquare(info.TransformOut(mValue), 1);
 }
 
 OrbPoint PointControl::HandleOffset(const PreviewInfo &info) const
@@ -181,8 +169,6 @@ OrbPoint PointControl::HandleOffset(const PreviewInfo &info) const
     return info.TransformOut(mValue) - info.TransformOut(info.MouseX, info.MouseY);
 }
 
-// One image pixel of the image's width on both axes: the same step size
-// whichever way the point goes.
 // Takes the point's X and Y when either moved beyond the threshold.
 bool PointControl::Store(OrbPoint &copy, const Parameter *value)
 {

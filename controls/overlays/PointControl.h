@@ -1,14 +1,15 @@
 #pragma once
 
-#include "orbane/PreviewControl.h"
+#include "framework/HandleOverlay.h"
 
 namespace Orbane {
 
 // The plain point handle: a small square over the image that the user drags
 // or nudges to edit a Point Input. A previous-point Input (PCID_PrevPoint)
 // joins it by a line to another point, so a chain of point Inputs draws as
-// a path.
-class PointControl : public PreviewControl
+// a path. Its one handle is a square of whole viewer pixels within the pick
+// tolerance, highlighted while poised or picked.
+class PointControl : public HandleOverlay
 {
 public:
     PointControl(const Registry *reg, const ScriptVal &args, const TagList &tags);
@@ -26,7 +27,6 @@ public:
     void DrawControls(PreviewInfo *info, const TagList *tags) override;
     DragType ControlDown(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
     void ControlMove(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
-    void ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
     uint64 ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags) override;
 
     OrbPoint Value() const { return mValue; }
@@ -36,11 +36,11 @@ public:
     OrbPoint GrabOffset() const { return mGrabOffset; }
     Input *PrevInput() const { return mPrevInput; }
 
-    // Is the handle hit? `offset` is handle minus mouse in viewer units;
-    // each axis is truncated to whole pixels and must stay below `tolerance`.
-    static bool Hits(OrbPoint offset, int32 tolerance) noexcept;
     // Half the side of the handle's square, in handle pixels.
     static constexpr float64 HalfSize = 2.0;
+
+protected:
+    void BuildHandles(const PreviewInfo &info, HandleSet &handles) const override;
 
 private:
     OrbPoint HandleOffset(const PreviewInfo &info) const;

@@ -4,6 +4,7 @@
 #include "orbane/InputWatcher.h"
 #include "orbane/Object.h"
 #include "orbane/OrbPointT.h"
+#include "orbane/OrbRectT.h"
 #include "orbane/OrbString.h"
 
 #include <QPointer>
@@ -137,6 +138,13 @@ public:
     virtual void GetName(char *buffer, int32 size, const TagList *tags) const;
     // "Tool.Input (Class)" for `input`, or the main Input where null.
     virtual void GetFullName(char *buffer, int32 size, Input *input, const TagList *tags) const;
+    // Where the overlay's handles are, in viewer units, for `info`'s view:
+    // the viewer asks an overlay for its hover test (CCMD_HitTest) only when
+    // the mouse is inside, or when it claimed the mouse or asked for a redraw
+    // the last time. False (the base): the overlay wants every hover, as one
+    // that fades with the mouse's distance does. An empty rectangle (x2 < x1)
+    // is never under the mouse.
+    virtual bool HoverBounds(const PreviewInfo &info, OrbRect &bounds) const;
 
     // --- what overlays use of the base ---
     // Finds the Input that `tags` names, by its address (a ScriptObject
@@ -181,13 +189,6 @@ public:
 
 protected:
     void OnInputChanged(Input *input, Parameter *value, const TagList *tags) final;
-    // The arrow-key commands every overlay with a draggable point answers
-    // alike: NeedsKey claims the arrows; KeyDown moves `point` by one image
-    // pixel (1 / ImageWidth across, `stepY` up) scaled by the modifiers and
-    // writes it; KeyUpAll ends the nudges' undo step. True where `command`
-    // was one of them, with the answer in `result`.
-    bool NudgeCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags, OrbPoint point,
-                      float64 stepY, uint64 &result);
     int32 IndexOf(const Input *input) const;
 
     DragType mDragType = DRAG_None;

@@ -211,6 +211,11 @@ void PreviewControl::GetFullName(char *buffer, int32 size, Input *input, const T
         std::snprintf(buffer, std::size_t(size), "%s.%s (%s)", tool ? tool->GetName() : "", in->GetID().c_str(), name);
 }
 
+bool PreviewControl::HoverBounds(const PreviewInfo &, OrbRect &) const
+{
+    return false;
+}
+
 // --- what overlays use of the base ---
 
 bool PreviewControl::AttachToInput(Input *&slot, Operator *tool, const TagList &tags, Tag ptrTag, Tag idTag,
@@ -277,29 +282,6 @@ void PreviewControl::Redraw()
 bool PreviewControl::Moved(float64 a, float64 b) noexcept
 {
     return std::fabs(a - b) > ChangeThreshold;
-}
-
-bool PreviewControl::NudgeCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags,
-                                  OrbPoint point, float64 stepY, uint64 &result)
-{
-    if (command == CCMD_NeedsKey) {
-        result = IsArrowKey(data) ? 1 : 0;
-    } else if (command == CCMD_KeyDown) {
-        const bool arrow = IsArrowKey(data);
-        if (arrow) {
-            const OrbPoint to = point + NudgeOffset(data, 1.0 / info->ImageWidth, stepY, KeyModifiers());
-            AutoPoint value(to.x, to.y, 0.0);
-            SetInputs(value.get(), GetCurrentTime(), 0, nullptr);
-        }
-        PreviewControl::ControlCommand(info, command, data, tags);
-        result = arrow ? 1 : 0;
-    } else if (command == CCMD_KeyUpAll) {
-        ResetUndo(nullptr);
-        result = PreviewControl::ControlCommand(info, command, data, tags);
-    } else {
-        return false;
-    }
-    return true;
 }
 
 bool PreviewControl::IsArrowKey(uint64 key) noexcept

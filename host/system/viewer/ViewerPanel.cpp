@@ -1,5 +1,6 @@
 #include "orbane/ViewerPanel.h"
 
+#include "HoverIndex.h"
 #include "QtGPainter.h"
 #include "ViewerBackdrop.h"
 
@@ -31,7 +32,8 @@ constexpr float64 kNotch = 120.0, kNotchFactor = 1.25;
 } // namespace
 
 ViewerPanel::ViewerPanel(OrbaneDoc *doc, QWidget *parent)
-    : QWidget(parent), mDoc(doc), mBackdrop(std::make_unique<ViewerBackdrop>())
+    : QWidget(parent), mDoc(doc), mBackdrop(std::make_unique<ViewerBackdrop>()),
+      mHoverIndex(std::make_unique<HoverIndex>())
 {
     setMouseTracking(true);
     setFocusPolicy(Qt::StrongFocus);
@@ -72,6 +74,7 @@ void ViewerPanel::ShowTool(Operator *tool)
                     mOverlays.push_back(overlay);
     for (PreviewControl *overlay : mOverlays)
         overlay->SetActive(1, nullptr);
+    mHoverIndex->Reset();
     BuildToolBar();
     RequestRedraw();
     emit toolShown(tool);
@@ -99,7 +102,11 @@ PreviewControl *ViewerPanel::CreateOverlay(Input *input, const char *classID)
             obj->DecRef();
         return nullptr;
     }
-    overlay->SetRedrawHandler([this](PreviewControl *) { RequestRedraw(); });
+    // A redraw request may mean that the overlay's handles moved.
+    overlay->SetRedrawHandler([this](PreviewControl *o) {
+        mHoverIndex->Touch(o);
+        RequestRedraw();
+    });
     overlay->AddInput(input, &attrs);
     overlay->SetAttrsTagList(input, attrs);
     overlay->SetView(&mInfo, nullptr);
@@ -126,6 +133,7 @@ void ViewerPanel::Clear()
         overlay->DecRef();
     }
     mOverlays.clear();
+    mHoverIndex->Reset();
     mMenuOwners.clear();
     mTool = nullptr;
 }

@@ -2,6 +2,8 @@
 // overlays of the shown tool.
 #include "orbane/ViewerPanel.h"
 
+#include "HoverIndex.h"
+
 #include "orbane/ControlCommands.h"
 
 #include <QContextMenuEvent>
@@ -58,19 +60,12 @@ bool ViewerPanel::IsOverlay(const PreviewControl *overlay) const
 void ViewerPanel::Hover()
 {
     mInfo.HotControl = nullptr;
-    uint64 claimed = 0;
-    bool redraw = false;
-    PreviewControl *hover = nullptr;
-    for (PreviewControl *overlay : ByPriority()) {
-        const uint64 answer = overlay->ControlCommand(&mInfo, CCMD_HitTest, claimed, nullptr);
-        redraw |= (answer & 2) != 0;
-        if (!claimed && (answer & 1)) {
-            hover = overlay;
-            claimed = 1;
-        }
-    }
-    mHover = hover;
-    if (redraw)
+    const OrbRect visible(0.0, 0.0, width(), height());
+    const HoverIndex::Result walk =
+        mPlainHover ? HoverIndex::PlainHover(mOverlays, mInfo) : mHoverIndex->Hover(mOverlays, mInfo, visible);
+    mHover = walk.hover;
+    mHoverAsked = walk.asked;
+    if (walk.redraw)
         RequestRedraw();
 }
 

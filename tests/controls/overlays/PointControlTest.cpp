@@ -44,6 +44,7 @@ private slots:
     void nudge();
     void pressOnLinkedHandleMovesNothing();
     void lineToPreviousPoint();
+    void hoverClaimsAndHighlights();
 };
 
 void PointControlTest::initTestCase()
@@ -68,7 +69,11 @@ void PointControlTest::pickTolerance()
     ViewerFixture f;
     Input *p = f.AddPoint("P", 0.5, 0.5, PointAttrs());
     QVERIFY(f.Show());
+    // Logical pixels at any device pixel ratio (a second run is at 2).
+    const qreal dpr = qEnvironmentVariableIsSet("QT_SCALE_FACTOR") ? qgetenv("QT_SCALE_FACTOR").toDouble() : 1.0;
+    QCOMPARE(f.viewer.devicePixelRatioF(), dpr);
     QCOMPARE(f.viewer.Info().PickTolerance, 6);
+    QCOMPARE(f.viewer.Info().HandleScale, 1.0f);
     const QPoint from = f.At({0.5, 0.5}, offset);
     f.Hover(from);
     const uint64 inputAt = f.OverlayOf(p)->ControlCommand(&f.viewer.Info(), CCMD_GetInputAt, 0, nullptr);
@@ -167,6 +172,24 @@ void PointControlTest::lineToPreviousPoint()
     shot = f.Grab();
     QVERIFY(Lit(shot, f.At({0.75, 0.5})));
     QVERIFY(Dark(shot, f.At({0.5, 0.625})));
+}
+
+void PointControlTest::hoverClaimsAndHighlights()
+{
+    ViewerFixture f;
+    Input *p = f.AddPoint("P", 0.5, 0.5, PointAttrs());
+    QVERIFY(f.Show());
+    const QPoint edge = f.At({0.5, 0.5}, QPoint(2, 0));
+    // The overlay's light grey, then the warm highlight while the mouse is over it.
+    QVERIFY(qBlue(f.Grab().pixel(edge)) > 200);
+    f.Hover(f.At({0.5, 0.5}, QPoint(5, 5)));
+    QCOMPARE(f.viewer.HoverControl(), f.OverlayOf(p));
+    QImage shot = f.Grab();
+    QVERIFY2(qRed(shot.pixel(edge)) > 200 && qBlue(shot.pixel(edge)) < 100,
+             qPrintable(QString::number(shot.pixel(edge), 16)));
+    f.Hover(f.At({0.5, 0.5}, QPoint(6, 0)));
+    QCOMPARE(f.viewer.HoverControl(), nullptr);
+    QVERIFY(qBlue(f.Grab().pixel(edge)) > 200);
 }
 
 QTEST_MAIN(PointControlTest)

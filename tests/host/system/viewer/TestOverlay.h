@@ -20,11 +20,15 @@ namespace Test {
 
 // A 7-pixel square at its Input's point that drags, claims the space key,
 // offers a menu entry, links to a second Input and logs the viewer's calls.
+// It tells the viewer where it can be hovered, unless it fades (TO_Fades):
+// then it wants every hover and redraws when the mouse's distance crosses
+// a 20-pixel step.
 class TestOverlay : public PreviewControl
 {
 public:
     static constexpr Tag TO_Link = 0x80068000;
     static constexpr Tag TO_LinkObject = 0x60068000;
+    static constexpr Tag TO_Fades = 0x10068001;
     static constexpr int32 kMenuID = 7;
     static inline int destroyed = 0;
 
@@ -44,6 +48,7 @@ public:
         const Input *main = GetMainInput();
         linked = AttachToInput(link, main ? main->GetOperator() : nullptr, tags, TO_LinkObject, TO_Link, ATTACH_Watch,
                                ATTACH_Watch);
+        fades = tags.GetInt(TO_Fades, fades) != 0;
         return PreviewControl::SetAttrsTagList(input, tags);
     }
     bool AddInput(Input *input, const TagList *tags) override
@@ -107,8 +112,13 @@ public:
         Log(command.c_str());
         if (command == CCMD_HitTest) {
             const bool wasHover = hover;
+            const int wasStep = fadeStep;
             hover = !(data & 1) && Hit(*info);
-            return data | (hover ? 1 : 0) | (hover != wasHover ? 2 : 0);
+            if (fades)
+                fadeStep = std::min(3, int(Offset(*info).Length() / 20.0));
+            const bool redraw = hover != wasHover || fadeStep != wasStep;
+            redraws += redraw ? 1 : 0;
+            return data | (hover ? 1 : 0) | (redraw ? 2 : 0);
         }
         if (command == CCMD_NeedsKey)
             return data == Qt::Key_Space ? 1 : 0;
@@ -117,6 +127,14 @@ public:
         if (command == CCMD_GetInputAt && Hit(*info))
             return uint64(reinterpret_cast<uintptr_t>(GetMainInput()));
         return PreviewControl::ControlCommand(info, command, data, tags);
+    }
+    bool HoverBounds(const PreviewInfo &info, OrbRect &bounds) const override
+    {
+        // A pixel beyond the tolerance: Hit's comparisons round their own way.
+        const OrbPoint s = info.TransformOut(at);
+        const float64 r = info.PickTolerance + 1.0;
+        bounds = OrbRect(s.x - r, s.y - r, s.x + r, s.y + r);
+        return !fades;
     }
     void AddToMenu(QMenu *menu, PreviewInfo *info, const TagList *tags) override
     {
@@ -131,9 +149,13 @@ public:
 
     int Count(const std::string &call) const { return int(std::count(calls.begin(), calls.end(), call)); }
     void Log(const std::string &call) { calls.push_back(call); }
+    OrbPoint Offset(const PreviewInfo &info) const
+    {
+        return info.TransformOut(at) - info.TransformOut(info.MouseX, info.MouseY);
+    }
     bool Hit(const PreviewInfo &info) const
     {
-        const OrbPoint d = info.TransformOut(at) - info.TransformOut(info.MouseX, info.MouseY);
+        const OrbPoint d = Offset(info);
         return std::fabs(d.x) < info.PickTolerance && std::fabs(d.y) < info.PickTolerance;
     }
 
@@ -142,6 +164,9 @@ public:
     Input *link = nullptr;
     bool linked = false;
     bool hover = false;
+    bool fades = false;
+    int fadeStep = -1;
+    int redraws = 0; // hover answers that asked for a redraw
     int64 pressFlags = -1;
     std::vector<std::string> calls;
     std::vector<int32> passes;

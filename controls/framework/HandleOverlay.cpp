@@ -1,0 +1,157 @@
+#include "framework/HandleOverlay.h"
+
+#include "orbane/AutoParam.h"
+#include "orbane/ControlCommands.h"
+#include "orbane/GPainter.h"
+#include "orbane/PreviewInfo.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace Orbane {
+
+namespace {
+
+// A fade that moves less than this is not worth a repaint.
+constexpr float32 kFadeStep = 0.05f;
+
+} // namespace
+
+void HandleOverlay::ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
+{
+    PreviewControl::ControlUp(info, mouse, tags);
+    Pick({});
+}
+
+uint64 HandleOverlay::ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags)
+{
+    if (command == CCMD_HitTest)
+        return HitTest(*info, data);
+    if (command == CCMD_GetInputAt && GetMainInput() && PressHit(*info))
+        return uint64(reinterpret_cast<uintptr_t>(GetMainInput()));
+    return PreviewControl::ControlCommand(info, command, data, tags);
+}
+
+bool HandleOverlay::HoverBounds(const PreviewInfo &info, OrbRect &bounds) const
+{
+    if (mFades)
+        return false;
+    HandleSet handles;
+    BuildHandles(info, handles);
+    handles.Bounds(info.HandleScale, info.PickTolerance, bounds);
+    return true;
+}
+
+float32 HandleOverlay::FadeAt(float64 distance) noexcept
+{
+    return float32(std::clamp(1.0 - (distance - 10.0) / 100.0, 0.5, 1.0));
+}
+
+HandleHit HandleOverlay::HoverHit(PreviewInfo &info)
+{
+    BuildHandles(info, mHandles);
+    return mHandles.HitTest(info.MouseInViewer(), info.HandleScale, info.PickTolerance, HandleGeometry::Hover);
+}
+
+float64 HandleOverlay::FadeDistance(const PreviewInfo &) const
+{
+    return 0.0;
+}
+
+HandleHit HandleOverlay::PressHit(const PreviewInfo &info)
+{
+    BuildHandles(info, mHandles);
+    return mHandles.HitTest(info.MouseInViewer(), info.HandleScale, info.PickTolerance, HandleGeometry::Press);
+}
+
+void HandleOverlay::EnableFade()
+{
+    mFades = true;
+    mFade = mDrawnFade = 0.5f;
+}
+
+void HandleOverlay::SettleFade(const PreviewInfo &info)
+{
+    if (info.Highlight || mDragType == DRAG_Handle)
+        mFade = mDrawnFade = 1.0f;
+}
+
+Graphics::GColor HandleOverlay::HandleFill(const PreviewInfo &info, uint32 part, int32 item) const
+{
+    return mHandles.FillOf(info.GetColor(OrbColor()).Faded(mFade), part, item);
+}
+
+Graphics::GColor HandleOverlay::HandleShadow(const PreviewInfo &info) const
+{
+    return info.GetShadow(OrbColor()).Faded(mFade);
+}
+
+void HandleOverlay::BeginHandle(Graphics::GPainter &p, const PreviewInfo &info, OrbPoint at, uint32 part,
+                                int32 item) const
+{
+    p.Color(HandleFill(info, part, item), HandleShadow(info));
+    p.PushMatrix();
+    p.Translate(at.x, at.y);
+    p.Scale(info.HandleScale, info.HandleScale, 1.0);
+}
+
+void HandleOverlay::EndHandle(Graphics::GPainter &p)
+{
+    p.PopMatrix();
+}
+
+bool HandleOverlay::NudgeCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags,
+                                 OrbPoint point, float64 stepY, uint64 &result)
+{
+    if (command == CCMD_NeedsKey) {
+        result = IsArrowKey(data) ? 1 : 0;
+    } else if (command == CCMD_KeyDown) {
+        const bool arrow = IsArrowKey(data);
+        if (arrow) {
+            const OrbPoint to = point + NudgeOffset(data, 1.0 / info->ImageWidth, stepY, KeyModifiers());
+            AutoPoint value(to.x, to.y, 0.0);
+            SetInputs(value.get(), GetCurrentTime(), 0, nullptr);
+        }
+        PreviewControl::ControlCommand(info, command, data, tags);
+        result = arrow ? 1 : 0;
+    } else if (command == CCMD_KeyUpAll) {
+        // Ends the one undo step of a run of nudges.
+        ResetUndo(nullptr);
+        result = PreviewControl::ControlCommand(info, command, data, tags);
+    } else {
+        return false;
+    }
+    return true;
+}
+
+// Claims the mouse only where no overlay above has; the hover may still
+// move (off this overlay) and the fade change, each asking for a redraw.
+uint64 HandleOverlay::HitTest(PreviewInfo &info, uint64 data)
+{
+    HandleHit hit;
+    if (!(data & 1)) {
+        hit = HoverHit(info);
+        if (hit)
+            data |= 1;
+    }
+    bool changed = mHandles.SetPoised(hit);
+    if (mFades)
+        changed = UpdateFade(info) || changed;
+    return changed ? data | 2 : data;
+}
+
+bool HandleOverlay::UpdateFade(const PreviewInfo &info)
+{
+    if (!info.Highlight && mDragType != DRAG_Handle) {
+        mFade = FadeAt(FadeDistance(info));
+        if (std::fabs(mFade - mDrawnFade) <= kFadeStep)
+            return false;
+        mDrawnFade = mFade;
+        return true;
+    }
+    const bool changed = mDrawnFade != 1.0f;
+    mFade = mDrawnFade = 1.0f;
+    return changed;
+}
+
+} // namespace Orbane

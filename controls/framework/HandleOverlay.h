@@ -1,0 +1,94 @@
+#pragma once
+
+#include "framework/HandleSet.h"
+
+#include "orbane/PreviewControl.h"
+
+namespace Orbane {
+
+namespace Graphics {
+class GPainter;
+} // namespace Graphics
+
+// The base of overlays with handles. An overlay says where its handles are
+// (BuildHandles) and draws its shape; this base answers the rest alike for
+// all of them:
+//   - CCMD_HitTest: claims the mouse (bit 0) when a handle is under it and
+//     asks for a redraw (bit 1) only when the poised handle or the fade
+//     changed;
+//   - CCMD_GetInputAt: the main Input when a press would pick a handle;
+//   - HoverBounds: where the viewer may find the handles, so that it asks
+//     only the overlays near the mouse (none for an overlay that fades,
+//     which must hear every move);
+//   - the arrow-key nudges (NudgeCommand);
+//   - the colours of a handle: the overlay's, the highlight while poised or
+//     picked, faded with the mouse's distance where the overlay fades; the
+//     painter draws each primitive as a shadow pass and then a colour pass.
+// Sizes and tolerances are the viewer's logical pixels: the viewer's pick
+// tolerance and handle scale, which a high-DPI screen does not change.
+class HandleOverlay : public PreviewControl
+{
+public:
+    using PreviewControl::PreviewControl;
+
+    std::size_t SizeOf() const override { return sizeof(HandleOverlay); }
+    void ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
+    uint64 ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags) override;
+    bool HoverBounds(const PreviewInfo &info, OrbRect &bounds) const override;
+
+    const HandleSet &Handles() const { return mHandles; }
+    float32 Fade() const { return mFade; }
+    // Opacity at `distance` viewer units from the mouse: full within 10,
+    // half from 60 on.
+    static float32 FadeAt(float64 distance) noexcept;
+
+protected:
+    // Puts the overlay's handles where its values are now, in `info`'s view.
+    // Called before every test; an overlay that takes no clicks adds none.
+    virtual void BuildHandles(const PreviewInfo &info, HandleSet &handles) const = 0;
+    // The handle under the mouse for the hover test (hover reach). An
+    // overlay that keeps something of every hover overrides and calls this.
+    virtual HandleHit HoverHit(PreviewInfo &info);
+    // How far the mouse is from what fades, in viewer units; only asked
+    // after EnableFade.
+    virtual float64 FadeDistance(const PreviewInfo &info) const;
+
+    // The handle a press at the mouse would pick (press reach).
+    HandleHit PressHit(const PreviewInfo &info);
+    // Picks `hit` (or nothing) for the drag to come.
+    void Pick(HandleHit hit) { mHandles.SetPicked(hit); }
+
+    // The overlay fades with the mouse's distance (FadeDistance) while the
+    // viewer does not highlight and the overlay is not dragged.
+    void EnableFade();
+    // Full opacity while the viewer highlights or the overlay is dragged.
+    void SettleFade(const PreviewInfo &info);
+
+    // Colours of a handle of `part`: highlighted while poised or picked,
+    // faded by the overlay's fade.
+    Graphics::GColor HandleFill(const PreviewInfo &info, uint32 part, int32 item = -1) const;
+    Graphics::GColor HandleShadow(const PreviewInfo &info) const;
+    // Sets the colours of `part`, then moves the painter to `at` (viewer
+    // units) scaled by the handle scale, so that the handle is drawn in
+    // handle pixels; EndHandle goes back.
+    void BeginHandle(Graphics::GPainter &p, const PreviewInfo &info, OrbPoint at, uint32 part, int32 item = -1) const;
+    static void EndHandle(Graphics::GPainter &p);
+
+    // The arrow-key commands every overlay with a draggable point answers
+    // alike: NeedsKey claims the arrows; KeyDown moves `point` by one image
+    // pixel (1 / ImageWidth across, `stepY` up) scaled by the modifiers and
+    // writes it; KeyUpAll ends the nudges' undo step. True where `command`
+    // was one of them, with the answer in `result`.
+    bool NudgeCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags, OrbPoint point,
+                      float64 stepY, uint64 &result);
+
+private:
+    uint64 HitTest(PreviewInfo &info, uint64 data);
+    bool UpdateFade(const PreviewInfo &info);
+
+    HandleSet mHandles;
+    bool mFades = false;
+    float32 mFade = 1.0f, mDrawnFade = 1.0f; // as last tested, as last drawn
+};
+
+} // namespace Orbane
