@@ -295,10 +295,16 @@ RectangleShape RectangleControl::Shape() const
     return s;
 }
 
+// The mouse meets the sides as they were last drawn, where the user saw
+// them, placed where the Inputs put the rectangle now.
 RectangleFrame RectangleControl::DrawnFrame(const PreviewInfo &info) const
 {
+    RectangleShape s = Shape();
+    s.width = mDrawn.width;
+    s.height = mDrawn.height;
+    s.displayScale = mDrawn.displayScale;
     const ViewMapping &m = info.Mapping();
-    return RectangleFrame(mDrawn, m.ImageWidth(), m.ImageHeight(), m.PixelAspect());
+    return RectangleFrame(s, m.ImageWidth(), m.ImageHeight(), m.PixelAspect());
 }
 
 // A frame unit is one image pixel high (and as wide as high on screen), so
