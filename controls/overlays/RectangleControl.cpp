@@ -5,6 +5,7 @@
 #include "orbane/AutoParam.h"
 #include "orbane/ControlCommands.h"
 #include "orbane/GPainter.h"
+#include "orbane/ImageParam.h"
 #include "orbane/Input.h"
 #include "orbane/Number.h"
 #include "orbane/OrbaneDoc.h"
@@ -222,6 +223,8 @@ bool RectangleControl::ReadAspectLock(const TagList &tags)
 bool RectangleControl::RemoveInput(Input *input, const TagList *tags)
 {
     const LinkedInput<RectangleControl> *row = FindLinkedInput(*this, Links, input);
+    if (row && row->slot == &RectangleControl::mImageInput)
+        mImage = QImage();
     if (row)
         DetachFromInput(this->*(row->slot));
     return PreviewControl::RemoveInput(input, tags) || row;
@@ -276,8 +279,11 @@ void RectangleControl::StoreLinked(Input *input, const Parameter *value, bool &m
         mFlipY = n != 0.0;
         moved = true;
     }
-    if (input == mImageInput)
+    if (input == mImageInput) {
+        const auto *image = dynamic_cast<const ImageParam *>(value);
+        mImage = image ? image->Image : QImage();
         moved = true;
+    }
 }
 
 RectangleShape RectangleControl::Shape() const
@@ -480,7 +486,7 @@ void RectangleControl::DrawControls(PreviewInfo *info, const TagList *tags)
         const OrbPoint corner = info->TransformOut(frame.At(1.0, 1.0)) - info->TransformOut(frame.At(-1.0, -1.0));
         if (frame.IsValid() && Finite(corner) && std::fabs(corner.x) + std::fabs(corner.y) < kFarAway &&
             info->TransformOut(frame.ToImage(frame.Middle())).Length() < kFarAway) {
-            if (mImageInput)
+            if (mImageInput && !mImage.isNull())
                 DrawImage(*p, *info, frame);
             DrawOutline(*p, *info, frame);
         }
@@ -531,6 +537,35 @@ void RectangleControl::DrawStrip(GPainter &p, const PreviewInfo &info, const Rec
     p.End();
 }
 
-void RectangleControl::DrawImage(GPainter &, const PreviewInfo &, const RectangleFrame &) const {}
+// The image fills the rectangle, turned and flipped with it. Mode 0 lays it
+// over by its alpha, mode 1 multiplies, any other mode screens; a mode
+// other than 0 at full amount draws it opaque.
+void RectangleControl::DrawImage(GPainter &p, const PreviewInfo &info, const RectangleFrame &frame) const
+{
+    const float32 alpha = float32(info.OverlayColor.A() / 255.0 * mShownBlendAmount);
+    if (mBlendMode != 0 && mShownBlendAmount >= 1.0) {
+        p.Disable(Graphics::GC_Blend);
+    } else {
+        p.Enable(Graphics::GC_Blend);
+        if (mBlendMode == 0)
+            p.BlendFunc(Graphics::GBF_SrcAlpha, Graphics::GBF_OneMinusSrcAlpha);
+        else if (mBlendMode == 1)
+            p.BlendFunc(Graphics::GBF_DstColor, Graphics::GBF_OneMinusSrcColor);
+        else
+            p.BlendFunc(Graphics::GBF_One, Graphics::GBF_OneMinusSrcColor);
+    }
+    const float32 grey = mBlendMode == 1 ? 1.0f : alpha;
+    float64 corners[8];
+    const OrbPoint at[4] = {frame.At(-1, -1), frame.At(1, -1), frame.At(1, 1), frame.At(-1, 1)};
+    for (int i = 0; i < 4; ++i) {
+        const OrbPoint v = info.TransformOut(at[i]);
+        corners[2 * i] = v.x;
+        corners[2 * i + 1] = v.y;
+    }
+    p.Texture(mImage, corners, GColor(grey, grey, grey, alpha));
+    // The outline after it blends as usual.
+    p.Enable(Graphics::GC_Blend);
+    p.BlendFunc(Graphics::GBF_SrcAlpha, Graphics::GBF_OneMinusSrcAlpha);
+}
 
 } // namespace Orbane

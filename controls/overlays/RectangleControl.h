@@ -5,6 +5,8 @@
 
 #include "orbane/PreviewControl.h"
 
+#include <QImage>
+
 namespace Orbane {
 
 namespace Graphics {
@@ -99,6 +101,7 @@ private:
     int32 mHoverPart = 0, mDragPart = 1, mLastPart = 9;
     float64 mCornerRound = 0.0;
     OrbPoint mGrabOffset;
+    QImage mImage;           // the image Input's pixels, shown inside
     RectangleShape mDrawn;   // the shape as last drawn, which the mouse meets
     bool mAdjusting = false; // our own undo group is open
 };

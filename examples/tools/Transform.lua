@@ -4,6 +4,8 @@
 -- the pivot Axis (a point of the rectangle, 0..1 across each side) placed
 -- on Center, and scales by Size; Flip X mirrors it about the pivot.
 -- Width and Height are in image widths, so the frame stays rigid as it turns.
+-- The Inset image is shown inside, laid over at 60 % (RC_BlendMode 0: over
+-- by alpha, 1: multiply, 2: screen).
 local MinScale, MaxScale = 0x20030002, 0x20030003
 return {
   type = "Transform",
@@ -12,7 +14,8 @@ return {
       control = "SliderControl", overlay = "RectangleControl",
       overlayInputs = { "Height" },
       tags = { RCP_Center = "Center", RCP_Angle = "Angle", RCP_Size = "Size",
-               RCP_Axis = "Axis", RCP_FlipX = "FlipX", RC_PenStyle = 0 } },
+               RCP_Axis = "Axis", RCP_FlipX = "FlipX", RCP_Image = "Inset",
+               RC_PenStyle = 0, RC_BlendMode = 0, RCD_BlendAmount = 0.6 } },
     { id = "Height", name = "Height", type = "Number", default = 0.25,
       control = "SliderControl" },
     { id = "Center", name = "Center", type = "Point", default = { 0.5, 0.5 },
@@ -25,5 +28,6 @@ return {
       control = "OffsetControl" },
     { id = "FlipX", name = "Flip X", type = "Number", default = 0,
       control = "CheckboxControl" },
+    { id = "Inset", name = "Inset", type = "Image", default = "../images/dusk.png" },
   },
 }

@@ -27,7 +27,8 @@ class ScriptVal;
 //                                                  -- an object tag given stops { {pos, r, g, b [, a]}, ... }
 //                                                  -- holds a Gradient
 //       ... } }
-// Data types: "Number", "Point" (default {x, y}), "Text", "ID", "ScriptVal".
+// Data types: "Number", "Point" (default {x, y}), "Text", "ID", "ScriptVal", and "Image"
+// (default: an image file's path, relative to the tool file).
 // Named tags go through the same tag maps as orbane.Create, so a misspelt
 // tag fails with a message naming the tool, the Input and the tag.
 //
@@ -39,7 +40,9 @@ class ToolLoader
 {
 public:
     // A new tool (one reference, the caller's) named `name`; null with `error` set.
-    static Operator *FromTable(const ScriptVal &desc, const char *name, std::string *error);
+    // Relative image paths start at `dir` (the current directory where empty).
+    static Operator *FromTable(const ScriptVal &desc, const char *name, std::string *error,
+                               const std::string &dir = std::string());
     static Operator *LoadTool(const std::string &path, const char *name, std::string *error);
     // Adds every tool of the comp to the document and sets its time.
     static bool LoadComp(OrbaneDoc &doc, const std::string &path, std::string *error);

@@ -1,6 +1,7 @@
 #include "orbane/ToolLoader.h"
 
 #include "orbane/AutoRef.h"
+#include "orbane/ClassIDs.h"
 #include "orbane/Gradient.h"
 #include "orbane/Input.h"
 #include "orbane/LuaRuntime.h"
@@ -154,6 +155,7 @@ struct ToolContext
     std::set<std::string> ids; // every Input id the file declares
     std::vector<InputLink> links;
     int32 current = 0;
+    QDir base; // where relative image paths start
 };
 
 bool BuildNamedTags(const ScriptVal &named, const std::vector<std::string> &classes, TagList &tags, ToolContext &ctx,
@@ -235,7 +237,11 @@ bool AddInputFrom(Operator &tool, const ScriptVal &decl, ToolContext &ctx, std::
         return false;
     }
     if (const ScriptVal *v = decl.FindKeyConst(ScriptVal("default"))) {
-        def = AutoRef<Parameter>(ParameterScript::FromScript(type, *v, &why));
+        // An image file is named relative to the tool file.
+        const ScriptVal value = type == CLSID_DataType_Image && v->IsString()
+                                    ? ScriptVal(ctx.base.filePath(QString::fromUtf8(v->GetString())).toStdString())
+                                    : *v;
+        def = AutoRef<Parameter>(ParameterScript::FromScript(type, value, &why));
         if (!def) {
             *error = std::string("Input \"") + id + "\": default: " + why;
             return false;
@@ -250,11 +256,12 @@ bool AddInputFrom(Operator &tool, const ScriptVal &decl, ToolContext &ctx, std::
 
 } // namespace
 
-Operator *ToolLoader::FromTable(const ScriptVal &desc, const char *name, std::string *error)
+Operator *ToolLoader::FromTable(const ScriptVal &desc, const char *name, std::string *error, const std::string &dir)
 {
     AutoRef<Operator> tool(new Operator(name, Str(desc, "type", name)));
     const ScriptVal *inputs = desc.FindKeyConst(ScriptVal("inputs"));
     ToolContext ctx;
+    ctx.base = QDir(QString::fromStdString(dir));
     for (int32 i = 1; inputs && i <= inputs->Length(); ++i)
         if (const char *id = Str(*inputs->FindKeyConst(ScriptVal(i)), "id", nullptr))
             ctx.ids.insert(id);
@@ -278,7 +285,7 @@ Operator *ToolLoader::LoadTool(const std::string &path, const char *name, std::s
     ScriptVal desc;
     if (!RunDescription(path, desc, error))
         return nullptr;
-    Operator *tool = FromTable(desc, name, error);
+    Operator *tool = FromTable(desc, name, error, QFileInfo(QString::fromStdString(path)).absolutePath().toStdString());
     if (!tool)
         *error = path + ": " + *error;
     return tool;

@@ -4,6 +4,7 @@
 #include "orbane/AutoParam.h"
 #include "orbane/ClassIDs.h"
 #include "orbane/ControlCommands.h"
+#include "orbane/ImageParam.h"
 #include "orbane/Input.h"
 #include "orbane/ScriptVal.h"
 
@@ -22,6 +23,7 @@ namespace {
 constexpr Tag RC_PenStyle = 0x10058000, RCD_SetAngle = 0x20058002, RCD_LockAspect = 0x20058003;
 constexpr Tag RCD_SetSize = 0x20058007, RCD_SetAxisX = 0x20058008, RCD_SetAxisY = 0x20058009;
 constexpr Tag RCID_Center = 0x80058000, RCID_FlipX = 0x80058005, RCP_FlipX = 0x60058005;
+constexpr Tag RC_BlendMode = 0x10058002, RCD_BlendAmount = 0x20058004, RCP_Image = 0x60058002;
 constexpr double kImageWidth = 400; // the fixture's image
 
 // A tool with Width (the rectangle's main Input) and Height (its index 1).
@@ -115,6 +117,7 @@ private slots:
     void penStyle_data();
     void penStyle();
     void followsItsCentreAsLinkedDrag();
+    void blendAmountAloneDoesNotRefresh();
 };
 
 void RectangleControlTest::initTestCase()
@@ -410,6 +413,33 @@ void RectangleControlTest::followsItsCentreAsLinkedDrag()
     f.Hover(f.At({0.5, 0.5}, QPoint(140, 0)));
     QCOMPARE(StateOf(f.OverlayOf(w), "hoverPart"), 1.0);
     QCOMPARE(ValueOf(f, "Width"), 0.5);
+}
+
+// A white image inside, over the black backdrop: at full amount it shows
+// white; a new amount alone is not taken until the mode changes too.
+void RectangleControlTest::blendAmountAloneDoesNotRefresh()
+{
+    ViewerFixture f;
+    QImage white(8, 8, QImage::Format_RGB32);
+    white.fill(Qt::white);
+    Input *image = f.tool->AddInput(OrbID("Inset"), "Inset", CLSID_DataType_Image, TagList(),
+                                    AutoRef<ImageParam>(new ImageParam("white", white)).get());
+    Input *w = AddRectangle(f, 0.5, 0.25,
+                            TagList{{RCP_Image, static_cast<void *>(static_cast<ScriptObject *>(image))},
+                                    {RC_BlendMode, 0},
+                                    {RCD_BlendAmount, 1.0}});
+    QVERIFY(f.Show());
+    const QPoint inside = f.At({0.5, 0.5}, QPoint(30, 20));
+    QCOMPARE(qGray(f.Grab().pixel(inside)), 255);
+    f.OverlayOf(w)->SetAttrsTagList(TagList{{RCD_BlendAmount, 0.2}});
+    QCOMPARE(qGray(f.Grab().pixel(inside)), 255);
+    // Screen at a fifth: a dark grey over black.
+    f.OverlayOf(w)->SetAttrsTagList(TagList{{RC_BlendMode, 2}});
+    const int grey = qGray(f.Grab().pixel(inside));
+    QVERIFY2(grey > 20 && grey < 80, qPrintable(QString::number(grey)));
+    // Without the image nothing is drawn inside.
+    f.OverlayOf(w)->RemoveInput(image, nullptr);
+    QCOMPARE(qGray(f.Grab().pixel(inside)), 0);
 }
 
 QTEST_MAIN(RectangleControlTest)
