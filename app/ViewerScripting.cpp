@@ -128,13 +128,15 @@ int ViewerImage(lua_State *L)
     return 0;
 }
 
-// ViewerInfo() -> { zoom, width, height, imageWidth, imageHeight, hot }.
+// ViewerInfo() -> { zoom, pixelAspect, width, height, imageWidth, imageHeight, hot }.
 int ViewerInfo(lua_State *L)
 {
     const ViewerPanel *viewer = gWindow->Viewer();
-    lua_createtable(L, 0, 6);
+    lua_createtable(L, 0, 7);
     lua_pushnumber(L, viewer->Mapping().Zoom());
     lua_setfield(L, -2, "zoom");
+    lua_pushnumber(L, viewer->PixelAspect());
+    lua_setfield(L, -2, "pixelAspect");
     for (auto [key, v] : {std::pair{"width", viewer->width()},
                           {"height", viewer->height()},
                           {"imageWidth", viewer->ImageSize().width()},

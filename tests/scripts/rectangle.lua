@@ -69,3 +69,50 @@ check.fails(function() orbane.OverlayState("Transform1", "Height") end, "no over
 orbane.Undo()
 orbane.Undo()
 check.eq(num("Width"), w, "undo puts the width back")
+
+-- Tool files: a tag by number, Inputs named in tags, an image file beside
+-- the tool file, a misspelt link.
+local path = os.tmpname()
+local function write(text)
+  local f = assert(io.open(path, "w"))
+  f:write(text)
+  f:close()
+end
+write([[return { type = "Box", inputs = {
+  { id = "W", type = "Number", default = 0.2, overlay = "RectangleControl", overlayInputs = { "H" },
+    tags = { [0x10058000] = 2, RCP_Center = "C", RCP_Image = "Pic" } },
+  { id = "H", type = "Number", default = 0.1 },
+  { id = "C", type = "Point", default = { 0.3, 0.6 } },
+  { id = "Pic", type = "Image", default = "pic.png" } } }]])
+orbane.LoadTool(path, "Box1")
+orbane.ShowTool("Box1")
+local attrs = orbane.Overlay("Box1", "W"):GetAttrs()
+check.eq(attrs.RC_PenStyle, 2, "a tag given by number")
+check.eq(attrs.RCD_SetX, 0.3, "the centre from the Input named in RCP_Center")
+check.eq(attrs.RCID_Image, "Pic", "the image Input named in RCP_Image")
+check.eq(orbane.GetValue("Box1", "Pic"), path:match("^(.*/)") .. "pic.png", "image path beside the tool file")
+write([[return { inputs = { { id = "W", type = "Number", overlay = "RectangleControl",
+  tags = { RCP_Center = "Nowhere" } } } }]])
+check.fails(function() orbane.LoadTool(path, "Box2") end, "RCP_Center", "a link to no Input")
+
+-- A comp whose image has pixels twice as wide: the rectangle keeps its shape
+-- on screen, its +X edge w image widths across at twice the zoom.
+local abs = here:sub(1, 1) == "/" and here or (os.getenv("PWD") .. "/" .. here)
+local comp = os.tmpname()
+local f = assert(io.open(comp, "w"))
+f:write(string.format([[return { pixelAspect = 2, image = %q, tools = { { file = %q, name = "Wide1" } } }]],
+  abs .. "../../examples/images/dusk.png", abs .. "../../examples/tools/Transform.lua"))
+f:close()
+orbane.LoadComp(comp)
+orbane.ShowTool("Wide1")
+orbane.SetValue("Wide1", "Angle", 0)
+orbane.Process()
+local wide = orbane.ViewerInfo()
+check.eq(wide.pixelAspect, 2, "the comp's pixel aspect")
+local ww = orbane.GetValue("Wide1", "Width") * wide.imageWidth * wide.zoom * 2 / 2
+orbane.ViewerHover({ ix = 0.5, iy = 0.5, dx = ww - 2 })
+check.eq(orbane.OverlayState("Wide1", "Width").hoverPart, 1, "the +X edge with wide pixels")
+orbane.ViewerHover({ ix = 0.5, iy = 0.5, dx = ww / 2 - 2 })
+check.eq(orbane.OverlayState("Wide1", "Width").hoverPart, 0, "half-way in is inside")
+os.remove(path)
+os.remove(comp)
