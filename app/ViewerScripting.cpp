@@ -4,8 +4,11 @@
 #include "ScriptHands.h"
 #include "UiTarget.h"
 
+#include "orbane/Input.h"
 #include "orbane/LuaRuntime.h"
+#include "orbane/Operator.h"
 #include "orbane/Registry.h"
+#include "orbane/ScriptVal.h"
 #include "orbane/ViewerPanel.h"
 
 #include <QApplication>
@@ -14,6 +17,7 @@
 #include <QTest>
 
 #include <cmath>
+#include <cstring>
 
 namespace Orbane {
 
@@ -51,11 +55,17 @@ QPoint Position(lua_State *L, int idx, const ViewerPanel *viewer)
     return QPoint(int(std::lround(at.x() + dx)), int(std::lround(at.y() + dy)));
 }
 
+// { flags = 4 } gives the press that event-flag word (PCA_EventFlags).
 int ViewerPress(lua_State *L)
 {
     const UiGesture g = UiGesture::Read(L, 1);
-    Hands::SendMouse(gWindow->Viewer(), QEvent::MouseButtonPress, Position(L, 1, gWindow->Viewer()), g.button, g.button,
-                     g.mods);
+    double flags = 0;
+    if (lua_istable(L, 1))
+        Number(L, 1, "flags", flags);
+    ViewerPanel *viewer = gWindow->Viewer();
+    viewer->SetPressFlags(uint32(flags));
+    Hands::SendMouse(viewer, QEvent::MouseButtonPress, Position(L, 1, viewer), g.button, g.button, g.mods);
+    viewer->SetPressFlags(0);
     return 0;
 }
 
@@ -118,13 +128,15 @@ int ViewerImage(lua_State *L)
     return 0;
 }
 
-// ViewerInfo() -> { zoom, width, height, imageWidth, imageHeight, hot }.
+// ViewerInfo() -> { zoom, pixelAspect, width, height, imageWidth, imageHeight, hot }.
 int ViewerInfo(lua_State *L)
 {
     const ViewerPanel *viewer = gWindow->Viewer();
-    lua_createtable(L, 0, 6);
+    lua_createtable(L, 0, 7);
     lua_pushnumber(L, viewer->Mapping().Zoom());
     lua_setfield(L, -2, "zoom");
+    lua_pushnumber(L, viewer->PixelAspect());
+    lua_setfield(L, -2, "pixelAspect");
     for (auto [key, v] : {std::pair{"width", viewer->width()},
                           {"height", viewer->height()},
                           {"imageWidth", viewer->ImageSize().width()},
@@ -139,15 +151,70 @@ int ViewerInfo(lua_State *L)
     return 1;
 }
 
+// The overlay of Input `input` of the tool shown in the viewer, the first
+// one or the first of class `cls`; raises where there is none.
+PreviewControl *OverlayOrRaise(lua_State *L)
+{
+    const char *toolName = luaL_checkstring(L, 1);
+    const char *inputID = luaL_checkstring(L, 2);
+    const char *cls = luaL_optstring(L, 3, nullptr);
+    const ViewerPanel *viewer = gWindow->Viewer();
+    const Operator *tool = viewer->GetTool();
+    if (!tool || std::strcmp(tool->GetName(), toolName) != 0)
+        Hands::Raise(L, QString("tool \"%1\" is not shown in the viewer").arg(toolName));
+    const Input *input = tool->FindInput(OrbID(inputID));
+    if (!input)
+        Hands::Raise(L, QString("tool \"%1\" has no Input \"%2\"").arg(toolName, inputID));
+    for (PreviewControl *overlay : viewer->OverlaysOf(input)) {
+        const Registry *reg = overlay->GetRegistry();
+        if (!cls || (reg && (std::strcmp(reg->Name(), cls) == 0 || std::strcmp(overlay->ScriptTypeName(), cls) == 0)))
+            return overlay;
+    }
+    Hands::Raise(L, QString("Input \"%1\" has no overlay%2").arg(inputID, cls ? QString(" of class ") + cls : ""));
+    return nullptr;
+}
+
+int ReadOnly(lua_State *L)
+{
+    return luaL_error(L, "the overlay state is read-only");
+}
+
+// Overlay(tool, input [, class]) -> the overlay object, for casts and GetAttrs.
+int Overlay(lua_State *L)
+{
+    LuaRuntime::PushObject(L, OverlayOrRaise(L));
+    return 1;
+}
+
+// OverlayState(tool, input [, class]) -> a fresh table of what the user sees
+// of the overlay's state; each overlay class fills its own fields.
+int OverlayState(lua_State *L)
+{
+    ScriptVal state = ScriptVal::NewTable();
+    OverlayOrRaise(L)->GetState(state);
+    // A snapshot: writing to it would suggest it changes the overlay.
+    LuaRuntime::Push(L, state);
+    lua_newtable(L);
+    lua_newtable(L);
+    lua_pushvalue(L, -3);
+    lua_setfield(L, -2, "__index");
+    lua_pushcfunction(L, ReadOnly);
+    lua_setfield(L, -2, "__newindex");
+    lua_setmetatable(L, -2);
+    lua_remove(L, -2);
+    return 1;
+}
+
 } // namespace
 
 void ViewerScripting::Install(MainWindow *window)
 {
     gWindow = window;
     const std::pair<const char *, lua_CFunction> functions[] = {
-        {"ViewerPress", ViewerPress}, {"ViewerMove", ViewerMove}, {"ViewerRelease", ViewerRelease},
-        {"ViewerHover", ViewerHover}, {"ViewerKey", ViewerKey},   {"ViewerGrab", ViewerGrab},
-        {"ViewerImage", ViewerImage}, {"ViewerInfo", ViewerInfo},
+        {"ViewerPress", ViewerPress},   {"ViewerMove", ViewerMove}, {"ViewerRelease", ViewerRelease},
+        {"ViewerHover", ViewerHover},   {"ViewerKey", ViewerKey},   {"ViewerGrab", ViewerGrab},
+        {"ViewerImage", ViewerImage},   {"ViewerInfo", ViewerInfo}, {"Overlay", Overlay},
+        {"OverlayState", OverlayState},
     };
     for (const auto &[name, fn] : functions)
         LuaRuntime::Instance().AddModuleFunction(name, fn);

@@ -5,10 +5,13 @@
 #include "ScriptRunner.h"
 #include "UiScripting.h"
 
+#include "orbane/Input.h"
 #include "orbane/LuaRuntime.h"
+#include "orbane/Operator.h"
 #include "orbane/OrbaneDoc.h"
 #include "orbane/Theme.h"
 #include "orbane/ToolLoader.h"
+#include "orbane/ViewerPanel.h"
 
 #include <QApplication>
 #include <QDir>
@@ -34,18 +37,40 @@ void ChooseOffscreen(int argc, char **argv)
         qputenv("QT_QPA_PLATFORM", "offscreen");
 }
 
-// Headless runs of a comp write what a person would have seen.
-int WriteScreenshots(MainWindow &window, const QString &dir, QTextStream &out)
+bool HasOverlays(const Operator *tool)
+{
+    for (const Input *input : tool->Inputs())
+        if (input->GetAttrs().FindQuery(INPA_PreviewControl))
+            return true;
+    return false;
+}
+
+bool Shoot(QWidget *widget, const QString &dir, const QString &name, QTextStream &out)
+{
+    const QString path = QDir(dir).absoluteFilePath(name + ".png");
+    if (!widget->grab().save(path))
+        return false;
+    out << path << "\n";
+    return true;
+}
+
+// Headless runs of a comp write what a person would have seen: the window
+// as it opens, and the viewer over each tool that has overlays.
+int WriteScreenshots(MainWindow &window, const OrbaneDoc &doc, const QString &dir, QTextStream &out)
 {
     QDir().mkpath(dir);
     const std::pair<const char *, QWidget *> shots[] = {
         {"window", &window}, {"inspector", window.Inspector()}, {"viewer", window.Viewer()}};
-    for (const auto &[name, widget] : shots) {
-        const QString path = QDir(dir).absoluteFilePath(QString("%1.png").arg(name));
-        if (!widget->grab().save(path))
+    for (const auto &[name, widget] : shots)
+        if (!Shoot(widget, dir, name, out))
             return 1;
-        out << path << "\n";
-    }
+    const Operator *first = window.Viewer()->GetTool();
+    for (const Operator *tool : doc.Tools())
+        if (HasOverlays(tool) && (!window.ShowTool(tool->GetName()) ||
+                                  !Shoot(window.Viewer(), dir, QString("viewer-") + tool->GetName(), out)))
+            return 1;
+    if (first)
+        window.ShowTool(first->GetName());
     return 0;
 }
 
@@ -64,7 +89,7 @@ int RunWindow(const CommandLine &cl, QApplication &app, QTextStream &out, QTextS
     if (!cl.script.isEmpty())
         status = ScriptRunner::Run(cl.script, err);
     else if (cl.headless || NoDisplay())
-        status = WriteScreenshots(window, cl.shotDir.isEmpty() ? "screenshots" : cl.shotDir, out);
+        status = WriteScreenshots(window, doc, cl.shotDir.isEmpty() ? "screenshots" : cl.shotDir, out);
     else
         status = app.exec();
     // Objects that scripts still hold are released while the window lives.

@@ -11,6 +11,7 @@
 #include "overlays/AngleControl.h"
 #include "overlays/CrosshairControl.h"
 #include "overlays/PointControl.h"
+#include "overlays/RectangleControl.h"
 
 #include "orbane/OverlayControl.h"
 
@@ -65,7 +66,6 @@ ORBANE_PENDING_INPUT(PatternControl);
 ORBANE_PENDING_PREVIEW(PolyLineControl);
 ORBANE_PENDING_PREVIEW(PositionerControl);
 ORBANE_PENDING_INPUT(RangeControl);
-ORBANE_PENDING_PREVIEW(RectangleControl);
 ORBANE_PENDING_INPUT(ScrewControl);
 ORBANE_PENDING_DERIVED(SliderOverlay, OverlayControl);
 ORBANE_PENDING_INPUT(SplineControl);

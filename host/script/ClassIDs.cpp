@@ -20,6 +20,7 @@ const OrbID CLSID_PreviewControl_Crop("CropControl");
 const OrbID CLSID_DataType_Number("Number");
 const OrbID CLSID_DataType_Point("Point");
 const OrbID CLSID_DataType_Text("Text");
+const OrbID CLSID_DataType_Image("Image");
 const OrbID CLSID_DataType_ID("ID");
 const OrbID CLSID_DataType_PolyLine("PolyLine");
 const OrbID CLSID_DataType_ScriptVal("ScriptVal");

@@ -23,6 +23,7 @@ extern const OrbID CLSID_PreviewControl_Crop;
 extern const OrbID CLSID_DataType_Number;
 extern const OrbID CLSID_DataType_Point;
 extern const OrbID CLSID_DataType_Text;
+extern const OrbID CLSID_DataType_Image;
 extern const OrbID CLSID_DataType_ID;
 extern const OrbID CLSID_DataType_PolyLine;
 extern const OrbID CLSID_DataType_ScriptVal;

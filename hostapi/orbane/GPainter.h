@@ -3,6 +3,8 @@
 #include "orbane/GColor.h"
 #include "orbane/Types.h"
 
+class QImage;
+
 namespace Orbane {
 namespace Graphics {
 
@@ -109,6 +111,12 @@ public:
     // UTF-8 text with its baseline starting at the transformed point; the
     // glyphs stay upright and unscaled.
     virtual void Text(float64 x, float64 y, const char *text) = 0;
+    // `image` mapped onto the quad `corners` (four x, y pairs in the current
+    // coordinates: the image's bottom-left, bottom-right, top-right and
+    // top-left), its colours multiplied by `color` (grey and alpha), blended
+    // by BlendFunc while GC_Blend is on and opaque while it is off. No shadow
+    // pass. Painters that cannot draw images draw nothing.
+    virtual void Texture(const QImage &image, const float64 *corners, const GColor &color);
 
     // Arrays for geometry built once and drawn every frame. The painter keeps
     // the pointers, not copies: the arrays must stay alive and unchanged

@@ -55,6 +55,10 @@ public:
     const char *GetName() const noexcept { return mName.IsEmpty() ? mID.c_str() : mName.c_str(); }
     const OrbID &GetDataType() const noexcept { return mDataType; }
     const TagList &GetAttrs() const noexcept { return mAttrs; }
+    // Adds attributes after the Input was made: for a tool file's tags that
+    // name another Input of the tool, which exists only once all are made.
+    // Set-up only: before any control reads the attributes.
+    void AddAttrs(const TagList &more) { mAttrs.Append(more); }
     const Parameter *GetDefault() const noexcept { return mDefault.get(); }
     Operator *GetOperator() const noexcept { return mOperator; }
     OrbaneDoc *GetDoc() const noexcept;

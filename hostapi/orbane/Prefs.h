@@ -16,6 +16,9 @@ enum PrefTag : Tag
     PREF_SelectPointsFromMultiPolies = MakeTag(TAGTYPE_Long, TAGGROUP_Prefs, 1),
     // The image file the viewer shows (a comp's `image`); none: a checkerboard.
     PREF_ViewerImage = MakeTag(TAGTYPE_String, TAGGROUP_Prefs, 2),
+    // The width of one pixel of that image over its height (a comp's
+    // `pixelAspect`; 2 for a 2:1 squeeze). None or not positive: 1.
+    PREF_ViewerPixelAspect = MakeTag(TAGTYPE_Double, TAGGROUP_Prefs, 3),
 };
 
 } // namespace Orbane

@@ -146,6 +146,11 @@ public:
     // is never under the mouse.
     virtual bool HoverBounds(const PreviewInfo &info, OrbRect &bounds) const;
 
+    // What a user sees of the overlay's state, as named fields of the table
+    // `state` (scripts read it through orbane.OverlayState). The base sets
+    // `highlight` and `dragType`; each overlay class adds its own fields.
+    virtual void GetState(ScriptVal &state) const;
+
     // --- what overlays use of the base ---
     // Finds the Input that `tags` names, by its address (a ScriptObject
     // pointer) under `ptrTag` or by its id under `idTag` among `tool`'s
@@ -158,6 +163,8 @@ public:
     void DetachFromInput(Input *&slot);
 
     DragType IsDragging() const { return mDragType; }
+    // Is the overlay drawn highlighted (under the mouse or dragged)?
+    bool IsHighlighted() const { return mHighlighted; }
     bool IsActive() const { return mActive; }
     const std::vector<Input *> &Inputs() const { return mInputs; }
     Input *GetMainInput() const { return mInputs.empty() ? nullptr : mInputs.front(); }
@@ -192,6 +199,8 @@ protected:
     int32 IndexOf(const Input *input) const;
 
     DragType mDragType = DRAG_None;
+    // Set by overlays that highlight what the mouse is over.
+    bool mHighlighted = false;
     float64 mDisplayOffsetX = 0.0;
     float64 mDisplayOffsetY = 0.0;
 

@@ -19,10 +19,22 @@ enum TagType : uint32
     TAGTYPE_ID = 0x8,     // GetID
 };
 
-constexpr uint32 TagTypeOf(Tag tag) noexcept { return tag >> 28; }
-constexpr bool TagIsRepeatable(Tag tag) noexcept { return (tag >> 27) & 1u; }
-constexpr uint32 TagGroupOf(Tag tag) noexcept { return (tag >> 16) & 0xFFu; }
-constexpr uint32 TagIndexOf(Tag tag) noexcept { return tag & 0xFFFFu; }
+constexpr uint32 TagTypeOf(Tag tag) noexcept
+{
+    return tag >> 28;
+}
+constexpr bool TagIsRepeatable(Tag tag) noexcept
+{
+    return (tag >> 27) & 1u;
+}
+constexpr uint32 TagGroupOf(Tag tag) noexcept
+{
+    return (tag >> 16) & 0xFFu;
+}
+constexpr uint32 TagIndexOf(Tag tag) noexcept
+{
+    return tag & 0xFFFFu;
+}
 constexpr Tag MakeTag(uint32 type, uint32 group, uint32 index, bool repeatable = false) noexcept
 {
     return type << 28 | (repeatable ? 1u << 27 : 0u) | (group & 0xFFu) << 16 | (index & 0xFFFFu);
@@ -32,11 +44,11 @@ constexpr Tag MakeTag(uint32 type, uint32 group, uint32 index, bool repeatable =
 enum TagGroup : uint32
 {
     TAGGROUP_Registry = 0x00,
-    TAGGROUP_Input = 0x02,   // the host's Input attributes
-    TAGGROUP_Item = 0x03,    // item identifiers shared by list-like controls
-    TAGGROUP_Text = 0x04,    // shared control texts
-    TAGGROUP_Class = 0x05,   // a control class's own attributes
-    TAGGROUP_Class2 = 0x06,  // a second range of class attributes
+    TAGGROUP_Input = 0x02,  // the host's Input attributes
+    TAGGROUP_Item = 0x03,   // item identifiers shared by list-like controls
+    TAGGROUP_Text = 0x04,   // shared control texts
+    TAGGROUP_Class = 0x05,  // a control class's own attributes
+    TAGGROUP_Class2 = 0x06, // a second range of class attributes
 };
 
 // Registration tags given to Registry::_Init.
@@ -67,12 +79,14 @@ constexpr int32 REGKIND_PreviewControl = 0x1B0000;
 // Input attributes (group 0x02) and shared texts (group 0x04).
 enum InputTag : Tag
 {
-    INPA_Name = 0x30020014,          // the Input's display name
-    INPA_InputControl = 0x88020010,  // class ID of an inspector control that shows the Input (repeatable)
+    INPA_Name = 0x30020014,           // the Input's display name
+    INPA_InputControl = 0x88020010,   // class ID of an inspector control that shows the Input (repeatable)
     INPA_PreviewControl = 0x88020011, // class ID of a viewer overlay that edits the Input (repeatable)
-    INPA_LayoutHeight = 0x10020007,  // a layout object's height
-    LINKS_Name = 0x30040000,         // label text
-    LINKS_SecondName = 0x30040001,   // second label text
+    INPA_OverlayInput = 0x88020012,   // id of a further Input of the tool that the Input's overlays edit
+                                      // (repeatable; the first is their Input index 1, and so on)
+    INPA_LayoutHeight = 0x10020007,   // a layout object's height
+    LINKS_Name = 0x30040000,          // label text
+    LINKS_SecondName = 0x30040001,    // second label text
 };
 
 } // namespace Orbane

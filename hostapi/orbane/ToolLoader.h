@@ -15,26 +15,34 @@ class ScriptVal;
 //       { id = "Invert", name = "Invert", type = "Number", default = 0,
 //         control = "CheckboxControl",            -- or a list of classes: one control each
 //         overlay = "CrosshairControl",            -- viewer overlays, likewise
+//         overlayInputs = { "Height" },            -- further Inputs the overlays edit (index 1, ...)
 //         label = "Invert", label2 = "Colours",    -- label texts (0x30040000, 0x30040001)
-//         tags = { CBC_TriState = true },          -- named tags of the control and overlay classes
+//         tags = { CBC_TriState = true },          -- named tags of the control and overlay classes;
+//                                                  -- an Input-valued one takes an Input id of the
+//                                                  -- tool (RCP_Center = "Center"); a tag with no
+//                                                  -- script name goes by number ([0x10058000] = 1)
 //         attrs = { [0x10050001] = 1 } },          -- any further Input attributes by number;
 //                                                  -- { { 0x38040000, "A" }, { 0x38040001, "" } }
 //                                                  -- gives them in this order (repeated tags);
 //                                                  -- an object tag given stops { {pos, r, g, b [, a]}, ... }
 //                                                  -- holds a Gradient
 //       ... } }
-// Data types: "Number", "Point" (default {x, y}), "Text", "ID", "ScriptVal".
+// Data types: "Number", "Point" (default {x, y}), "Text", "ID", "ScriptVal", and "Image"
+// (default: an image file's path, relative to the tool file).
 // Named tags go through the same tag maps as orbane.Create, so a misspelt
 // tag fails with a message naming the tool, the Input and the tag.
 //
 // A comp file returns { time = 0, tools = { { file = "tools/Demo.lua", name = "Demo1" }, ... } };
 // file names are relative to the comp file. An optional `image = "images/x.png"`
-// names the image the viewer shows (PREF_ViewerImage).
+// names the image the viewer shows (PREF_ViewerImage), and `pixelAspect = 2` the width of
+// one of its pixels over its height (PREF_ViewerPixelAspect).
 class ToolLoader
 {
 public:
     // A new tool (one reference, the caller's) named `name`; null with `error` set.
-    static Operator *FromTable(const ScriptVal &desc, const char *name, std::string *error);
+    // Relative image paths start at `dir` (the current directory where empty).
+    static Operator *FromTable(const ScriptVal &desc, const char *name, std::string *error,
+                               const std::string &dir = std::string());
     static Operator *LoadTool(const std::string &path, const char *name, std::string *error);
     // Adds every tool of the comp to the document and sets its time.
     static bool LoadComp(OrbaneDoc &doc, const std::string &path, std::string *error);

@@ -71,6 +71,10 @@ public:
     void SetImage(const QImage &image);
     bool HasImage() const;
     QSize ImageSize() const;
+    // The width of one image pixel over its height; the view refits. Not
+    // positive or not a number: 1.
+    void SetPixelAspect(float64 aspect);
+    float64 PixelAspect() const { return mPixelAspect; }
 
     // --- the view ---
     const ViewMapping &Mapping() const { return mInfo.Mapping(); }
@@ -170,6 +174,7 @@ private:
     PreviewInfo mInfo;
     bool mUserView = false; // the user zoomed or panned: keep the view on resize
     uint32 mPressFlags = 0;
+    float64 mPixelAspect = 1.0;
 
     PreviewControl *mHot = nullptr;
     PreviewControl *mHover = nullptr;

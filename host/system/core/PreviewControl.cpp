@@ -8,6 +8,7 @@
 #include "orbane/Parameter.h"
 #include "orbane/PreviewInfo.h"
 #include "orbane/Registry.h"
+#include "orbane/ScriptVal.h"
 
 #include <QGuiApplication>
 
@@ -189,6 +190,12 @@ void PreviewControl::SetUndo(uint32 open, const TagList *)
 {
     mUndoOpen = open != 0;
     mUndoDoc = mUndoOpen ? GetDoc() : nullptr;
+}
+
+void PreviewControl::GetState(ScriptVal &state) const
+{
+    state.SetKey(ScriptVal("highlight"), ScriptVal(mHighlighted));
+    state.SetKey(ScriptVal("dragType"), ScriptVal(int64(mDragType)));
 }
 
 void PreviewControl::GetName(char *buffer, int32 size, const TagList *) const

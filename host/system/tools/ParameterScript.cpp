@@ -1,6 +1,7 @@
 #include "orbane/ParameterScript.h"
 
 #include "orbane/ClassIDs.h"
+#include "orbane/ImageParam.h"
 #include "orbane/Number.h"
 #include "orbane/OrbIDParam.h"
 #include "orbane/Point.h"
@@ -46,6 +47,8 @@ Parameter *Make(const OrbID &type, const ScriptVal &v)
         return v.IsString() ? new OrbIDParam(v.GetString()) : nullptr;
     if (type == CLSID_DataType_ScriptVal)
         return new ScriptValParam(ScriptValParam::DeepCopy(v));
+    if (type == CLSID_DataType_Image)
+        return v.IsString() ? new ImageParam(v.GetString()) : nullptr;
     return nullptr;
 }
 
@@ -77,6 +80,8 @@ ScriptVal ParameterScript::ToScript(const Parameter *value)
         return ScriptVal(id->Value.c_str());
     if (auto s = dynamic_cast<const ScriptValParam *>(value))
         return ScriptValParam::DeepCopy(s->Value);
+    if (auto i = dynamic_cast<const ImageParam *>(value))
+        return ScriptVal(i->Path.c_str());
     return ScriptVal();
 }
 

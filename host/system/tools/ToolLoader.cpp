@@ -1,6 +1,7 @@
 #include "orbane/ToolLoader.h"
 
 #include "orbane/AutoRef.h"
+#include "orbane/ClassIDs.h"
 #include "orbane/Gradient.h"
 #include "orbane/Input.h"
 #include "orbane/LuaRuntime.h"
@@ -17,6 +18,7 @@
 #include <QDir>
 #include <QFileInfo>
 
+#include <set>
 #include <vector>
 
 namespace Orbane {
@@ -116,8 +118,8 @@ bool AddNumberedAttrs(const ScriptVal &attrs, TagList &tags, std::string *error)
 }
 
 // Maps one named tag through the first of the Input's classes that knows it.
-bool MapNamedTag(const std::vector<std::string> &classes, const ScriptVal &name, const ScriptVal &value,
-                 TagList &tags, std::string *error)
+bool MapNamedTag(const std::vector<std::string> &classes, const ScriptVal &name, const ScriptVal &value, TagList &tags,
+                 std::string *error)
 {
     std::string why = std::string("unknown tag \"") + name.GetString("?") + "\"";
     for (const std::string &cls : classes) {
@@ -138,7 +140,44 @@ bool MapNamedTag(const std::vector<std::string> &classes, const ScriptVal &name,
     return false;
 }
 
-bool BuildAttrs(const ScriptVal &decl, const char *name, TagList &tags, std::string *error)
+// A named tag whose value names another Input of the tool (RCP_Center =
+// "Center"): it is given that Input once every Input exists.
+struct InputLink
+{
+    int32 input;    // the Input that carries the tag, in declaration order
+    ScriptVal name; // the tag's name
+    std::string target;
+};
+
+// What the Inputs of a tool file say beyond each one alone.
+struct ToolContext
+{
+    std::set<std::string> ids; // every Input id the file declares
+    std::vector<InputLink> links;
+    int32 current = 0;
+    QDir base; // where relative image paths start
+};
+
+bool BuildNamedTags(const ScriptVal &named, const std::vector<std::string> &classes, TagList &tags, ToolContext &ctx,
+                    std::string *error)
+{
+    for (const auto &[key, value] : named.GetEntries()) {
+        // A tag without a script name is given by number.
+        if (key.IsNumber()) {
+            if (!AddNumberedAttr(key, value, tags, error))
+                return false;
+            continue;
+        }
+        if (MapNamedTag(classes, key, value, tags, error))
+            continue;
+        if (!value.IsString() || !ctx.ids.count(value.GetString()))
+            return false;
+        ctx.links.push_back({ctx.current, key, value.GetString()});
+    }
+    return true;
+}
+
+bool BuildAttrs(const ScriptVal &decl, const char *name, TagList &tags, ToolContext &ctx, std::string *error)
 {
     tags.Add(INPA_Name, name);
     if (const char *label = Str(decl, "label", nullptr))
@@ -152,16 +191,36 @@ bool BuildAttrs(const ScriptVal &decl, const char *name, TagList &tags, std::str
         tags.Add(INPA_PreviewControl, OrbID(c));
         classes.push_back(c);
     }
+    for (const std::string &id : Names(decl, "overlayInputs"))
+        tags.Add(INPA_OverlayInput, OrbID(id));
     if (const ScriptVal *attrs = decl.FindKeyConst(ScriptVal("attrs")); attrs && !AddNumberedAttrs(*attrs, tags, error))
         return false;
     if (const ScriptVal *named = decl.FindKeyConst(ScriptVal("tags")))
-        for (const auto &[key, value] : named->GetEntries())
-            if (!MapNamedTag(classes, key, value, tags, error))
-                return false;
+        return BuildNamedTags(*named, classes, tags, ctx, error);
     return true;
 }
 
-bool AddInputFrom(Operator &tool, const ScriptVal &decl, std::string *error)
+// Gives each deferred Input-valued tag its Input, mapped as an object.
+bool ResolveLinks(Operator &tool, const ScriptVal &inputs, const ToolContext &ctx, std::string *error)
+{
+    for (const InputLink &link : ctx.links) {
+        const ScriptVal &decl = *inputs.FindKeyConst(ScriptVal(link.input + 1));
+        std::vector<std::string> classes = Names(decl, "control");
+        for (const std::string &c : Names(decl, "overlay"))
+            classes.push_back(c);
+        Input *in = tool.Inputs()[std::size_t(link.input)];
+        TagList mapped;
+        std::string why;
+        if (!MapNamedTag(classes, link.name, ScriptVal(tool.FindInput(OrbID(link.target.c_str()))), mapped, &why)) {
+            *error = std::string("Input \"") + in->GetID().c_str() + "\": " + why;
+            return false;
+        }
+        in->AddAttrs(mapped);
+    }
+    return true;
+}
+
+bool AddInputFrom(Operator &tool, const ScriptVal &decl, ToolContext &ctx, std::string *error)
 {
     const char *id = Str(decl, "id", nullptr);
     if (!id) {
@@ -173,12 +232,16 @@ bool AddInputFrom(Operator &tool, const ScriptVal &decl, std::string *error)
     TagList attrs;
     AutoRef<Parameter> def;
     std::string why;
-    if (!BuildAttrs(decl, name, attrs, &why)) {
+    if (!BuildAttrs(decl, name, attrs, ctx, &why)) {
         *error = std::string("Input \"") + id + "\": " + why;
         return false;
     }
     if (const ScriptVal *v = decl.FindKeyConst(ScriptVal("default"))) {
-        def = AutoRef<Parameter>(ParameterScript::FromScript(type, *v, &why));
+        // An image file is named relative to the tool file.
+        const ScriptVal value = type == CLSID_DataType_Image && v->IsString()
+                                    ? ScriptVal(ctx.base.filePath(QString::fromUtf8(v->GetString())).toStdString())
+                                    : *v;
+        def = AutoRef<Parameter>(ParameterScript::FromScript(type, value, &why));
         if (!def) {
             *error = std::string("Input \"") + id + "\": default: " + why;
             return false;
@@ -193,16 +256,26 @@ bool AddInputFrom(Operator &tool, const ScriptVal &decl, std::string *error)
 
 } // namespace
 
-Operator *ToolLoader::FromTable(const ScriptVal &desc, const char *name, std::string *error)
+Operator *ToolLoader::FromTable(const ScriptVal &desc, const char *name, std::string *error, const std::string &dir)
 {
     AutoRef<Operator> tool(new Operator(name, Str(desc, "type", name)));
     const ScriptVal *inputs = desc.FindKeyConst(ScriptVal("inputs"));
+    ToolContext ctx;
+    ctx.base = QDir(QString::fromStdString(dir));
+    for (int32 i = 1; inputs && i <= inputs->Length(); ++i)
+        if (const char *id = Str(*inputs->FindKeyConst(ScriptVal(i)), "id", nullptr))
+            ctx.ids.insert(id);
+    std::string why;
     for (int32 i = 1; inputs && i <= inputs->Length(); ++i) {
-        std::string why;
-        if (!AddInputFrom(*tool, *inputs->FindKeyConst(ScriptVal(i)), &why)) {
+        ctx.current = i - 1;
+        if (!AddInputFrom(*tool, *inputs->FindKeyConst(ScriptVal(i)), ctx, &why)) {
             *error = std::string("tool \"") + name + "\": " + why;
             return nullptr;
         }
+    }
+    if (inputs && !ResolveLinks(*tool, *inputs, ctx, &why)) {
+        *error = std::string("tool \"") + name + "\": " + why;
+        return nullptr;
     }
     return tool.Take();
 }
@@ -212,7 +285,7 @@ Operator *ToolLoader::LoadTool(const std::string &path, const char *name, std::s
     ScriptVal desc;
     if (!RunDescription(path, desc, error))
         return nullptr;
-    Operator *tool = FromTable(desc, name, error);
+    Operator *tool = FromTable(desc, name, error, QFileInfo(QString::fromStdString(path)).absolutePath().toStdString());
     if (!tool)
         *error = path + ": " + *error;
     return tool;
@@ -238,6 +311,9 @@ bool ToolLoader::LoadComp(OrbaneDoc &doc, const std::string &path, std::string *
     }
     if (const ScriptVal *time = comp.FindKeyConst(ScriptVal("time")))
         doc.SetCurrentTime(time->GetNumber());
+    // The pixel aspect first, so the image is fitted with it.
+    if (const ScriptVal *aspect = comp.FindKeyConst(ScriptVal("pixelAspect")); aspect && aspect->IsNumber())
+        doc.SetPref(PREF_ViewerPixelAspect, aspect->GetNumber());
     if (const char *image = Str(comp, "image", nullptr))
         doc.SetPref(PREF_ViewerImage, base.filePath(QString::fromUtf8(image)).toStdString());
     return true;

@@ -3,8 +3,12 @@
 #include "PrimitiveAssembly.h"
 #include "StippleDashes.h"
 
+#include <QImage>
 #include <QPainter>
 #include <QPen>
+#include <QTransform>
+
+#include <algorithm>
 
 namespace Orbane {
 namespace Graphics {
@@ -122,6 +126,37 @@ void QtGPainter::End()
 void QtGPainter::Rectangle(float64 x1, float64 y1, float64 x2, float64 y2)
 {
     Draw(GP_Quads, {ToWidget(x1, y1, 0.0), ToWidget(x2, y1, 0.0), ToWidget(x2, y2, 0.0), ToWidget(x1, y2, 0.0)});
+}
+
+void QtGPainter::Texture(const QImage &image, const float64 *corners, const GColor &color)
+{
+    if (image.isNull() || !corners)
+        return;
+    QPolygonF quad;
+    for (int i = 0; i < 4; ++i)
+        quad << ToWidget(corners[2 * i], corners[2 * i + 1], 0.0);
+    // The image's rows run top down: its bottom-left is (0, height).
+    const QPolygonF source(
+        {QPointF(0, image.height()), QPointF(image.width(), image.height()), QPointF(image.width(), 0), QPointF(0, 0)});
+    QTransform map;
+    if (!QTransform::quadToQuad(source, quad, map))
+        return;
+    QImage tinted = image.convertToFormat(QImage::Format_ARGB32_Premultiplied);
+    const float32 grey = std::clamp(color.r, 0.0f, 1.0f);
+    if (grey < 1.0f) {
+        QPainter darken(&tinted);
+        darken.setCompositionMode(QPainter::CompositionMode_Multiply);
+        darken.fillRect(tinted.rect(), QColor::fromRgbF(grey, grey, grey));
+    }
+    ApplyBlendAndSmoothing();
+    mPainter->save();
+    // Alpha weighs the image only where the blend takes the source's alpha.
+    const bool byAlpha = mState.IsEnabled(GC_Blend) && mState.BlendSource == GBF_SrcAlpha;
+    mPainter->setOpacity(byAlpha ? std::clamp(color.a, 0.0f, 1.0f) : 1.0);
+    mPainter->setTransform(map, true);
+    mPainter->setRenderHint(QPainter::SmoothPixmapTransform);
+    mPainter->drawImage(QPointF(0, 0), tinted);
+    mPainter->restore();
 }
 
 void QtGPainter::Text(float64 x, float64 y, const char *text)

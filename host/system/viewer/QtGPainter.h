@@ -58,6 +58,7 @@ public:
     void End() override;
     void Rectangle(float64 x1, float64 y1, float64 x2, float64 y2) override;
     void Text(float64 x, float64 y, const char *text) override;
+    void Texture(const QImage &image, const float64 *corners, const GColor &color) override;
 
     void SetVertexArray(const float64 *xyz, int32 count) override;
     void SetIndexArray(const uint32 *indices, int32 count) override;

@@ -49,6 +49,9 @@ ViewerPanel::ViewerPanel(OrbaneDoc *doc, QWidget *parent)
     connect(doc, SIGNAL(toolRemoving(Orbane::Operator *)), this, SLOT(OnToolRemoving(Orbane::Operator *)));
     connect(doc, SIGNAL(prefChanged(uint32)), this, SLOT(OnPrefChanged(uint32)));
     connect(doc, SIGNAL(currentTimeChanged(float64)), this, SLOT(OnTimeChanged(float64)));
+    mPixelAspect = doc->GetPrefs().GetDouble(PREF_ViewerPixelAspect, 1.0);
+    if (!(mPixelAspect > 0.0) || !std::isfinite(mPixelAspect))
+        mPixelAspect = 1.0;
     OnPrefChanged(PREF_ViewerImage);
     FitImage();
 }
@@ -108,10 +111,16 @@ PreviewControl *ViewerPanel::CreateOverlay(Input *input, const char *classID)
         RequestRedraw();
     });
     overlay->AddInput(input, &attrs);
+    // Further Inputs the overlay edits (a rectangle's height), in the order named.
+    for (const TagItem *item = attrs.Find(INPA_OverlayInput); item; item = attrs.FindNext(item))
+        if (Input *more = mTool->FindInput(item->id))
+            overlay->AddInput(more, &attrs);
     overlay->SetAttrsTagList(input, attrs);
     overlay->SetView(&mInfo, nullptr);
-    const AutoParameter value(input->GetValue(mDoc->GetCurrentTime()));
-    overlay->NotifyChanged(input, value.get(), nullptr);
+    for (Input *in : std::vector<Input *>(overlay->Inputs())) {
+        const AutoParameter value(in->GetValue(mDoc->GetCurrentTime()));
+        overlay->NotifyChanged(in, value.get(), nullptr);
+    }
     return overlay;
 }
 
@@ -191,8 +200,17 @@ QSize ViewerPanel::ImageSize() const
     return QSize(mBackdrop->Width(), mBackdrop->Height());
 }
 
+void ViewerPanel::SetPixelAspect(float64 aspect)
+{
+    mPixelAspect = aspect > 0.0 && std::isfinite(aspect) ? aspect : 1.0;
+    mUserView = false;
+    FitImage();
+}
+
 void ViewerPanel::OnPrefChanged(uint32 pref)
 {
+    if (pref == PREF_ViewerPixelAspect)
+        SetPixelAspect(mDoc->GetPrefs().GetDouble(PREF_ViewerPixelAspect, 1.0));
     if (pref != PREF_ViewerImage)
         return;
     const char *path = mDoc->GetPrefs().GetString(PREF_ViewerImage, "");
@@ -210,13 +228,14 @@ void ViewerPanel::OnTimeChanged(float64)
 void ViewerPanel::FitImage()
 {
     mUserView = false;
-    SetMapping(ViewMapping::Fitted(mBackdrop->Width(), mBackdrop->Height(), 1.0, width(), height()));
+    SetMapping(ViewMapping::Fitted(mBackdrop->Width(), mBackdrop->Height(), mPixelAspect, width(), height()));
 }
 
 void ViewerPanel::SetView(float64 zoom, OrbPoint pan)
 {
     mUserView = true;
-    SetMapping(ViewMapping::Centered(mBackdrop->Width(), mBackdrop->Height(), 1.0, zoom, width(), height(), pan));
+    SetMapping(
+        ViewMapping::Centered(mBackdrop->Width(), mBackdrop->Height(), mPixelAspect, zoom, width(), height(), pan));
 }
 
 void ViewerPanel::ZoomAbout(float64 zoom, OrbPoint anchor)

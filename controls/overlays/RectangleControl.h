@@ -1,0 +1,109 @@
+#pragma once
+
+#include "framework/LinkedInput.h"
+#include "overlays/RectangleGeometry.h"
+
+#include "orbane/PreviewControl.h"
+
+#include <QImage>
+
+namespace Orbane {
+
+namespace Graphics {
+class GPainter;
+} // namespace Graphics
+
+// A rotatable rectangle over the image, resized by its four edges and four
+// corners. It edits two Number Inputs, the width (index 0) and the height
+// (index 1), and only reads the Inputs that place it: centre (one point or
+// two numbers), angle, size multiplier, pivot axis (likewise), flips, and an
+// image shown inside it.
+class RectangleControl : public PreviewControl
+{
+public:
+    RectangleControl(const Registry *reg, const ScriptVal &args, const TagList &tags);
+    ~RectangleControl() override;
+
+    std::size_t SizeOf() const override { return sizeof(RectangleControl); }
+    bool CopyAttr(Tag tag, void *out) override;
+    bool GetAttrsTagList(TagList &tags) const override;
+    void GetState(ScriptVal &state) const override;
+
+    using PreviewControl::SetAttrsTagList;
+    bool SetAttrsTagList(Input *input, const TagList &tags) override;
+    bool RemoveInput(Input *input, const TagList *tags) override;
+    void NotifyChanged(Input *input, Parameter *value, const TagList *tags) override;
+    void DrawControls(PreviewInfo *info, const TagList *tags) override;
+    DragType ControlDown(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
+    void ControlMove(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
+    void ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
+    uint64 ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags) override;
+
+    // The shape as the Inputs and tags give it now.
+    RectangleShape Shape() const;
+    float64 Width() const { return mWidth; }
+    float64 Height() const { return mHeight; }
+    bool LocksAspect() const { return mLockAspect != 0; }
+    float64 Aspect() const { return mAspect; }
+    int32 PenStyle() const { return mPenStyle; }
+    int32 HoverPart() const { return mHoverPart; }
+    int32 DragPart() const { return mDragPart; }
+    int32 LastPart() const { return mLastPart; }
+    OrbPoint GrabOffset() const { return mGrabOffset; }
+    // The blend amount the image inside is drawn with: taken when the
+    // display is refreshed, which a change of the amount alone does not do.
+    float64 ShownBlendAmount() const { return mShownBlendAmount; }
+    void SetCornerRound(float64 round) { mCornerRound = round; }
+
+    // The stipple pattern of a pen style (0: solid, no pattern).
+    static uint16 StipplePattern(int32 penStyle) noexcept;
+    // Outline strips in drawing order, one per part code.
+    static constexpr int32 StripOrder[8] = {1, 3, 2, 6, 4, 12, 8, 9};
+
+private:
+    static const LinkedInput<RectangleControl> Links[];
+
+    RectangleFrame DrawnFrame(const PreviewInfo &info) const;
+    OrbPoint Tolerance(const PreviewInfo &info) const;
+    int32 PartAt(const PreviewInfo &info, OrbPoint &local) const;
+    uint64 HitTest(const PreviewInfo &info, uint64 data);
+    bool IsPlacingInput(const Input *input) const;
+    void ReadPlacement(const TagList &tags);
+    bool ReadAspectLock(const TagList &tags);
+    void StoreLinked(Input *input, const Parameter *value, bool &moved);
+    void WriteSides(OrbPoint sides);
+    void WriteNumber(float64 value, uint32 index);
+    void DrawOutline(Graphics::GPainter &p, const PreviewInfo &info, const RectangleFrame &frame) const;
+    void DrawStrip(Graphics::GPainter &p, const PreviewInfo &info, const RectangleFrame &frame, int32 part) const;
+    void DrawImage(Graphics::GPainter &p, const PreviewInfo &info, const RectangleFrame &frame) const;
+
+    Input *mCenterInput = nullptr, *mCenterXInput = nullptr, *mCenterYInput = nullptr;
+    Input *mAngleInput = nullptr;
+    Input *mSizeInput = nullptr;
+    Input *mAxisInput = nullptr, *mAxisXInput = nullptr, *mAxisYInput = nullptr;
+    Input *mFlipXInput = nullptr, *mFlipYInput = nullptr;
+    Input *mImageInput = nullptr;
+
+    OrbPoint mCenter{0.5, 0.5};
+    float64 mAngle = 0.0;
+    float64 mSize = 1.0;
+    OrbPoint mAxis{0.5, 0.5};
+    float64 mWidth = 0.0, mHeight = 0.0;
+    bool mFlipX = false, mFlipY = false;
+    uint8 mLockAspect = 0;
+    float64 mAspect = 1.0;
+    float64 mDisplayXScale = 1.0, mDisplayYScale = 1.0;
+    int32 mPenStyle = 0;
+    int32 mBlendMode = 0;
+    float64 mBlendAmount = 1.0;
+    float64 mShownBlendAmount = 1.0;
+    uint8 mDragWidth = 0, mDragHeight = 0;
+    int32 mHoverPart = 0, mDragPart = 1, mLastPart = 9;
+    float64 mCornerRound = 0.0;
+    OrbPoint mGrabOffset;
+    QImage mImage;           // the image Input's pixels, shown inside
+    RectangleShape mDrawn;   // the shape as last drawn, which the mouse meets
+    bool mAdjusting = false; // our own undo group is open
+};
+
+} // namespace Orbane
