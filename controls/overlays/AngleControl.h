@@ -39,24 +39,6 @@ public:
     void ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
     uint64 ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags) override;
 
-    // What the user sees.
-    float64 Angle() const { return mAngle; }
-    float64 DrawnAngle() const { return mDrawnAngle; }
-    float64 DrawnRadius() const { return mDrawnRadius; }
-    OrbPoint Center() const { return mCenter; }
-    float64 Radius() const { return mRadius; }
-    int32 DialStyle() const { return mDialStyle; }
-    bool Hovered() const { return bool(Handles().PoisedHit()); }
-    bool FollowsCursor() const { return mFollowCursor != 0; }
-    // For a press flagged PEF_StartGrab: the centre of a dial whose arm
-    // reaches where the press began (viewer units). The dial is drawn there
-    // a second time while the drag lasts; 0, 0 when none.
-    OrbPoint StartGrab() const { return mStartGrab; }
-    OrbPoint GrabOffset() const { return mGrabOffset; }
-    float64 AngleAtPress() const { return mAngleAtPress; }
-    Input *CenterInput() const { return mCenterInput; }
-    Input *RadiusInput() const { return mRadiusInput; }
-
     // Frees the dial's ring, shared by every angle overlay, then the base's.
     static bool RegCleanup(Registry *reg);
 
@@ -96,6 +78,9 @@ private:
     OrbPoint mGrabOffset;
     float64 mAngleAtPress = 0.0;
     float64 mAngleOffset = 0.0;
+    // For a press flagged PEF_StartGrab: the centre of a dial whose arm
+    // reaches where the press began (viewer units). The dial is drawn there
+    // a second time while the drag lasts; 0, 0 when none.
     OrbPoint mStartGrab;
     int32 mDialStyle = 1;
     // As last drawn.
