@@ -331,7 +331,11 @@ OrbPoint RectangleControl::MouseInFrame(const PreviewInfo &info, const Rectangle
 void RectangleControl::BuildHandles(const PreviewInfo &info, HandleSet &handles) const
 {
     handles.Clear();
-    const RectangleFrame frame = DrawnFrame(info);
+    AddOutline(info, DrawnFrame(info), handles);
+}
+
+void RectangleControl::AddOutline(const PreviewInfo &info, const RectangleFrame &frame, HandleSet &handles) const
+{
     const ViewMapping &m = info.Mapping();
     const OrbPoint at = info.TransformOut(frame.ToImage(frame.Middle()));
     const OrbPoint origin = frame.ToFrame(mCenter);
@@ -354,6 +358,19 @@ void RectangleControl::BuildHandles(const PreviewInfo &info, HandleSet &handles)
         h.priority = h.sideX && h.sideY ? HP_Corner : HP_Edge;
         handles.Add(h);
     }
+}
+
+// The viewer takes the bounds when a new value asks for a redraw, before
+// the draw that puts the sides where the value says: they hold the outline
+// as drawn and as it will be drawn.
+bool RectangleControl::HoverBounds(const PreviewInfo &info, OrbRect &bounds) const
+{
+    HandleSet handles;
+    BuildHandles(info, handles);
+    const ViewMapping &m = info.Mapping();
+    AddOutline(info, RectangleFrame(Shape(), m.ImageWidth(), m.ImageHeight(), m.PixelAspect()), handles);
+    handles.Bounds(info.HandleScale, info.PickTolerance, bounds);
+    return true;
 }
 
 bool RectangleControl::IsPlacingInput(const Input *input) const

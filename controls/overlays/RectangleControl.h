@@ -37,6 +37,7 @@ public:
     DragType ControlDown(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
     void ControlMove(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
     void ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
+    bool HoverBounds(const PreviewInfo &info, OrbRect &bounds) const override;
 
     // The shape as the Inputs and tags give it now.
     RectangleShape Shape() const;
@@ -67,6 +68,7 @@ private:
 
     RectangleFrame DrawnFrame(const PreviewInfo &info) const;
     OrbPoint Tolerance(const PreviewInfo &info) const;
+    void AddOutline(const PreviewInfo &info, const RectangleFrame &frame, HandleSet &handles) const;
     OrbPoint MouseInFrame(const PreviewInfo &info, const RectangleFrame &frame) const;
     bool IsPlacingInput(const Input *input) const;
     void ReadPlacement(const TagList &tags);
