@@ -21,7 +21,6 @@
 namespace Orbane {
 
 using Geo = AngleGeometry;
-using Graphics::GColor;
 using Graphics::GPainter;
 
 namespace {
