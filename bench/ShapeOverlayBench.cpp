@@ -1,7 +1,9 @@
-// Hovering over a viewer full of shape overlays: 100 turned rectangles on a
-// grid (the angle dials will join them), each asked CCMD_HitTest on every
-// mouse move, against a naive loop that tests the same rectangles' edges
-// with plain arithmetic. The goal: under 0.5 ms per mouse event.
+// Hovering over a viewer full of shape overlays: 100 turned rectangles and
+// 100 angle dials on a grid. The viewer asks only the rectangles near the
+// mouse (their hover bounds) and every dial (a dial fades with the mouse's
+// distance, so it hears every move) for CCMD_HitTest, against a naive loop
+// that tests the same rectangles' edges and the dials' rings with plain
+// arithmetic. The goal: under 0.5 ms per mouse event.
 #include "BenchModule.h"
 
 #include "orbane/AutoParam.h"
@@ -16,6 +18,7 @@
 #include <QApplication>
 #include <QMouseEvent>
 
+#include <algorithm>
 #include <cmath>
 #include <string>
 #include <vector>
@@ -28,6 +31,9 @@ constexpr int Width = 800, Height = 450;
 constexpr int ImageWidth = 1600, ImageHeight = 900;
 constexpr double Tolerance = 6;
 constexpr Tag RCD_SetX = 0x20058000, RCD_SetY = 0x20058001, RCD_SetAngle = 0x20058002;
+constexpr Tag ACID_Center = 0x80058000;
+// The dial's ring, in viewer pixels at handle scale 1.
+constexpr double RingRadius = 50;
 
 struct Rect
 {
@@ -44,15 +50,24 @@ std::vector<Rect> Rects(int count)
     return rects;
 }
 
-struct RectangleRig
+// Dials on the same grid, between the rectangles.
+std::vector<OrbPoint> Dials(int count)
 {
-    explicit RectangleRig(int count) : viewer(&doc)
+    std::vector<OrbPoint> dials;
+    for (int i = 0; i < count; ++i)
+        dials.emplace_back(0.095 + 0.09 * (i % 10), 0.095 + 0.09 * (i / 10 % 10));
+    return dials;
+}
+
+struct ShapeRig
+{
+    ShapeRig(int rectangles, int dials) : viewer(&doc)
     {
         auto *tool = new Operator("Shapes1", "Shapes");
         doc.AddTool(tool);
         tool->DecRef();
         int i = 0;
-        for (const Rect &r : Rects(count)) {
+        for (const Rect &r : Rects(rectangles)) {
             const std::string w = "W" + std::to_string(i), h = "H" + std::to_string(i++);
             const TagList attrs{{INPA_PreviewControl, OrbID("RectangleControl")},
                                 {INPA_OverlayInput, OrbID(h.c_str())},
@@ -61,6 +76,13 @@ struct RectangleRig
                                 {RCD_SetAngle, r.angle}};
             tool->AddInput(OrbID(w.c_str()), nullptr, CLSID_DataType_Number, attrs, AutoNumber(r.width));
             tool->AddInput(OrbID(h.c_str()), nullptr, CLSID_DataType_Number, TagList(), AutoNumber(r.height));
+        }
+        i = 0;
+        for (const OrbPoint &c : Dials(dials)) {
+            const std::string a = "A" + std::to_string(i), centre = "C" + std::to_string(i++);
+            tool->AddInput(OrbID(centre.c_str()), nullptr, CLSID_DataType_Point, TagList(), AutoPoint(c.x, c.y, 0.0));
+            const TagList attrs{{INPA_PreviewControl, OrbID("AngleControl")}, {ACID_Center, OrbID(centre.c_str())}};
+            tool->AddInput(OrbID(a.c_str()), nullptr, CLSID_DataType_Number, attrs, AutoNumber(7.0 * i));
         }
         QImage image(ImageWidth, ImageHeight, QImage::Format_ARGB32_Premultiplied);
         image.fill(QColor(40, 60, 90));
@@ -85,11 +107,11 @@ std::vector<QPointF> Path()
     return path;
 }
 
-void BM_Viewer_HoverRectangles(benchmark::State &state)
+void BM_Viewer_HoverShapes(benchmark::State &state)
 {
     if (!LoadControlModule())
         return state.SkipWithError("the control library did not load");
-    RectangleRig rig(int(state.range(0)));
+    ShapeRig rig(int(state.range(0)), int(state.range(1)));
     const std::vector<QPointF> path = Path();
     std::size_t i = 0;
     for (auto _ : state) {
@@ -108,10 +130,13 @@ void BM_Viewer_HoverRectangles(benchmark::State &state)
 }
 
 // The plain alternative: every rectangle's frame worked out from scratch
-// and its four edges tested against the tolerance, topmost first.
-void BM_NaiveLoop_HoverRectangles(benchmark::State &state)
+// and its four edges tested against the tolerance, topmost first; then every
+// dial's ring, each one's fade taken from the mouse's distance to it.
+void BM_NaiveLoop_HoverShapes(benchmark::State &state)
 {
     const std::vector<Rect> rects = Rects(int(state.range(0)));
+    const std::vector<OrbPoint> dials = Dials(int(state.range(1)));
+    std::vector<float> fades(dials.size(), 0.5f);
     const std::vector<QPointF> path = Path();
     const double zoom = std::min(double(Width) / ImageWidth, double(Height) / ImageHeight);
     const QPointF origin((Width - ImageWidth * zoom) / 2, (Height - ImageHeight * zoom) / 2);
@@ -132,12 +157,22 @@ void BM_NaiveLoop_HoverRectangles(benchmark::State &state)
                 (std::fabs(y - hh) < Tolerance && x <= hw + Tolerance))
                 hit = k;
         }
+        for (std::size_t k = 0; k < dials.size(); ++k) {
+            const double dx = (mouse.x - dials[k].x) * ImageWidth * zoom,
+                         dy = (mouse.y - dials[k].y) * ImageHeight * zoom;
+            const double off = std::fabs(std::hypot(dx, dy) - RingRadius);
+            if (hit < 0 && off <= Tolerance)
+                hit = int(rects.size() + k);
+            fades[k] = float(std::clamp(1.0 - (off - 10.0) / 100.0, 0.5, 1.0));
+        }
         benchmark::DoNotOptimize(hit);
+        benchmark::DoNotOptimize(fades.data());
     }
     state.SetItemsProcessed(state.iterations());
 }
 
-BENCHMARK(BM_Viewer_HoverRectangles)->Arg(100)->Unit(benchmark::kMicrosecond);
-BENCHMARK(BM_NaiveLoop_HoverRectangles)->Arg(100)->Unit(benchmark::kMicrosecond);
+// Arguments: rectangles, dials.
+BENCHMARK(BM_Viewer_HoverShapes)->Args({100, 100})->Unit(benchmark::kMicrosecond);
+BENCHMARK(BM_NaiveLoop_HoverShapes)->Args({100, 100})->Unit(benchmark::kMicrosecond);
 
 } // namespace

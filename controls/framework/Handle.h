@@ -26,6 +26,16 @@ enum HandleShape : int32
     // Closer than t to the segment from the anchor to `end` (viewer units),
     // running on past each end by `radius` handle pixels.
     HSH_Band,
+    // One part of a box's outline in a turned frame: the mouse is taken into
+    // the frame by `frameX`, `frameY` (frame units per viewer unit, rows of
+    // the map), about the anchor at the box's middle. The part is an edge
+    // (one of `sideX`, `sideY` is 0) or a corner (neither is): edges within
+    // `reach` of their side and along it up to `reach` less the corner
+    // radius `radius` past their ends; where both edges meet, the corner;
+    // beyond the edges' ends a rounded corner reaches as far as the length
+    // of `reach` from the rounding circle's centre. Lengths in frame units;
+    // `reach` stands for the tolerance, one per axis of the frame.
+    HSH_Outline,
 };
 
 // Sides of a box that the tolerance widens.
@@ -56,10 +66,16 @@ enum HandlePriority : int32
 struct Handle
 {
     HandleShape shape = HSH_Box;
-    OrbPoint at;            // anchor, viewer units
-    OrbPoint lo, hi;        // HSH_Box: extent about the anchor, handle pixels
-    OrbPoint end;           // HSH_Band: the segment's other end, viewer units
-    float64 radius = 0.0;   // HSH_Ring, HSH_Disc, HSH_Band: handle pixels
+    OrbPoint at;          // anchor, viewer units
+    OrbPoint lo, hi;      // HSH_Box: extent about the anchor, handle pixels
+    OrbPoint end;         // HSH_Band: the segment's other end, viewer units
+    float64 radius = 0.0; // HSH_Ring, HSH_Disc, HSH_Band: handle pixels; HSH_Outline: frame units
+    // HSH_Outline: the frame's rows, the box's half sides, the tolerance per
+    // axis (frame units) and the part's sides (+1, -1 or 0 each).
+    OrbPoint frameX{1.0, 0.0}, frameY{0.0, 1.0};
+    OrbPoint half;
+    OrbPoint reach;
+    int8 sideX = 0, sideY = 0;
     float64 tolerance = -1; // viewer units; negative: the viewer's pick tolerance
     uint8 grow = HG_All;    // HSH_Box
     uint32 part = 1;        // non-zero

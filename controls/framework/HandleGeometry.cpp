@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <limits>
 
 namespace Orbane {
 
@@ -14,6 +15,27 @@ constexpr float64 kExtentMargin = 1.0;
 float64 Grown(uint8 grow, uint8 side, float64 t) noexcept
 {
     return (grow & side) ? t : 0.0;
+}
+
+// The whole outline's reach taken back out of the frame: its four corners
+// through the frame's inverse. A frame that flattens the plane has none.
+OrbRect OutlineExtent(const Handle &h) noexcept
+{
+    const float64 det = h.frameX.x * h.frameY.y - h.frameX.y * h.frameY.x;
+    constexpr float64 inf = std::numeric_limits<float64>::infinity();
+    if (!std::isfinite(det) || det == 0.0)
+        return {-inf, -inf, inf, inf};
+    const OrbPoint out(std::fabs(h.half.x) + h.reach.x, std::fabs(h.half.y) + h.reach.y);
+    OrbRect r(inf, inf, -inf, -inf);
+    for (const OrbPoint c :
+         {OrbPoint(out.x, out.y), OrbPoint(-out.x, out.y), OrbPoint(out.x, -out.y), OrbPoint(-out.x, -out.y)}) {
+        const OrbPoint v(h.at.x + (h.frameY.y * c.x - h.frameX.y * c.y) / det,
+                         h.at.y + (-h.frameY.x * c.x + h.frameX.x * c.y) / det);
+        r = OrbRect(std::min(r.x1, v.x), std::min(r.y1, v.y), std::max(r.x2, v.x), std::max(r.y2, v.y));
+    }
+    if (!std::isfinite(r.x1) || !std::isfinite(r.y1) || !std::isfinite(r.x2) || !std::isfinite(r.y2))
+        return {-inf, -inf, inf, inf};
+    return {r.x1 - kExtentMargin, r.y1 - kExtentMargin, r.x2 + kExtentMargin, r.y2 + kExtentMargin};
 }
 
 } // namespace
@@ -50,6 +72,23 @@ bool HandleGeometry::OnBand(OrbPoint m, OrbPoint along, float64 extend, float64 
     return across < t && u >= -extend && u <= length + extend;
 }
 
+OrbPointI HandleGeometry::OutlineSides(OrbPoint local, OrbPoint half, OrbPoint t, float64 r) noexcept
+{
+    const float64 ax = std::fabs(local.x), ay = std::fabs(local.y);
+    const float64 hw = std::fabs(half.x), hh = std::fabs(half.y);
+    const bool xEdge = std::fabs(ax - hw) < t.x && ay <= hh + t.y - r;
+    const bool yEdge = std::fabs(ay - hh) < t.y && ax <= hw + t.x - r;
+    bool corner = false;
+    if (!xEdge && !yEdge && hw - r < ax && ax < hw + t.x && hh - r < ay && ay < hh + t.y)
+        corner = std::hypot(ax - (hw - r), ay - (hh - r)) < std::hypot(t.x, t.y);
+    return {xEdge || corner ? (local.x >= 0.0 ? 1 : -1) : 0, yEdge || corner ? (local.y >= 0.0 ? 1 : -1) : 0};
+}
+
+OrbPoint HandleGeometry::InFrame(const Handle &h, OrbPoint m) noexcept
+{
+    return {h.frameX.Dot(m), h.frameY.Dot(m)};
+}
+
 float64 HandleGeometry::ToleranceOf(const Handle &h, float64 viewerTolerance) noexcept
 {
     return h.tolerance >= 0.0 ? h.tolerance : viewerTolerance;
@@ -70,6 +109,10 @@ bool HandleGeometry::Hits(const Handle &h, OrbPoint mouse, float64 s, float64 vi
         return InDisc(m, h.radius * s, t);
     case HSH_Band:
         return OnBand(m, h.end - h.at, h.radius * s, t);
+    case HSH_Outline: {
+        const OrbPointI sides = OutlineSides(InFrame(h, m), h.half, h.reach, h.radius);
+        return sides.x == h.sideX && sides.y == h.sideY && (sides.x || sides.y);
+    }
     }
     return false;
 }
@@ -93,6 +136,8 @@ OrbRect HandleGeometry::Extent(const Handle &h, float64 s, float64 viewerToleran
         return {std::min(h.at.x, h.end.x) - r, std::min(h.at.y, h.end.y) - r, std::max(h.at.x, h.end.x) + r,
                 std::max(h.at.y, h.end.y) + r};
     }
+    case HSH_Outline:
+        return OutlineExtent(h);
     }
     return {};
 }

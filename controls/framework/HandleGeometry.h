@@ -35,6 +35,16 @@ public:
     // `extend` past either end.
     static bool OnBand(OrbPoint m, OrbPoint along, float64 extend, float64 t) noexcept;
 
+    // The sides of a box's outline (half sides `half`, tolerance `t` per
+    // axis, corners rounded by `r`) at `local` (frame units from its middle):
+    // the X side hit (+1, -1, or 0) and the Y side; both for a corner. An
+    // edge is hit within t of it and along it up to t - r past its ends;
+    // where neither edge is, the corner band is hit closer than |t| to the
+    // rounding circle's centre. Negative half sides draw the same box.
+    static OrbPointI OutlineSides(OrbPoint local, OrbPoint half, OrbPoint t, float64 r) noexcept;
+    // `m` (viewer units) in the frame of an HSH_Outline handle.
+    static OrbPoint InFrame(const Handle &h, OrbPoint m) noexcept;
+
     // The tolerance a handle uses: its own, or the viewer's.
     static float64 ToleranceOf(const Handle &h, float64 viewerTolerance) noexcept;
     static bool Hits(const Handle &h, OrbPoint mouse, float64 s, float64 viewerTolerance, Reach reach) noexcept;

@@ -4,6 +4,9 @@
 #include "orbane/ControlCommands.h"
 #include "orbane/GPainter.h"
 #include "orbane/PreviewInfo.h"
+#include "orbane/ScriptVal.h"
+
+#include <QGuiApplication>
 
 #include <algorithm>
 #include <cmath>
@@ -42,6 +45,18 @@ bool HandleOverlay::HoverBounds(const PreviewInfo &info, OrbRect &bounds) const
     return true;
 }
 
+void HandleOverlay::GetState(ScriptVal &state) const
+{
+    PreviewControl::GetState(state);
+    const HandleHit poised = mHandles.PoisedHit();
+    state.SetKey(ScriptVal("hover"), ScriptVal(bool(poised)));
+    state.SetKey(ScriptVal("hoverPart"), ScriptVal(int64(poised.part)));
+    if (mFades) {
+        state.SetKey(ScriptVal("fade"), ScriptVal(float64(mFade)));
+        state.SetKey(ScriptVal("drawnFade"), ScriptVal(float64(mDrawnFade)));
+    }
+}
+
 float32 HandleOverlay::FadeAt(float64 distance) noexcept
 {
     return float32(std::clamp(1.0 - (distance - 10.0) / 100.0, 0.5, 1.0));
@@ -62,6 +77,17 @@ HandleHit HandleOverlay::PressHit(const PreviewInfo &info)
 {
     BuildHandles(info, mHandles);
     return mHandles.HitTest(info.MouseInViewer(), info.HandleScale, info.PickTolerance, HandleGeometry::Press);
+}
+
+void HandleOverlay::Pick(HandleHit hit)
+{
+    mHandles.SetPicked(hit);
+    UpdateHighlight();
+}
+
+void HandleOverlay::UpdateHighlight()
+{
+    mHighlighted = bool(mHandles.PoisedHit()) || bool(mHandles.PickedHit());
 }
 
 void HandleOverlay::EnableFade()
@@ -124,6 +150,37 @@ bool HandleOverlay::NudgeCommand(PreviewInfo *info, const OrbID &command, uint64
     return true;
 }
 
+bool HandleOverlay::IsArrowKey(uint64 key) noexcept
+{
+    return key == Qt::Key_Left || key == Qt::Key_Up || key == Qt::Key_Right || key == Qt::Key_Down;
+}
+
+OrbPoint HandleOverlay::NudgeOffset(uint64 key, float64 stepX, float64 stepY, Qt::KeyboardModifiers mods) noexcept
+{
+    float64 factor = 1.0;
+    if (mods & Qt::ShiftModifier)
+        factor *= 10.0;
+    if (mods & Qt::ControlModifier)
+        factor /= 10.0;
+    switch (key) {
+    case Qt::Key_Left:
+        return {-stepX * factor, 0.0};
+    case Qt::Key_Right:
+        return {stepX * factor, 0.0};
+    case Qt::Key_Up:
+        return {0.0, stepY * factor};
+    case Qt::Key_Down:
+        return {0.0, -stepY * factor};
+    default:
+        return {};
+    }
+}
+
+Qt::KeyboardModifiers HandleOverlay::KeyModifiers()
+{
+    return qGuiApp ? QGuiApplication::queryKeyboardModifiers() : Qt::NoModifier;
+}
+
 // Claims the mouse only where no overlay above has; the hover may still
 // move (off this overlay) and the fade change, each asking for a redraw.
 uint64 HandleOverlay::HitTest(PreviewInfo &info, uint64 data)
@@ -135,6 +192,7 @@ uint64 HandleOverlay::HitTest(PreviewInfo &info, uint64 data)
             data |= 1;
     }
     bool changed = mHandles.SetPoised(hit);
+    UpdateHighlight();
     if (mFades)
         changed = UpdateFade(info) || changed;
     return changed ? data | 2 : data;

@@ -35,9 +35,14 @@ public:
     void ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
     uint64 ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags) override;
     bool HoverBounds(const PreviewInfo &info, OrbRect &bounds) const override;
+    // Adds `hover` (a handle is poised under the mouse) and `hoverPart` (its
+    // part, 0 for none) and, for an overlay that fades, `fade` and
+    // `drawnFade` (the opacity as last tested and as last drawn).
+    void GetState(ScriptVal &state) const override;
 
     const HandleSet &Handles() const { return mHandles; }
     float32 Fade() const { return mFade; }
+    float32 DrawnFade() const { return mDrawnFade; }
     // Opacity at `distance` viewer units from the mouse: full within 10,
     // half from 60 on.
     static float32 FadeAt(float64 distance) noexcept;
@@ -56,7 +61,7 @@ protected:
     // The handle a press at the mouse would pick (press reach).
     HandleHit PressHit(const PreviewInfo &info);
     // Picks `hit` (or nothing) for the drag to come.
-    void Pick(HandleHit hit) { mHandles.SetPicked(hit); }
+    void Pick(HandleHit hit);
 
     // The overlay fades with the mouse's distance (FadeDistance) while the
     // viewer does not highlight and the overlay is not dragged.
@@ -82,7 +87,17 @@ protected:
     bool NudgeCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags, OrbPoint point,
                       float64 stepY, uint64 &result);
 
+    static bool IsArrowKey(uint64 key) noexcept;
+    // The offset one arrow-key nudge makes: one step along the key's axis
+    // (Up is +Y), ten with Shift, a tenth with Control.
+    static OrbPoint NudgeOffset(uint64 key, float64 stepX, float64 stepY, Qt::KeyboardModifiers mods) noexcept;
+    // The keyboard's modifiers now, as the application sees them.
+    static Qt::KeyboardModifiers KeyModifiers();
+
 private:
+    // The base's highlight follows the handles: drawn highlighted while one
+    // is poised or picked.
+    void UpdateHighlight();
     uint64 HitTest(PreviewInfo &info, uint64 data);
     bool UpdateFade(const PreviewInfo &info);
 

@@ -14,19 +14,16 @@
 #include <algorithm>
 #include <cmath>
 #include <iterator>
+#include <limits>
 #include <optional>
 #include <utility>
 
 namespace Orbane {
 
 using Geo = AngleGeometry;
-using Graphics::GColor;
 using Graphics::GPainter;
 
 namespace {
-
-// The highlight of a ring under the mouse or being dragged.
-constexpr GColor kHot(1.0f, 0.8f, 0.25f);
 
 // The ring is the same for every dial: made at the first draw, freed at
 // unload by RegCleanup. A plain pointer, so that no static destructor can
@@ -47,17 +44,28 @@ bool IsFinite(OrbPoint p)
 
 } // namespace
 
+// The optional Inputs: the centre as a point or as numbers, and the radius.
+const LinkedInput<AngleControl> AngleControl::Links[] = {
+    {ACP_Center, ACID_Center, &AngleControl::mCenterInput},
+    {ACP_CenterX, ACID_CenterX, &AngleControl::mCenterXInput},
+    {ACP_CenterY, ACID_CenterY, &AngleControl::mCenterYInput},
+    {ACP_CenterZ, ACID_CenterZ, &AngleControl::mCenterZInput},
+    {ACP_Radius, ACID_Radius, &AngleControl::mRadiusInput},
+};
+// The centre Z is linked but never pulled: its value would land in the angle.
+constexpr uint32 kCenterZRow = 1u << 3;
+
 AngleControl::AngleControl(const Registry *reg, const ScriptVal &args, const TagList &tags)
-    : PreviewControl(reg, args, tags)
+    : HandleOverlay(reg, args, tags)
 {
+    EnableFade();
     // A script's creation tags: Inputs passed as objects, radius and follow state.
     AngleControl::SetAttrsTagList(nullptr, tags);
 }
 
 AngleControl::~AngleControl()
 {
-    for (Input **slot : {&mCenterInput, &mCenterXInput, &mCenterYInput, &mCenterZInput, &mRadiusInput})
-        DetachFromInput(*slot);
+    DetachLinkedInputs(*this, Links);
 }
 
 bool AngleControl::CopyAttr(Tag tag, void *out)
@@ -89,7 +97,7 @@ bool AngleControl::CopyAttr(Tag tag, void *out)
         value = mGrabOffset.y;
         break;
     default:
-        return PreviewControl::CopyAttr(tag, out);
+        return HandleOverlay::CopyAttr(tag, out);
     }
     if (!out)
         return true;
@@ -100,14 +108,7 @@ bool AngleControl::CopyAttr(Tag tag, void *out)
 
 bool AngleControl::GetAttrsTagList(TagList &tags) const
 {
-    const std::pair<Tag, Input *> links[] = {{ACID_Center, mCenterInput},
-                                             {ACID_CenterX, mCenterXInput},
-                                             {ACID_CenterY, mCenterYInput},
-                                             {ACID_CenterZ, mCenterZInput},
-                                             {ACID_Radius, mRadiusInput}};
-    for (const auto &[tag, input] : links)
-        if (input)
-            tags.Set(tag, input->GetID());
+    WriteLinkedInputIds(*this, Links, tags);
     tags.Set(ACD_MinRadius, mMinRadius);
     tags.Set(ACD_RadiusScale, mRadiusScale);
     tags.Set(ACD_FollowX, mFollow.x);
@@ -117,6 +118,17 @@ bool AngleControl::GetAttrsTagList(TagList &tags) const
     tags.Set(PCA_FollowCursor, int32(mFollowCursor));
     tags.Set(AC_DialStyle, mDialStyle);
     return true;
+}
+
+void AngleControl::GetState(ScriptVal &state) const
+{
+    HandleOverlay::GetState(state);
+    state.SetKey(ScriptVal("centerX"), ScriptVal(mCenter.x));
+    state.SetKey(ScriptVal("centerY"), ScriptVal(mCenter.y));
+    state.SetKey(ScriptVal("radius"), ScriptVal(mRadius));
+    state.SetKey(ScriptVal("followCursor"), ScriptVal(mFollowCursor != 0));
+    state.SetKey(ScriptVal("startGrabX"), ScriptVal(mStartGrab.x));
+    state.SetKey(ScriptVal("startGrabY"), ScriptVal(mStartGrab.y));
 }
 
 bool AngleControl::SetAttrsTagList(Input *input, const TagList &tags)
@@ -133,28 +145,17 @@ bool AngleControl::SetAttrsTagList(Input *input, const TagList &tags)
     mGrabOffset.y = tags.GetDouble(PCA_GrabOffsetY, mGrabOffset.y);
     mDialStyle = tags.GetInt(AC_DialStyle, mDialStyle);
     UpdateDisplay(nullptr, nullptr);
-    return PreviewControl::SetAttrsTagList(input, tags);
-}
-
-// The optional Inputs: the centre as a point or as numbers, and the radius.
-void AngleControl::AttachInputs(const TagList &tags)
-{
-    Operator *tool = GetOperator(nullptr);
-    Input *const before[5] = {mCenterInput, mCenterXInput, mCenterYInput, mCenterZInput, mRadiusInput};
-    AttachToInput(mCenterInput, tool, tags, ACP_Center, ACID_Center, ATTACH_Watch, ATTACH_Watch);
-    AttachToInput(mCenterXInput, tool, tags, ACP_CenterX, ACID_CenterX, ATTACH_Watch, ATTACH_Watch);
-    AttachToInput(mCenterYInput, tool, tags, ACP_CenterY, ACID_CenterY, ATTACH_Watch, ATTACH_Watch);
-    AttachToInput(mCenterZInput, tool, tags, ACP_CenterZ, ACID_CenterZ, ATTACH_Watch, ATTACH_Watch);
-    AttachToInput(mRadiusInput, tool, tags, ACP_Radius, ACID_Radius, ATTACH_Watch, ATTACH_Watch);
-    PullLinked(before);
+    return HandleOverlay::SetAttrsTagList(input, tags);
 }
 
 // A newly linked centre or radius is drawn as it is now, not only after its
-// next change. The centre Z is not pulled: its value would land in the angle.
-void AngleControl::PullLinked(Input *const (&before)[5])
+// next change.
+void AngleControl::AttachInputs(const TagList &tags)
 {
-    for (Input *now : {mCenterInput, mCenterXInput, mCenterYInput, mRadiusInput})
-        if (now && std::find(std::begin(before), std::end(before), now) == std::end(before)) {
+    const uint32 linked = AttachLinkedInputs(*this, Links, GetOperator(nullptr), tags) & ~kCenterZRow;
+    for (std::size_t i = 0; i < std::size(Links); ++i)
+        if (linked & (1u << i)) {
+            Input *now = this->*(Links[i].slot);
             const AutoParameter value(now->GetValue(GetCurrentTime()));
             NotifyChanged(now, value.get(), nullptr);
         }
@@ -162,13 +163,13 @@ void AngleControl::PullLinked(Input *const (&before)[5])
 
 bool AngleControl::RemoveInput(Input *input, const TagList *tags)
 {
+    // One Input may fill several slots: each lets go of it.
     bool wasLinked = false;
-    for (Input **slot : {&mCenterInput, &mCenterXInput, &mCenterYInput, &mCenterZInput, &mRadiusInput})
-        if (input && *slot == input) {
-            DetachFromInput(*slot);
-            wasLinked = true;
-        }
-    return PreviewControl::RemoveInput(input, tags) || wasLinked;
+    while (const LinkedInput<AngleControl> *row = FindLinkedInput(*this, Links, input)) {
+        DetachFromInput(this->*(row->slot));
+        wasLinked = true;
+    }
+    return HandleOverlay::RemoveInput(input, tags) || wasLinked;
 }
 
 // Copies take finite values only: an Input that holds no number leaves the
@@ -199,7 +200,7 @@ void AngleControl::NotifyChanged(Input *input, Parameter *value, const TagList *
         moved = Store(mAngle, value);
     }
     if (moved)
-        PreviewControl::NotifyChanged(input, value, tags);
+        HandleOverlay::NotifyChanged(input, value, tags);
 }
 
 bool AngleControl::Store(float64 &copy, const Parameter *value)
@@ -225,8 +226,7 @@ bool AngleControl::StoreRadius(float64 value)
 
 void AngleControl::DrawControls(PreviewInfo *info, const TagList *tags)
 {
-    if (info->Highlight || mDragType == DRAG_Handle)
-        mFade = mDrawnFade = 1.0f;
+    SettleFade(*info);
     GPainter *p = info->GetPainter();
     if (p && (info->DrawPass == 1 || info->DrawPass == 2)) {
         mDrawnAngle = mAngle;
@@ -238,7 +238,7 @@ void AngleControl::DrawControls(PreviewInfo *info, const TagList *tags)
         if (mDragType == DRAG_Handle && info->ShowDrag && mStartGrab != OrbPoint())
             DrawDial(*p, *info, mStartGrab);
     }
-    PreviewControl::DrawControls(info, tags);
+    HandleOverlay::DrawControls(info, tags);
 }
 
 DragType AngleControl::ControlDown(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
@@ -250,8 +250,10 @@ DragType AngleControl::ControlDown(PreviewInfo *info, const OrbPointI &mouse, co
             mDragType = DRAG_Linked;
     } else {
         Grab(*info, OrbPoint(mouse), tags);
+        if (mDragType == DRAG_Handle)
+            Pick({1});
     }
-    return PreviewControl::ControlDown(info, mouse, tags);
+    return HandleOverlay::ControlDown(info, mouse, tags);
 }
 
 // The grab offset, the angle offset and, for a press flagged PEF_StartGrab,
@@ -259,7 +261,7 @@ DragType AngleControl::ControlDown(PreviewInfo *info, const OrbPointI &mouse, co
 // circle, not the square of point handles) starts the drag.
 void AngleControl::Grab(const PreviewInfo &info, OrbPoint mouse, const TagList *tags)
 {
-    const OrbPoint centre = info.TransformOut(Handle());
+    const OrbPoint centre = info.TransformOut(DialCentre());
     const OrbPoint arm = Geo::UnitAt(mAngle) * (Geo::RingRadius * info.HandleScale);
     if (tags && (tags->GetLong(PCA_EventFlags, 0) & PEF_StartGrab)) {
         mGrabOffset = centre - mouse + arm;
@@ -268,7 +270,7 @@ void AngleControl::Grab(const PreviewInfo &info, OrbPoint mouse, const TagList *
             mStartGrab = mouse - arm;
     } else if (Geo::DrawsDial(mDialStyle)) {
         mGrabOffset = Geo::RingGrab(mouse, centre, Geo::RingRadius * info.HandleScale);
-        const OrbPoint d = info.TransformIn(mouse) - Handle();
+        const OrbPoint d = info.TransformIn(mouse) - DialCentre();
         mAngleOffset = Geo::PressDirection({info.AspectScaleXIn(d.x), info.AspectScaleYIn(d.y)}) - mAngle;
     } else {
         mGrabOffset = info.TransformOut(ArmEnd(info)) - mouse;
@@ -280,7 +282,7 @@ void AngleControl::Grab(const PreviewInfo &info, OrbPoint mouse, const TagList *
 
 void AngleControl::ControlMove(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
 {
-    PreviewControl::ControlMove(info, mouse, tags);
+    HandleOverlay::ControlMove(info, mouse, tags);
     const bool following = Follows(*info);
     if (mDragType != DRAG_Handle && !following)
         return;
@@ -308,7 +310,7 @@ void AngleControl::ControlUp(PreviewInfo *info, const OrbPointI &mouse, const Ta
         SetAttrsTagList(TagList{{PCA_FollowCursor, 0}});
     }
     mStartGrab = OrbPoint();
-    PreviewControl::ControlUp(info, mouse, tags);
+    HandleOverlay::ControlUp(info, mouse, tags);
 }
 
 uint64 AngleControl::ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags)
@@ -316,14 +318,7 @@ uint64 AngleControl::ControlCommand(PreviewInfo *info, const OrbID &command, uin
     uint64 result = 0;
     if (KeyCommand(info, command, data, tags, result))
         return result;
-    if (command == CCMD_GetInputAt) {
-        const float64 reach = Geo::HoverTolerance(info->PickTolerance, info->HandleScale);
-        if (GetMainInput() && GrabDistance(*info, info->MouseInViewer()) <= reach)
-            return uint64(reinterpret_cast<uintptr_t>(GetMainInput()));
-    } else if (command == CCMD_HitTest) {
-        return HitTest(*info, data);
-    }
-    return PreviewControl::ControlCommand(info, command, data, tags);
+    return HandleOverlay::ControlCommand(info, command, data, tags);
 }
 
 // Left and Right turn the angle; Up and Down are left to others. A run of
@@ -337,59 +332,44 @@ bool AngleControl::KeyCommand(PreviewInfo *info, const OrbID &command, uint64 da
         const float64 step = Geo::KeyStep(int(data), KeyModifiers());
         if (step != 0.0 && std::isfinite(mAngle + step))
             Write(mAngle + step);
-        PreviewControl::ControlCommand(info, command, data, tags);
+        HandleOverlay::ControlCommand(info, command, data, tags);
         result = step != 0.0 ? 1 : 0;
     } else if (command == CCMD_KeyUpAll) {
         ResetUndo(nullptr);
-        result = PreviewControl::ControlCommand(info, command, data, tags);
+        result = HandleOverlay::ControlCommand(info, command, data, tags);
     } else {
         return false;
     }
     return true;
 }
 
-// The hover state: the ring (or the arm's end) under the mouse claims it,
-// and the dial fades with the mouse's distance from the ring. Bit 1 asks for
-// a redraw when either changed enough to see.
-uint64 AngleControl::HitTest(const PreviewInfo &info, uint64 data)
-{
-    const bool wasHover = mHover;
-    const OrbPoint mouse = info.MouseInViewer();
-    mHover = !(data & 1) && GrabDistance(info, mouse) <= Geo::HoverTolerance(info.PickTolerance, info.HandleScale);
-    if (mHover)
-        data |= 1;
-    if (!info.Highlight && mDragType != DRAG_Handle) {
-        const float64 ring = Geo::RingRadius * info.HandleScale;
-        mFade = Geo::Fade(Geo::RingDistance(mouse, info.TransformOut(Handle()), ring));
-        if (std::fabs(mFade - mDrawnFade) > 0.05f) {
-            mDrawnFade = mFade;
-            data |= 2;
-        }
-    } else {
-        if (mDrawnFade != 1.0f)
-            data |= 2;
-        mFade = mDrawnFade = 1.0f;
-    }
-    if (mHover != wasHover)
-        data |= 2;
-    return data;
-}
-
 bool AngleControl::IsLinked(const Input *input) const
 {
-    return input && (input == mCenterInput || input == mCenterXInput || input == mCenterYInput ||
-                     input == mCenterZInput || input == mRadiusInput);
+    return FindLinkedInput(*this, Links, input) != nullptr;
 }
 
 OrbPoint AngleControl::ArmEnd(const PreviewInfo &info) const
 {
-    return Geo::ArmEnd(Handle(), mAngle, mRadius, info.AspectScaleYOut(1.0));
+    return Geo::ArmEnd(DialCentre(), mAngle, mRadius, info.AspectScaleYOut(1.0));
 }
 
-float64 AngleControl::GrabDistance(const PreviewInfo &info, OrbPoint mouse) const
+// One handle: the ring of dial style 1, the arm's end otherwise, each
+// reaching as far as the pick tolerance, at least GrabReach handle pixels.
+void AngleControl::BuildHandles(const PreviewInfo &info, HandleSet &handles) const
 {
-    const float64 ring = Geo::RingRadius * info.HandleScale;
-    return Geo::GrabDistance(mDialStyle, mouse, info.TransformOut(Handle()), info.TransformOut(ArmEnd(info)), ring);
+    handles.Clear();
+    Orbane::Handle &h = Geo::DrawsDial(mDialStyle)
+                            ? handles.AddRing(info.TransformOut(DialCentre()), Geo::RingRadius, 1)
+                            : handles.AddDisc(info.TransformOut(ArmEnd(info)), 0.0, 1);
+    h.tolerance = Geo::HoverTolerance(info.PickTolerance, info.HandleScale);
+}
+
+// The dial fades with the mouse's distance from its ring, whatever its style.
+float64 AngleControl::FadeDistance(const PreviewInfo &info) const
+{
+    const float64 d =
+        Geo::RingDistance(info.MouseInViewer(), info.TransformOut(DialCentre()), Geo::RingRadius * info.HandleScale);
+    return std::isnan(d) ? std::numeric_limits<float64>::infinity() : d;
 }
 
 void AngleControl::Write(float64 angle)
@@ -402,12 +382,7 @@ void AngleControl::DrawDial(GPainter &p, const PreviewInfo &info, OrbPoint at) c
 {
     if (!Geo::DrawsDial(mDialStyle) || !IsFinite(at))
         return;
-    const GColor base = info.GetColor(OrbColor()).Faded(mFade);
-    const bool hot = mHover || mDragType == DRAG_Handle;
-    p.Color(hot ? kHot.WithAlpha(base.a) : base, info.GetShadow(OrbColor()).Faded(mFade));
-    p.PushMatrix();
-    p.Translate(at.x, at.y);
-    p.Scale(info.HandleScale, info.HandleScale);
+    BeginHandle(p, info, at, 1);
     p.Begin(Graphics::GP_LineLoop);
     for (const OrbPoint v : Ring())
         p.Vertex(v.x, v.y);
@@ -416,13 +391,13 @@ void AngleControl::DrawDial(GPainter &p, const PreviewInfo &info, OrbPoint at) c
     for (const OrbPoint v : Geo::DialLines(mDialStyle, mDrawnAngle))
         p.Vertex(v.x, v.y);
     p.End();
-    p.PopMatrix();
+    EndHandle(p);
 }
 
 bool AngleControl::RegCleanup(Registry *reg)
 {
     delete std::exchange(gRing, nullptr);
-    return PreviewControl::RegCleanup(reg);
+    return HandleOverlay::RegCleanup(reg);
 }
 
 } // namespace Orbane

@@ -78,13 +78,6 @@ float64 AngleGeometry::RingDistance(OrbPoint mouse, OrbPoint centre, float64 rad
     return std::fabs((mouse - centre).Length() - radius);
 }
 
-float32 AngleGeometry::Fade(float64 distance) noexcept
-{
-    if (std::isnan(distance))
-        return 0.5f;
-    return float32(std::clamp(1.0 - (distance - 10.0) / 100.0, 0.5, 1.0));
-}
-
 float64 AngleGeometry::PressTolerance(int32 pickTolerance, float64 handleScale) noexcept
 {
     return std::max(float64(pickTolerance), std::trunc(GrabReach * handleScale));
@@ -104,12 +97,6 @@ OrbPoint AngleGeometry::ArmEnd(OrbPoint centre, float64 degrees, float64 radius,
 OrbPoint AngleGeometry::RingGrab(OrbPoint mouse, OrbPoint centre, float64 radius) noexcept
 {
     return centre + UnitOf(mouse - centre) * radius - mouse;
-}
-
-float64 AngleGeometry::GrabDistance(int32 style, OrbPoint mouse, OrbPoint centre, OrbPoint armEnd,
-                                    float64 radius) noexcept
-{
-    return DrawsDial(style) ? RingDistance(mouse, centre, radius) : (armEnd - mouse).Length();
 }
 
 OrbPoint AngleGeometry::UnitAt(float64 degrees) noexcept

@@ -12,7 +12,7 @@ namespace Orbane {
 
 // The angle overlay's mappings, free of any viewer or painter so that each
 // can be checked on its own: mouse to angle, the continuous angle across
-// turns, ring distance and fade, the radius, key steps and the dial's shape.
+// turns, ring distance, the radius, key steps and the dial's shape.
 //
 // Angles are degrees, counter-clockwise from the X axis. Directions are
 // either aspect-corrected image units (lengths in image widths as shown, the
@@ -64,9 +64,6 @@ public:
 
     // How far `mouse` is from the ring of `radius` around `centre`.
     static float64 RingDistance(OrbPoint mouse, OrbPoint centre, float64 radius) noexcept;
-    // Opacity at `distance` viewer units: full within 10, half from 60 on;
-    // half where the distance is not a number.
-    static float32 Fade(float64 distance) noexcept;
     // The grab tolerance of a press: the pick tolerance, at least the whole
     // part of GrabReach handle pixels. Hover tests take the exact reach.
     static float64 PressTolerance(int32 pickTolerance, float64 handleScale) noexcept;
@@ -80,11 +77,6 @@ public:
     // `centre` (viewer units): the ring's point in the mouse's direction,
     // less the mouse. Its length is the mouse's distance from the ring.
     static OrbPoint RingGrab(OrbPoint mouse, OrbPoint centre, float64 radius) noexcept;
-    // How far `mouse` is from what the dial's style grabs (viewer units):
-    // the ring of `radius` about `centre` for style 1, the arm's end
-    // `armEnd` otherwise.
-    static float64 GrabDistance(int32 style, OrbPoint mouse, OrbPoint centre, OrbPoint armEnd, float64 radius) noexcept;
-
     // The unit direction of `degrees`, reduced first so that huge angles
     // keep their precision.
     static OrbPoint UnitAt(float64 degrees) noexcept;

@@ -7,6 +7,7 @@
 #include "orbane/Input.h"
 #include "orbane/Point.h"
 #include "orbane/PreviewInfo.h"
+#include "orbane/ScriptVal.h"
 
 namespace Orbane {
 
@@ -45,6 +46,13 @@ bool CrosshairControl::CopyAttr(Tag tag, void *out)
     *static_cast<float64 *>(out) = value;
     // False: the value was supplied.
     return false;
+}
+
+void CrosshairControl::GetState(ScriptVal &state) const
+{
+    HandleOverlay::GetState(state);
+    state.SetKey(ScriptVal("dragPart"), ScriptVal(int64(Handles().PickedHit().part)));
+    state.SetKey(ScriptVal("followCursor"), ScriptVal(mFollowCursor != 0));
 }
 
 bool CrosshairControl::GetAttrsTagList(TagList &tags) const

@@ -41,6 +41,8 @@ public:
     std::size_t SizeOf() const override { return sizeof(CrosshairControl); }
     bool CopyAttr(Tag tag, void *out) override;
     bool GetAttrsTagList(TagList &tags) const override;
+    // Adds `dragPart` (the part being dragged, 0 for none) and `followCursor`.
+    void GetState(ScriptVal &state) const override;
 
     using HandleOverlay::SetAttrsTagList;
     bool SetAttrsTagList(Input *input, const TagList &tags) override;

@@ -10,6 +10,10 @@
 
 namespace Orbane {
 
+const LinkedInput<PointControl> PointControl::Links[] = {
+    {PCP_PrevPoint, PCID_PrevPoint, &PointControl::mPrevInput},
+};
+
 PointControl::PointControl(const Registry *reg, const ScriptVal &args, const TagList &tags)
     : HandleOverlay(reg, args, tags)
 {
@@ -19,7 +23,7 @@ PointControl::PointControl(const Registry *reg, const ScriptVal &args, const Tag
 
 PointControl::~PointControl()
 {
-    DetachFromInput(mPrevInput);
+    DetachLinkedInputs(*this, Links);
 }
 
 bool PointControl::CopyAttr(Tag tag, void *out)
@@ -33,8 +37,7 @@ bool PointControl::CopyAttr(Tag tag, void *out)
 
 bool PointControl::GetAttrsTagList(TagList &tags) const
 {
-    if (mPrevInput)
-        tags.Set(PCID_PrevPoint, mPrevInput->GetID());
+    WriteLinkedInputIds(*this, Links, tags);
     tags.Set(PCD_SetPrevPointX, mPrevValue.x);
     tags.Set(PCD_SetPrevPointY, mPrevValue.y);
     return true;
@@ -43,13 +46,11 @@ bool PointControl::GetAttrsTagList(TagList &tags) const
 bool PointControl::SetAttrsTagList(Input *input, const TagList &tags)
 {
     const Input *main = GetMainInput();
-    const Input *before = mPrevInput;
-    AttachToInput(mPrevInput, main ? main->GetOperator() : nullptr, tags, PCP_PrevPoint, PCID_PrevPoint, ATTACH_Watch,
-                  ATTACH_Watch);
+    const uint32 linked = AttachLinkedInputs(*this, Links, main ? main->GetOperator() : nullptr, tags);
     if (!mPrevInput) {
         mPrevValue.x = tags.GetDouble(PCD_SetPrevPointX, mDrawnPrev.x);
         mPrevValue.y = tags.GetDouble(PCD_SetPrevPointY, mDrawnPrev.y);
-    } else if (mPrevInput != before) {
+    } else if (linked) {
         // The line is drawn to the linked point as it is now, not as it
         // will be after its next change.
         const AutoParameter prev(mPrevInput->GetValue(GetCurrentTime()));
@@ -63,7 +64,7 @@ bool PointControl::SetAttrsTagList(Input *input, const TagList &tags)
 
 bool PointControl::RemoveInput(Input *input, const TagList *tags)
 {
-    const bool wasPrev = input && input == mPrevInput;
+    const bool wasPrev = FindLinkedInput(*this, Links, input) != nullptr;
     if (wasPrev)
         DetachFromInput(mPrevInput);
     return HandleOverlay::RemoveInput(input, tags) || wasPrev;

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "framework/HandleOverlay.h"
+#include "framework/LinkedInput.h"
 
 namespace Orbane {
 
@@ -43,6 +44,8 @@ protected:
     void BuildHandles(const PreviewInfo &info, HandleSet &handles) const override;
 
 private:
+    static const LinkedInput<PointControl> Links[];
+
     OrbPoint HandleOffset(const PreviewInfo &info) const;
     bool Store(OrbPoint &copy, const Parameter *value);
 

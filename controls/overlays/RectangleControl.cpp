@@ -30,8 +30,6 @@ constexpr float64 kMinSize = 1e-5;
 // Beyond this many viewer units an outline has left every screen; drawing
 // it would only feed the painter huge numbers.
 constexpr float64 kFarAway = 1e7;
-// The highlight of the part under the mouse or being dragged.
-constexpr GColor kHot(1.0f, 0.8f, 0.25f);
 // Corner strips reach this fraction of the smaller half side along each edge.
 constexpr float64 kCornerStrip = 0.25;
 
@@ -87,7 +85,7 @@ const LinkedInput<RectangleControl> RectangleControl::Links[] = {
 };
 
 RectangleControl::RectangleControl(const Registry *reg, const ScriptVal &args, const TagList &tags)
-    : PreviewControl(reg, args, tags)
+    : HandleOverlay(reg, args, tags)
 {
     RectangleControl::SetAttrsTagList(nullptr, tags);
 }
@@ -103,7 +101,7 @@ RectangleControl::~RectangleControl()
 bool RectangleControl::CopyAttr(Tag tag, void *out)
 {
     if (!out || (tag != PCA_GrabOffsetX && tag != PCA_GrabOffsetY))
-        return PreviewControl::CopyAttr(tag, out);
+        return HandleOverlay::CopyAttr(tag, out);
     *static_cast<float64 *>(out) = tag == PCA_GrabOffsetX ? mGrabOffset.x : mGrabOffset.y;
     // False: the value was supplied.
     return false;
@@ -133,8 +131,7 @@ bool RectangleControl::GetAttrsTagList(TagList &tags) const
 
 void RectangleControl::GetState(ScriptVal &state) const
 {
-    PreviewControl::GetState(state);
-    state.SetKey(ScriptVal("hoverPart"), ScriptVal(mHoverPart));
+    HandleOverlay::GetState(state);
     state.SetKey(ScriptVal("dragPart"), ScriptVal(mDragPart));
     state.SetKey(ScriptVal("lastPart"), ScriptVal(mLastPart));
     state.SetKey(ScriptVal("grabOffsetX"), ScriptVal(mGrabOffset.x));
@@ -172,7 +169,7 @@ bool RectangleControl::SetAttrsTagList(Input *input, const TagList &tags)
             const AutoParameter value(in->GetValue(GetCurrentTime()));
             NotifyChanged(in, value.get(), nullptr);
         }
-    return PreviewControl::SetAttrsTagList(input, tags);
+    return HandleOverlay::SetAttrsTagList(input, tags);
 }
 
 // Centre, axis, angle and size come from tags only where no Input gives them.
@@ -227,7 +224,7 @@ bool RectangleControl::RemoveInput(Input *input, const TagList *tags)
         mImage = QImage();
     if (row)
         DetachFromInput(this->*(row->slot));
-    return PreviewControl::RemoveInput(input, tags) || row;
+    return HandleOverlay::RemoveInput(input, tags) || row;
 }
 
 void RectangleControl::NotifyChanged(Input *input, Parameter *value, const TagList *tags)
@@ -245,7 +242,7 @@ void RectangleControl::NotifyChanged(Input *input, Parameter *value, const TagLi
     else
         moved = true;
     if (moved)
-        PreviewControl::NotifyChanged(input, value, tags);
+        HandleOverlay::NotifyChanged(input, value, tags);
 }
 
 // One Input may fill several slots (a point Input linked as centre and
@@ -322,28 +319,58 @@ OrbPoint RectangleControl::Tolerance(const PreviewInfo &info) const
     return RectangleTolerance(info.PickTolerance, viewScale);
 }
 
-int32 RectangleControl::PartAt(const PreviewInfo &info, OrbPoint &local) const
+OrbPoint RectangleControl::MouseInFrame(const PreviewInfo &info, const RectangleFrame &frame) const
 {
-    const RectangleFrame frame = DrawnFrame(info);
-    local = frame.ToFrame(OrbPoint(info.MouseX, info.MouseY)) - frame.Middle();
-    if (!frame.IsValid() || !Finite(local))
-        return RPART_None;
-    return RectangleHitPart(local, frame.Half(), Tolerance(info), mCornerRound);
+    return frame.ToFrame(OrbPoint(info.MouseX, info.MouseY)) - frame.Middle();
 }
 
-// The hover state: the part under the mouse, unless an overlay above has
-// claimed the mouse (bit 0); bit 1 asks for a redraw when it changed.
-uint64 RectangleControl::HitTest(const PreviewInfo &info, uint64 data)
+// Eight handles, one per part: the edges, and above them the corners, each
+// the part of the outline (as last drawn) that its side bits name. The mouse
+// meets them in the rectangle's frame, taken from the viewer's units by the
+// frame's steps per viewer unit on each axis.
+void RectangleControl::BuildHandles(const PreviewInfo &info, HandleSet &handles) const
 {
-    const int32 was = mHoverPart;
-    OrbPoint local;
-    mHoverPart = (data & 1) ? RPART_None : PartAt(info, local);
-    mHighlighted = mHoverPart != RPART_None || mDragType == DRAG_Handle;
-    if (mHoverPart)
-        data |= 1;
-    if (mHoverPart != was)
-        data |= 2;
-    return data;
+    handles.Clear();
+    AddOutline(info, DrawnFrame(info), handles);
+}
+
+void RectangleControl::AddOutline(const PreviewInfo &info, const RectangleFrame &frame, HandleSet &handles) const
+{
+    const ViewMapping &m = info.Mapping();
+    const OrbPoint at = info.TransformOut(frame.ToImage(frame.Middle()));
+    const OrbPoint origin = frame.ToFrame(mCenter);
+    const OrbPoint stepX = frame.ToFrame(mCenter + OrbPoint(1.0 / m.SpanX(), 0.0)) - origin;
+    const OrbPoint stepY = frame.ToFrame(mCenter + OrbPoint(0.0, 1.0 / m.SpanY())) - origin;
+    if (!frame.IsValid() || !Finite(at) || !Finite(stepX) || !Finite(stepY))
+        return;
+    Handle h;
+    h.shape = HSH_Outline;
+    h.at = at;
+    h.frameX = OrbPoint(stepX.x, stepY.x);
+    h.frameY = OrbPoint(stepX.y, stepY.y);
+    h.half = frame.Half();
+    h.reach = Tolerance(info);
+    h.radius = RectangleCornerRadius(frame.Half(), mCornerRound);
+    for (const int32 part : StripOrder) {
+        h.sideX = int8(RectangleSideX(part));
+        h.sideY = int8(RectangleSideY(part));
+        h.part = uint32(part);
+        h.priority = h.sideX && h.sideY ? HP_Corner : HP_Edge;
+        handles.Add(h);
+    }
+}
+
+// The viewer takes the bounds when a new value asks for a redraw, before
+// the draw that puts the sides where the value says: they hold the outline
+// as drawn and as it will be drawn.
+bool RectangleControl::HoverBounds(const PreviewInfo &info, OrbRect &bounds) const
+{
+    HandleSet handles;
+    BuildHandles(info, handles);
+    const ViewMapping &m = info.Mapping();
+    AddOutline(info, RectangleFrame(Shape(), m.ImageWidth(), m.ImageHeight(), m.PixelAspect()), handles);
+    handles.Bounds(info.HandleScale, info.PickTolerance, bounds);
+    return true;
 }
 
 bool RectangleControl::IsPlacingInput(const Input *input) const
@@ -358,33 +385,33 @@ DragType RectangleControl::ControlDown(PreviewInfo *info, const OrbPointI &mouse
         // Another overlay moves what places us: we follow as a linked drag.
         if (IsPlacingInput(info->HotControl->GetMainInput()))
             mDragType = DRAG_Linked;
-        return PreviewControl::ControlDown(info, mouse, tags);
+        return HandleOverlay::ControlDown(info, mouse, tags);
     }
-    OrbPoint local;
-    mHoverPart = PartAt(*info, local);
-    mDragWidth = RectangleSideX(mHoverPart) != 0;
-    mDragHeight = RectangleSideY(mHoverPart) != 0;
-    if (mHoverPart) {
+    const HandleHit hit = PressHit(*info);
+    const int32 part = int32(hit.part);
+    mDragWidth = RectangleSideX(part) != 0;
+    mDragHeight = RectangleSideY(part) != 0;
+    if (hit) {
         mDragType = DRAG_Handle;
         if (mLockAspect)
             mDragWidth = mDragHeight = 1;
     }
-    const OrbPoint half = DrawnFrame(*info).Half();
-    mGrabOffset = RectangleGrabOffset(local, mHoverPart ? mHoverPart : mLastPart, half, mCornerRound);
+    const RectangleFrame frame = DrawnFrame(*info);
+    mGrabOffset = RectangleGrabOffset(MouseInFrame(*info, frame), hit ? part : mLastPart, frame.Half(), mCornerRound);
     if (!Finite(mGrabOffset))
         mGrabOffset = OrbPoint();
     if (mDragType == DRAG_Handle) {
-        mDragPart = mHoverPart;
-        if (mHoverPart)
-            mLastPart = mHoverPart;
-        mHighlighted = true;
+        mDragPart = part;
+        if (hit)
+            mLastPart = part;
+        Pick(hit);
     }
-    return PreviewControl::ControlDown(info, mouse, tags);
+    return HandleOverlay::ControlDown(info, mouse, tags);
 }
 
 void RectangleControl::ControlMove(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
 {
-    PreviewControl::ControlMove(info, mouse, tags);
+    HandleOverlay::ControlMove(info, mouse, tags);
     if (mDragType != DRAG_Handle)
         return;
     const ViewMapping &m = info->Mapping();
@@ -449,18 +476,7 @@ void RectangleControl::ControlUp(PreviewInfo *info, const OrbPointI &mouse, cons
         if (OrbaneDoc *doc = GetDoc())
             doc->EndUndo(true);
     }
-    PreviewControl::ControlUp(info, mouse, tags);
-    mHighlighted = mHoverPart != RPART_None;
-}
-
-uint64 RectangleControl::ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags)
-{
-    if (command == CCMD_HitTest)
-        return HitTest(*info, data);
-    OrbPoint local;
-    if (command == CCMD_GetInputAt && GetMainInput() && PartAt(*info, local))
-        return uint64(reinterpret_cast<uintptr_t>(GetMainInput()));
-    return PreviewControl::ControlCommand(info, command, data, tags);
+    HandleOverlay::ControlUp(info, mouse, tags);
 }
 
 uint16 RectangleControl::StipplePattern(int32 penStyle) noexcept
@@ -492,7 +508,7 @@ void RectangleControl::DrawControls(PreviewInfo *info, const TagList *tags)
         }
         p->PopAttrib();
     }
-    PreviewControl::DrawControls(info, tags);
+    HandleOverlay::DrawControls(info, tags);
 }
 
 // Eight strips, edges and corners in turn round the rectangle; then the
@@ -501,11 +517,11 @@ void RectangleControl::DrawOutline(GPainter &p, const PreviewInfo &info, const R
 {
     for (int32 part : StripOrder)
         DrawStrip(p, info, frame, part);
-    const int32 hot = mDragType == DRAG_Handle ? mDragPart : mHoverPart;
+    const int32 hot = mDragType == DRAG_Handle ? mDragPart : HoverPart();
     static constexpr int32 highlightOrder[8] = {3, 2, 6, 4, 12, 8, 9, 1};
     for (int32 part : highlightOrder)
         if (part == hot) {
-            p.Color(kHot, info.GetShadow(OrbColor()));
+            p.Color(HandleFill(info, uint32(part)), HandleShadow(info));
             p.LineWidth(2.0f);
             DrawStrip(p, info, frame, part);
         }

@@ -1,9 +1,8 @@
 #pragma once
 
+#include "framework/HandleOverlay.h"
 #include "framework/LinkedInput.h"
 #include "overlays/RectangleGeometry.h"
-
-#include "orbane/PreviewControl.h"
 
 #include <QImage>
 
@@ -17,8 +16,9 @@ class GPainter;
 // corners. It edits two Number Inputs, the width (index 0) and the height
 // (index 1), and only reads the Inputs that place it: centre (one point or
 // two numbers), angle, size multiplier, pivot axis (likewise), flips, and an
-// image shown inside it.
-class RectangleControl : public PreviewControl
+// image shown inside it. Its handles are the eight parts of its outline,
+// in its own turned frame.
+class RectangleControl : public HandleOverlay
 {
 public:
     RectangleControl(const Registry *reg, const ScriptVal &args, const TagList &tags);
@@ -37,7 +37,7 @@ public:
     DragType ControlDown(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
     void ControlMove(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
     void ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
-    uint64 ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags) override;
+    bool HoverBounds(const PreviewInfo &info, OrbRect &bounds) const override;
 
     // The shape as the Inputs and tags give it now.
     RectangleShape Shape() const;
@@ -46,7 +46,7 @@ public:
     bool LocksAspect() const { return mLockAspect != 0; }
     float64 Aspect() const { return mAspect; }
     int32 PenStyle() const { return mPenStyle; }
-    int32 HoverPart() const { return mHoverPart; }
+    int32 HoverPart() const { return int32(Handles().PoisedHit().part); }
     int32 DragPart() const { return mDragPart; }
     int32 LastPart() const { return mLastPart; }
     OrbPoint GrabOffset() const { return mGrabOffset; }
@@ -60,13 +60,16 @@ public:
     // Outline strips in drawing order, one per part code.
     static constexpr int32 StripOrder[8] = {1, 3, 2, 6, 4, 12, 8, 9};
 
+protected:
+    void BuildHandles(const PreviewInfo &info, HandleSet &handles) const override;
+
 private:
     static const LinkedInput<RectangleControl> Links[];
 
     RectangleFrame DrawnFrame(const PreviewInfo &info) const;
     OrbPoint Tolerance(const PreviewInfo &info) const;
-    int32 PartAt(const PreviewInfo &info, OrbPoint &local) const;
-    uint64 HitTest(const PreviewInfo &info, uint64 data);
+    void AddOutline(const PreviewInfo &info, const RectangleFrame &frame, HandleSet &handles) const;
+    OrbPoint MouseInFrame(const PreviewInfo &info, const RectangleFrame &frame) const;
     bool IsPlacingInput(const Input *input) const;
     void ReadPlacement(const TagList &tags);
     bool ReadAspectLock(const TagList &tags);
@@ -98,7 +101,7 @@ private:
     float64 mBlendAmount = 1.0;
     float64 mShownBlendAmount = 1.0;
     uint8 mDragWidth = 0, mDragHeight = 0;
-    int32 mHoverPart = 0, mDragPart = 1, mLastPart = 9;
+    int32 mDragPart = 1, mLastPart = 9;
     float64 mCornerRound = 0.0;
     OrbPoint mGrabOffset;
     QImage mImage;           // the image Input's pixels, shown inside

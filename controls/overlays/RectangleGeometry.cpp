@@ -62,24 +62,6 @@ float64 RectangleCornerRadius(OrbPoint half, float64 cornerRound) noexcept
     return cornerRound * std::min(std::fabs(half.x), std::fabs(half.y));
 }
 
-int32 RectangleHitPart(OrbPoint local, OrbPoint half, OrbPoint t, float64 cornerRound) noexcept
-{
-    const float64 ax = std::fabs(local.x), ay = std::fabs(local.y);
-    const float64 hw = std::fabs(half.x), hh = std::fabs(half.y);
-    const float64 r = RectangleCornerRadius(half, cornerRound);
-    const bool xEdge = std::fabs(ax - hw) < t.x && ay <= hh + t.y - r;
-    const bool yEdge = std::fabs(ay - hh) < t.y && ax <= hw + t.x - r;
-    bool corner = false;
-    if (!xEdge && !yEdge && hw - r < ax && ax < hw + t.x && hh - r < ay && ay < hh + t.y)
-        corner = std::hypot(ax - (hw - r), ay - (hh - r)) < std::hypot(t.x, t.y);
-    int32 part = RPART_None;
-    if (xEdge || corner)
-        part |= local.x >= 0.0 ? RPART_PlusX : RPART_MinusX;
-    if (yEdge || corner)
-        part |= local.y >= 0.0 ? RPART_PlusY : RPART_MinusY;
-    return part;
-}
-
 int32 RectangleSideX(int32 part) noexcept
 {
     return (part & RPART_PlusX) ? 1 : (part & RPART_MinusX) ? -1 : 0;

@@ -78,15 +78,7 @@ OrbPoint RectangleTolerance(float64 pickTolerance, OrbPoint viewScale) noexcept;
 // The radius of the corners' hit zones: `cornerRound` of the smaller half side.
 float64 RectangleCornerRadius(OrbPoint half, float64 cornerRound) noexcept;
 
-// The part at `local` (frame units from the rectangle's middle), 0 for none.
-// An X side is hit within `tolerance.x` of it and along it up to tolerance
-// minus the corner radius past its ends; Y sides likewise; both together
-// make a corner. With rounded corners the band beyond the edges' ends is a
-// corner when it lies within the tolerance's diagonal of the rounding
-// circle's centre.
-int32 RectangleHitPart(OrbPoint local, OrbPoint half, OrbPoint tolerance, float64 cornerRound) noexcept;
-
-// From `local` (as above) to the sides `part` names (the sides' ends pulled
+// From `local` (frame units from the rectangle's middle) to the sides `part` names (the sides' ends pulled
 // in along the diagonal by (1 - sqrt(2)/2) x radius at a corner); 0 on an
 // axis the part does not name.
 OrbPoint RectangleGrabOffset(OrbPoint local, int32 part, OrbPoint half, float64 cornerRound) noexcept;

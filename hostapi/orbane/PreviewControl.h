@@ -181,12 +181,6 @@ public:
 
     // Does `a` differ from `b` by more than ChangeThreshold?
     static bool Moved(float64 a, float64 b) noexcept;
-    static bool IsArrowKey(uint64 key) noexcept;
-    // The offset one arrow-key nudge makes: one step along the key's axis
-    // (Up is +Y), ten with Shift, a tenth with Control.
-    static OrbPoint NudgeOffset(uint64 key, float64 stepX, float64 stepY, Qt::KeyboardModifiers mods) noexcept;
-    // The keyboard's modifiers now, as the application sees them.
-    static Qt::KeyboardModifiers KeyModifiers();
     // Activates every overlay attached to `input` that is not active yet,
     // walking its watchers under the Input's read lock.
     static void ActivateOverlaysOf(Input *input);

@@ -23,9 +23,11 @@ end
 local arm = { ix = 0.5, iy = 0.5, dx = 15 }
 orbane.ViewerPress(arm)
 check.eq(orbane.ViewerInfo().hot, "CrosshairControl", "the crosshair is hot")
+check.eq(orbane.OverlayState("Points1", "Center").dragPart, 1, "its X arm is dragged")
 orbane.ViewerMove({ ix = 0.5, iy = 0.5, dx = 15 + 64, dy = 37 })
 orbane.ViewerMove({ ix = 0.5, iy = 0.5, dx = 15 + 128, dy = -23 })
 orbane.ViewerRelease({ ix = 0.5, iy = 0.5, dx = 15 + 128, dy = -23 })
+check.eq(orbane.OverlayState("Points1", "Center").dragPart, 0, "the arm is let go")
 local cx, cy = value("Center")
 check.eq(cy, 0.5, "Y after an X-arm drag")
 check.near(cx, 0.5 + 128 / spanX, "X after an X-arm drag", 1e-9)
@@ -50,6 +52,7 @@ check.eq(ay, y4, "Ridge 4 Y")
 -- Nudges go to the point pressed last: Shift+Right is ten pixels of the
 -- width; two Ups held down are one step, one pixel each of the width too.
 orbane.ViewerHover({ ix = nx, iy = ny })
+check.eq(orbane.OverlayState("Points1", "Ridge3").hover, true, "the point is under the mouse")
 orbane.ViewerKey("Right", "shift")
 orbane.ViewerKey("Up", "", "press")
 orbane.ViewerKey("Up", "", "press")

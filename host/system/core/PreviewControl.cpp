@@ -10,8 +10,6 @@
 #include "orbane/Registry.h"
 #include "orbane/ScriptVal.h"
 
-#include <QGuiApplication>
-
 #include <algorithm>
 #include <cmath>
 #include <cstdio>
@@ -289,37 +287,6 @@ void PreviewControl::Redraw()
 bool PreviewControl::Moved(float64 a, float64 b) noexcept
 {
     return std::fabs(a - b) > ChangeThreshold;
-}
-
-bool PreviewControl::IsArrowKey(uint64 key) noexcept
-{
-    return key == Qt::Key_Left || key == Qt::Key_Up || key == Qt::Key_Right || key == Qt::Key_Down;
-}
-
-OrbPoint PreviewControl::NudgeOffset(uint64 key, float64 stepX, float64 stepY, Qt::KeyboardModifiers mods) noexcept
-{
-    float64 factor = 1.0;
-    if (mods & Qt::ShiftModifier)
-        factor *= 10.0;
-    if (mods & Qt::ControlModifier)
-        factor /= 10.0;
-    switch (key) {
-    case Qt::Key_Left:
-        return {-stepX * factor, 0.0};
-    case Qt::Key_Right:
-        return {stepX * factor, 0.0};
-    case Qt::Key_Up:
-        return {0.0, stepY * factor};
-    case Qt::Key_Down:
-        return {0.0, -stepY * factor};
-    default:
-        return {};
-    }
-}
-
-Qt::KeyboardModifiers PreviewControl::KeyModifiers()
-{
-    return qGuiApp ? QGuiApplication::queryKeyboardModifiers() : Qt::NoModifier;
 }
 
 void PreviewControl::ActivateOverlaysOf(Input *input)

@@ -28,6 +28,26 @@ Handle Shaped(HandleShape shape, float64 radius, OrbPoint end = {}, float64 tole
     return h;
 }
 
+// One part of the outline of a box of half sides 40 x 20, in the frame that
+// `frameX`, `frameY` take the mouse into.
+Handle Outline(int8 sideX, int8 sideY, OrbPoint frameX = {1, 0}, OrbPoint frameY = {0, 1}, OrbPoint reach = {6, 6},
+               float64 round = 0)
+{
+    Handle h;
+    h.shape = HSH_Outline;
+    h.sideX = sideX;
+    h.sideY = sideY;
+    h.frameX = frameX;
+    h.frameY = frameY;
+    h.half = {40, 20};
+    h.reach = reach;
+    h.radius = round;
+    return h;
+}
+
+// A quarter turn: the frame's X runs up the viewer.
+constexpr OrbPoint kUp{0, 1}, kLeft{-1, 0};
+
 // The crosshair's Y arm: a press reaches to its tip, a hover a tolerance on.
 const Handle kArm = Box({}, {0, 23}, HG_Left | HG_Right | HG_Bottom);
 
@@ -81,6 +101,39 @@ const Row kRows[] = {
     {"band: past its end", Shaped(HSH_Band, 0, {100, 0}), {101, 0}, 1, HandleGeometry::Press, false},
     {"band: runs on by 3 handle pixels", Shaped(HSH_Band, 3, {100, 0}), {-3, 0}, 1, HandleGeometry::Press, true},
     {"band: slanted", Shaped(HSH_Band, 0, {30, 40}), {15 + 4, 20 - 3}, 1, HandleGeometry::Press, true},
+    {"outline turned: the +X edge is above", Outline(1, 0, kUp, kLeft), {0, 43}, 1, HandleGeometry::Press, true},
+    {"outline turned: 46 up is past its reach", Outline(1, 0, kUp, kLeft), {0, 46}, 1, HandleGeometry::Hover, false},
+    {"outline: where both edges meet, not the edge",
+     Outline(1, 0, kUp, kLeft),
+     {-22, 42},
+     1,
+     HandleGeometry::Press,
+     false},
+    {"outline: where both edges meet, the corner",
+     Outline(1, 1, kUp, kLeft),
+     {-22, 42},
+     1,
+     HandleGeometry::Press,
+     true},
+    {"outline: reach per frame axis", Outline(0, 1, {1, 0}, {0, 1}, {3, 12}), {0, 31}, 1, HandleGeometry::Press, true},
+    {"outline: a frame stretched twice across",
+     Outline(1, 0, {0.5, 0}, {0, 1}),
+     {85, 0},
+     1,
+     HandleGeometry::Press,
+     true},
+    {"outline: a rounded edge stops short",
+     Outline(1, 0, {1, 0}, {0, 1}, {6, 6}, 10),
+     {40, 17},
+     1,
+     HandleGeometry::Press,
+     false},
+    {"outline: the rounded corner reaches in",
+     Outline(1, 1, {1, 0}, {0, 1}, {6, 6}, 10),
+     {32, 12},
+     1,
+     HandleGeometry::Press,
+     true},
 };
 
 TEST(HandleGeometryTest, HitsByShape)
@@ -88,6 +141,46 @@ TEST(HandleGeometryTest, HitsByShape)
     for (const Row &row : kRows) {
         SCOPED_TRACE(row.name);
         EXPECT_EQ(HandleGeometry::Hits(row.handle, row.mouse, row.scale, 6.0, row.reach), row.hit);
+    }
+}
+
+struct OutlineRow
+{
+    const char *name;
+    OrbPoint local; // frame units from the middle of a box of half sides 100 x 50
+    OrbPoint reach;
+    float64 round; // corner radius
+    OrbPointI sides;
+};
+
+const OutlineRow kOutlineRows[] = {
+    {"+X edge", {100, 0}, {6, 6}, 0, {1, 0}},
+    {"+X edge, just inside the reach", {105.9, 20}, {6, 6}, 0, {1, 0}},
+    {"+X edge, at the reach: a miss", {106, 0}, {6, 6}, 0, {0, 0}},
+    {"-X edge from inside", {-95, -10}, {6, 6}, 0, {-1, 0}},
+    {"+Y edge", {0, 50}, {6, 6}, 0, {0, 1}},
+    {"-Y edge", {30, -53}, {6, 6}, 0, {0, -1}},
+    {"corner +X+Y", {102, 48}, {6, 6}, 0, {1, 1}},
+    {"corner -X+Y", {-100, 50}, {6, 6}, 0, {-1, 1}},
+    {"corner -X-Y", {-104, -55}, {6, 6}, 0, {-1, -1}},
+    {"corner +X-Y", {99, -51}, {6, 6}, 0, {1, -1}},
+    {"inside", {0, 0}, {6, 6}, 0, {0, 0}},
+    {"past the end of an edge", {100, 57}, {6, 6}, 0, {0, 0}},
+    {"reach per axis: Y wide", {0, 61}, {3, 12}, 0, {0, 1}},
+    {"reach per axis: X narrow", {103.5, 0}, {3, 12}, 0, {0, 0}},
+    // Rounded by 25: the edges stop that far short of the corners.
+    {"rounded: the edge stops short", {100, 40}, {6, 6}, 25, {0, 0}},
+    {"rounded: by the rounding centre", {80, 30}, {6, 6}, 25, {1, 1}},
+    {"rounded: -X-Y likewise", {-80, -30}, {6, 6}, 25, {-1, -1}},
+};
+
+TEST(HandleGeometryTest, OutlineSides)
+{
+    for (const OutlineRow &row : kOutlineRows) {
+        SCOPED_TRACE(row.name);
+        EXPECT_EQ(HandleGeometry::OutlineSides(row.local, {100, 50}, row.reach, row.round), row.sides);
+        // Negative half sides draw the same box, so they hit the same.
+        EXPECT_EQ(HandleGeometry::OutlineSides(row.local, {-100, -50}, row.reach, row.round), row.sides);
     }
 }
 

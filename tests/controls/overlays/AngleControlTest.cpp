@@ -1,12 +1,11 @@
 #include "OverlayProbe.h"
 #include "ViewerFixture.h"
 
-#include "overlays/AngleControl.h"
-
 #include "orbane/AutoParam.h"
 #include "orbane/ClassIDs.h"
 #include "orbane/Operator.h"
 #include "orbane/Registry.h"
+#include "orbane/ScriptVal.h"
 
 #include <QtTest>
 
@@ -46,10 +45,18 @@ public:
         attrs.Append(more);
         angle = Number("Angle", start, attrs);
         PreviewControl *o = Show() ? OverlayOf(angle) : nullptr;
-        overlay =
-            o && std::strcmp(o->GetRegistry()->Name(), "AngleControl") == 0 ? static_cast<AngleControl *>(o) : nullptr;
+        overlay = o && std::strcmp(o->GetRegistry()->Name(), "AngleControl") == 0 ? o : nullptr;
         return overlay != nullptr;
     }
+    // A field of what the user sees (orbane.OverlayState); NaN where absent.
+    double State(const char *key) const
+    {
+        ScriptVal state = ScriptVal::NewTable();
+        overlay->GetState(state);
+        const ScriptVal *v = state.FindKeyConst(ScriptVal(key));
+        return !v ? kNaN : v->IsBool() ? double(v->GetBool()) : v->GetNumber();
+    }
+    OrbPoint StateAt(const char *x, const char *y) const { return {State(x), State(y)}; }
     double Value(Input *in = nullptr)
     {
         const AutoNumber n(in ? in : angle, doc.GetCurrentTime());
@@ -69,7 +76,7 @@ public:
     }
 
     Input *angle = nullptr;
-    AngleControl *overlay = nullptr;
+    PreviewControl *overlay = nullptr;
 };
 
 // Three turns counter-clockwise at 80 pixels, 30 degrees a move.
@@ -190,11 +197,11 @@ private slots:
         v.Move(v.At(kMid, {-40, 40}));
         QVERIFY(v.Value() > 90.0);
         const OrbPoint centre = v.viewer.Info().TransformOut(kMid);
-        QCOMPARE(v.overlay->StartGrab(), flagged ? centre + OrbPoint(0, 6) : OrbPoint());
+        QCOMPARE(v.StateAt("startGrabX", "startGrabY"), flagged ? centre + OrbPoint(0, 6) : OrbPoint());
         // 45 degrees on the second ring, away from both arms and every mark.
         QCOMPARE(Lit(v.Grab(), v.At(kMid, {35, 41}), 0), flagged);
         v.Release(v.At(kMid, {-40, 40}));
-        QCOMPARE(v.overlay->StartGrab(), OrbPoint());
+        QCOMPARE(v.StateAt("startGrabX", "startGrabY"), OrbPoint());
         QVERIFY(Dark(v.Grab(), v.At(kMid, {35, 41}), 0));
     }
 
@@ -216,9 +223,9 @@ private slots:
         AngleView v;
         QVERIFY(v.ShowAngle(0.0));
         v.Hover(v.At(kMid, mouse));
-        QCOMPARE(v.overlay->Fade(), float(fade));
-        QCOMPARE(v.overlay->DrawnFade(), float(fade));
-        QCOMPARE(v.overlay->Hovered(), hovered);
+        QCOMPARE(float(v.State("fade")), float(fade));
+        QCOMPARE(float(v.State("drawnFade")), float(fade));
+        QCOMPARE(v.State("hover"), double(hovered));
         // The ring's left point, against the same point drawn at full opacity.
         const QPoint left = v.At(kMid, QPoint(-50, 0));
         const int drawn = Level(v.Grab(), left);
@@ -247,19 +254,19 @@ private slots:
         QVERIFY(v.ShowAngle(0.0, 1,
                             asPoint ? TagList{{ACID_Center, OrbID("Center")}}
                                     : TagList{{ACID_CenterX, OrbID("CenterX")}, {ACID_CenterY, OrbID("CenterY")}}));
-        QCOMPARE(v.overlay->Center(), OrbPoint(0.25, 0.5));
+        QCOMPARE(v.StateAt("centerX", "centerY"), OrbPoint(0.25, 0.5));
         v.DragPath({0.25, 0.5}, Path{{50, 0}, {0, 100}});
         QCOMPARE(v.Value(), 90.0);
         if (!asPoint) {
             v.Set(x, 0.75);
-            QCOMPARE(v.overlay->Center().x, 0.75);
+            QCOMPARE(v.State("centerX"), 0.75);
             return;
         }
         v.Press(v.At({0.25, 0.5}));
         QCOMPARE(v.overlay->IsDragging(), DRAG_Linked);
         v.Move(v.At({0.25, 0.5}, {40, 20}));
         v.Release(v.At({0.25, 0.5}, {40, 20}));
-        QVERIFY(Near(v.overlay->Center(), {0.35, 0.6}));
+        QVERIFY(Near(v.StateAt("centerX", "centerY"), {0.35, 0.6}));
         QCOMPARE(v.Value(), 90.0);
         QCOMPARE(v.doc.UndoNames(), (QStringList{"Change Angle", "Change Center"}));
     }
@@ -289,7 +296,7 @@ private slots:
         QVERIFY(v.ShowAngle(
             0.0, 0, TagList{{ACID_Radius, OrbID("Radius")}, {ACD_MinRadius, minRadius}, {ACD_RadiusScale, scale}}));
         v.Set(r, second);
-        QCOMPARE(v.overlay->Radius(), radius);
+        QCOMPARE(v.State("radius"), radius);
         v.DragPath(kMid, Path{{int(std::lround(radius * 400)), 0}, {0, 100}});
         QCOMPARE(v.Value(), 90.0);
     }
@@ -314,13 +321,13 @@ private slots:
         QVERIFY(v.ShowAngle(0.0));
         v.Hover(v.At(kMid, {50, 0}));
         QVERIFY(v.viewer.BeginFollowCursor(v.overlay, TagList{{ACD_FollowX, 0.5}, {ACD_FollowY, 0.5}}));
-        QVERIFY(v.overlay->FollowsCursor());
+        QCOMPARE(v.State("followCursor"), 1.0);
         v.Hover(v.At(kMid, {0, 100}));
         QCOMPARE(v.Value(), 90.0);
         v.Hover(v.At(kMid, {-100, 0}));
         v.Click(v.At(kMid, {-100, 0}));
         QCOMPARE(v.Value(), 180.0);
-        QVERIFY(!v.overlay->FollowsCursor());
+        QCOMPARE(v.State("followCursor"), 0.0);
         QCOMPARE(v.overlay->IsDragging(), DRAG_None);
         QCOMPARE(v.doc.UndoNames(), QStringList{"Change Angle"});
         v.Hover(v.At(kMid, {0, -100}));
@@ -359,7 +366,7 @@ private slots:
                                     {ACID_Radius, OrbID("Radius")}}));
         QCOMPARE(Lit(v.Grab(), v.At(kMid, {-50, 0})), style == 1);
         v.Hover(v.At(kMid, {60, 0}));
-        QVERIFY(std::isfinite(v.overlay->Fade()));
+        QVERIFY(std::isfinite(v.State("fade")));
         v.DragPath(kMid, Path{{style == 1 ? 50 : 20, 0}, {0, 100}});
         QCOMPARE(v.Value(), written);
     }

@@ -121,7 +121,6 @@ private slots:
         const OrbPoint end = Geo::ArmEnd({0.5, 0.5}, 90.0, 0.1, 2.0);
         QVERIFY(std::fabs(end.x - 0.5) < 1e-12 && std::fabs(end.y - 0.7) < 1e-12);
         QCOMPARE(Geo::RingGrab({0, 0}, {0, 0}, 50.0), OrbPoint(50, 0)); // at the centre: along X
-        QCOMPARE(Geo::Fade(kNaN), 0.5f);
         QCOMPARE(Geo::PressTolerance(2, 2.6), 10.0); // whole pixels for a press
         QCOMPARE(Geo::HoverTolerance(2, 2.6), 10.4);
     }

@@ -114,6 +114,7 @@ private slots:
     void grabOffsetInFrameUnits_data();
     void grabOffsetInFrameUnits();
     void hoverHighlightsAndRepaintsOnChange();
+    void hoverBoundsHoldTheNextDraw();
     void penStyle_data();
     void penStyle();
     void followsItsCentreAsLinkedDrag();
@@ -363,6 +364,26 @@ void RectangleControlTest::hoverHighlightsAndRepaintsOnChange()
     QVERIFY(Near(hot, edge, [](QRgb c) { return qRed(c) > 200 && qBlue(c) < 120; }));
     // The edge opposite keeps its colour.
     QVERIFY(Near(hot, f.At({0.5, 0.5}, QPoint(-100, 0)), [](QRgb c) { return qBlue(c) > 150; }));
+}
+
+// The viewer takes a rectangle's hover bounds when a new value asks for a
+// redraw. A hover before that draw meets the sides where they were drawn;
+// after it, the sides where the value put them are found, also by a hover
+// that only the viewer's index would pass on.
+void RectangleControlTest::hoverBoundsHoldTheNextDraw()
+{
+    ViewerFixture f;
+    Input *w = AddRectangle(f, 0.25, 0.25);
+    QVERIFY(f.Show());
+    f.Grab();
+    w->SetValue(AutoNumber(0.5).get(), f.doc.GetCurrentTime());
+    f.Hover(f.At({0.5, 0.5}, QPoint(50, 0)));
+    QCOMPARE(StateOf(f.OverlayOf(w), "hoverPart"), 1.0);
+    f.Grab();
+    f.Hover(f.At({0.5, 0.5}));
+    f.Hover(f.At({0.5, 0.5}, QPoint(1, 0)));
+    f.Hover(f.At({0.5, 0.5}, QPoint(100, 0)));
+    QCOMPARE(StateOf(f.OverlayOf(w), "hoverPart"), 1.0);
 }
 
 void RectangleControlTest::penStyle_data()

@@ -9,14 +9,13 @@ using namespace Orbane;
 
 Q_DECLARE_METATYPE(Orbane::OrbPoint)
 
-// The rectangle's pure geometry: frames, parts, grab offsets, resizing.
+// The rectangle's pure geometry: frames, grab offsets, resizing. Which part
+// of its outline the mouse is over is the handles' outline shape.
 class RectangleGeometryTest : public QObject
 {
     Q_OBJECT
 
 private slots:
-    void hitPart_data();
-    void hitPart();
     void frame_data();
     void frame();
     void resizedSide_data();
@@ -25,45 +24,6 @@ private slots:
     void grabOffset();
     void lockedSizeAndTolerance();
 };
-
-// A 200 x 100 rectangle in frame units, 6 units of tolerance.
-void RectangleGeometryTest::hitPart_data()
-{
-    QTest::addColumn<OrbPoint>("local");
-    QTest::addColumn<OrbPoint>("tolerance");
-    QTest::addColumn<double>("round");
-    QTest::addColumn<int>("part");
-    const OrbPoint t(6, 6);
-    QTest::newRow("+X edge") << OrbPoint(100, 0) << t << 0.0 << 1;
-    QTest::newRow("+X edge, just inside the tolerance") << OrbPoint(105.9, 20) << t << 0.0 << 1;
-    QTest::newRow("+X edge, at the tolerance: a miss") << OrbPoint(106, 0) << t << 0.0 << 0;
-    QTest::newRow("-X edge from inside") << OrbPoint(-95, -10) << t << 0.0 << 4;
-    QTest::newRow("+Y edge") << OrbPoint(0, 50) << t << 0.0 << 2;
-    QTest::newRow("-Y edge") << OrbPoint(30, -53) << t << 0.0 << 8;
-    QTest::newRow("corner +X+Y") << OrbPoint(102, 48) << t << 0.0 << 3;
-    QTest::newRow("corner -X+Y") << OrbPoint(-100, 50) << t << 0.0 << 6;
-    QTest::newRow("corner -X-Y") << OrbPoint(-104, -55) << t << 0.0 << 12;
-    QTest::newRow("corner +X-Y") << OrbPoint(99, -51) << t << 0.0 << 9;
-    QTest::newRow("inside") << OrbPoint(0, 0) << t << 0.0 << 0;
-    QTest::newRow("past the end of an edge") << OrbPoint(100, 57) << t << 0.0 << 0;
-    QTest::newRow("tolerance per axis: Y wide") << OrbPoint(0, 61) << OrbPoint(3, 12) << 0.0 << 2;
-    QTest::newRow("tolerance per axis: X narrow") << OrbPoint(103.5, 0) << OrbPoint(3, 12) << 0.0 << 0;
-    // Rounded by half the smaller half side: r = 25. Edges stop r short.
-    QTest::newRow("rounded: the edge stops short") << OrbPoint(100, 40) << t << 0.5 << 0;
-    QTest::newRow("rounded: by the rounding centre") << OrbPoint(80, 30) << t << 0.5 << 3;
-    QTest::newRow("rounded: -X-Y likewise") << OrbPoint(-80, -30) << t << 0.5 << 12;
-}
-
-void RectangleGeometryTest::hitPart()
-{
-    QFETCH(OrbPoint, local);
-    QFETCH(OrbPoint, tolerance);
-    QFETCH(double, round);
-    QFETCH(int, part);
-    QCOMPARE(RectangleHitPart(local, {100, 50}, tolerance, round), part);
-    // Negative sizes draw the same rectangle, so they hit the same.
-    QCOMPARE(RectangleHitPart(local, {-100, -50}, tolerance, round), part);
-}
 
 // A 400 x 200 image; frame units are image pixels high.
 void RectangleGeometryTest::frame_data()

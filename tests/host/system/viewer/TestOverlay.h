@@ -8,6 +8,7 @@
 #include "orbane/PreviewInfo.h"
 
 #include <QAction>
+#include <QGuiApplication>
 #include <QMenu>
 
 #include <algorithm>
@@ -123,7 +124,7 @@ public:
         if (command == CCMD_NeedsKey)
             return data == Qt::Key_Space ? 1 : 0;
         if (command == CCMD_KeyDown)
-            modifiers.push_back(KeyModifiers());
+            modifiers.push_back(QGuiApplication::queryKeyboardModifiers());
         if (command == CCMD_GetInputAt && Hit(*info))
             return uint64(reinterpret_cast<uintptr_t>(GetMainInput()));
         return PreviewControl::ControlCommand(info, command, data, tags);
