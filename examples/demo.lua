@@ -9,6 +9,5 @@ return {
     { file = "tools/Sliders.lua", name = "Sliders1" },
     { file = "tools/Choices.lua", name = "Choices1" },
     { file = "tools/Transform.lua", name = "Transform1" },
-    { file = "tools/Rotate.lua", name = "Rotate1" },
   },
 }
