@@ -184,7 +184,9 @@ struct TestOverlayClass
     TestOverlayClass()
     {
         reg._Init(ClassRegistry, kTestOverlayID,
-                  TagList{{REG_Factory, &NewObject<TestOverlay>}, {REG_Kind, REGKIND_PreviewControl}, {REG_Name, "TestOverlay"}});
+                  TagList{{REG_Factory, &NewObject<TestOverlay>},
+                          {REG_Kind, REGKIND_PreviewControl},
+                          {REG_Name, "TestOverlay"}});
     }
     Registry reg;
 };

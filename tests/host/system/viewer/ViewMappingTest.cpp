@@ -1,5 +1,5 @@
-#include "orbane/PreviewInfo.h"
 #include "orbane/ViewMapping.h"
+#include "orbane/PreviewInfo.h"
 
 #include <gtest/gtest.h>
 
