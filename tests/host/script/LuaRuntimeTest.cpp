@@ -106,20 +106,6 @@ TEST_F(LuaTest, ObjectsAreReleasedWhenCollected)
     EXPECT_EQ(TestWidget::sAlive, mAlive);
 }
 
-// The same class or a derived one gives the object, nil gives nil (and
-// another class nil: ScriptValuesPushWithTheirObjects).
-TEST_F(LuaTest, CastFunctionsSeeTheRealObject)
-{
-    EXPECT_EQ(Eval(R"(
-        local ffi = require("ffi")
-        local w, g = orbane.Create("WidgetControl"), orbane.Create("GadgetControl")
-        local wc = ffi.C.ffi_TestWidget_cast(w)
-        result = { ffi.C.ffi_TestWidget_uncast(wc) == w, ffi.C.ffi_TestWidget_uncast(ffi.C.ffi_TestWidget_cast(g)) == g,
-                   ffi.C.ffi_TestWidget_cast(nil) == nil, tostring(ffi.typeof(wc)), tostring(ffi.typeof('WidgetIDControl *')) })"),
-              "true; true; true; ctype<struct TestWidget *>; ctype<struct WidgetIDControl *>")
-        << "ID variants' native names are declared too";
-}
-
 TEST_F(LuaTest, AttributesGoByNameThroughTheInheritedTagMap)
 {
     EXPECT_EQ(Eval(R"(
@@ -146,19 +132,6 @@ TEST_F(LuaTest, ClassesListsEveryRegistrationInOrder)
                    w.index < v.index and v.index < g.index })"),
               "TestWidget; ScriptWidget; TestRoot; 10; TestWidget; WidgetIDControl; WidgetControl; 0; true");
     EXPECT_EQ(Eval("result = #orbane.Classes()"), std::to_string(ClassRegistry.All().size()));
-}
-
-TEST_F(LuaTest, MapTagsShowsTheTagListATableBecomes)
-{
-    // Formatted in Lua: the order of a Lua table's named keys is Lua's own.
-    EXPECT_EQ(Eval(R"(
-        local out = {}
-        for _, item in ipairs(orbane.MapTags('ScriptWidget', { WGT_AddItem = { 'a', 'b' } })) do
-            out[#out + 1] = string.format("%08X=%s", item.tag, tostring(item.value))
-        end
-        result = { table.concat(out, " "), orbane.MapTags('WidgetControl', { WGT_Align = 'Center' })[1].value,
-                   #orbane.MapTags('WidgetControl') })"),
-              "38050008=a 38050008=b; 2; 0");
 }
 
 TEST_F(LuaTest, ScriptValuesPushWithTheirObjects)

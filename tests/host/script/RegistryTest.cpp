@@ -33,20 +33,6 @@ const FactoryFunc kMakeCounted = [](const Registry *, const ScriptVal &, const T
 
 } // namespace
 
-// The variant shares the primary's factory: the object is of the primary
-// class, and it keeps the variant's registry, which tells the two apart.
-TEST(ClassRegistry, AnIDVariantCreatesItsPrimaryClass)
-{
-    const Registry *variant = ClassRegistry.Find(WidgetIDClassID);
-    ASSERT_NE(variant, nullptr);
-    EXPECT_EQ(variant->Base(), ClassRegistry.Find(WidgetClassID));
-    EXPECT_EQ(variant->FindMapHook(), ClassRegistry.Find(WidgetClassID)->MapHook());
-    ObjectPtr obj(ClassRegistry.New(WidgetIDClassID, ScriptVal(), TagList()));
-    ASSERT_NE(obj, nullptr);
-    EXPECT_EQ(typeid(*obj), typeid(TestWidget));
-    EXPECT_EQ(obj->GetRegistry(), variant);
-}
-
 TEST(Registry, InitEntersTheListAndTheDestructorLeavesIt)
 {
     RegistryList list;

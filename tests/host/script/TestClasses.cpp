@@ -116,8 +116,6 @@ const bool kWidgetRegistered =
 ScriptInfoT<TestWidget> WidgetInfo(1, "WidgetControl", "", "");
 FFIFunc WidgetCast(WidgetType, "_cast", "_cast", "ffi_TestWidget_cast", "TestWidget * ffi_TestWidget_cast(void * obj)",
                    "obj", nullptr, "TestWidget *", 0);
-FFIFunc WidgetUncast(WidgetType, "_uncast", "_uncast", "ffi_TestWidget_uncast",
-                     "ScriptObject * ffi_TestWidget_uncast(TestWidget * self)", "self", nullptr, "ScriptObject *", 0);
 FFITypeT<TestWidget> WidgetType("ScriptWidget", "TestWidget", "InputControl", -1, 0, nullptr);
 const bool kWidgetBound = (SetFFIType(typeid(TestWidget), &WidgetType), true);
 FFITagMap WidgetMap(WidgetType, "Create", "InputControl.Create", WidgetTags);
@@ -152,11 +150,6 @@ extern "C" {
 TestWidget *ffi_TestWidget_cast(void *obj)
 {
     return dynamic_cast<TestWidget *>(static_cast<ScriptObject *>(obj));
-}
-
-ScriptObject *ffi_TestWidget_uncast(TestWidget *self)
-{
-    return self;
 }
 
 } // extern "C"

@@ -8,20 +8,6 @@
 namespace Orbane {
 namespace {
 
-TEST(OperatorTest, InputsStayInDeclarationOrder)
-{
-    AutoRef<Operator> tool(new Operator("Merge1", "Merge"));
-    const char *ids[] = {"Blend", "Center", "Angle", "Apply"};
-    for (const char *id : ids)
-        ASSERT_NE(tool->AddInput(id, id, CLSID_DataType_Number, {}, AutoNumber(0.0)), nullptr);
-    ASSERT_EQ(tool->Inputs().size(), 4u);
-    for (std::size_t i = 0; i < 4; ++i) {
-        EXPECT_EQ(tool->FindInput(ids[i]), tool->Inputs()[i]);
-        EXPECT_EQ(tool->Inputs()[i]->GetOperator(), tool.get());
-    }
-    EXPECT_EQ(tool->FindInput("Missing"), nullptr);
-}
-
 TEST(OperatorTest, BadInputsAreRefusedWithAMessage)
 {
     const struct

@@ -14,26 +14,11 @@ ScriptVal Table(std::initializer_list<std::pair<const char *, ScriptVal>> entrie
     return t;
 }
 
-AutoParameter N(float64 v)
-{
-    return AutoParameter(AutoNumber(v));
-}
-AutoParameter P(float64 x, float64 y, float64 z = 0)
-{
-    return AutoParameter(AutoPoint(x, y, z));
-}
-AutoParameter T(const char *s)
-{
-    return AutoParameter(AutoText(s));
-}
-AutoParameter I(const char *s)
-{
-    return AutoParameter(AutoOrbIDParam(s));
-}
-AutoParameter S(ScriptVal v)
-{
-    return AutoParameter(AutoScriptValParam(v));
-}
+const auto N = [](float64 v) { return AutoParameter(AutoNumber(v)); };
+const auto P = [](float64 x, float64 y, float64 z = 0) { return AutoParameter(AutoPoint(x, y, z)); };
+const auto T = [](const char *s) { return AutoParameter(AutoText(s)); };
+const auto I = [](const char *s) { return AutoParameter(AutoOrbIDParam(s)); };
+const auto S = [](ScriptVal v) { return AutoParameter(AutoScriptValParam(v)); };
 
 // Numbers and points blend; text, identifiers and tables step at the end;
 // another kind keeps the value it started from.

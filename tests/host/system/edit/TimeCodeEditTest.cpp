@@ -38,7 +38,8 @@ class TimeCodeEditTest : public QObject
     Q_OBJECT
 private slots:
     // Numbers to `decimals` places (-1: up to six); with a frame rate, time
-    // codes that read back as the same frame.
+    // codes that read back as the same frame. The plain cases are shown and
+    // typed through the slider (SliderControlTest); here the edges.
     void format_data()
     {
         QTest::addColumn<double>("value");
@@ -46,14 +47,12 @@ private slots:
         QTest::addColumn<bool>("integer");
         QTest::addColumn<double>("fps");
         QTest::addColumn<QString>("text");
-        QTest::newRow("two places") << 0.127 << 2 << false << 0.0 << "0.13";
         QTest::newRow("no places") << 2.5 << 0 << false << 0.0 << "3";
         QTest::newRow("automatic trims zeros") << 1.25 << -1 << false << 0.0 << "1.25";
         QTest::newRow("automatic six places") << 1.0 / 3 << -1 << false << 0.0 << "0.333333";
         QTest::newRow("negative zero") << -0.001 << 2 << false << 0.0 << "0.00";
         QTest::newRow("integer rounds half up") << 2.5 << 3 << true << 0.0 << "3";
         QTest::newRow("integer negative half") << -2.5 << -1 << true << 0.0 << "-2";
-        QTest::newRow("one second and a half") << 36.0 << 0 << false << 24.0 << "00:00:01:12";
         QTest::newRow("an hour") << 90000.0 << 0 << false << 25.0 << "01:00:00:00";
         QTest::newRow("fraction of a frame") << 12.5 << 1 << false << 24.0 << "00:00:00:12.5";
         QTest::newRow("negative time") << -30.0 << 0 << false << 30.0 << "-00:00:01:00";
@@ -81,16 +80,13 @@ private slots:
         QTest::addColumn<bool>("ok");
         QTest::addColumn<double>("value");
         QTest::addColumn<QString>("expression");
-        QTest::newRow("plain") << "12.5" << false << true << 12.5 << "";
         QTest::newRow("arithmetic") << "2*3+1" << false << true << 7.0 << "";
         QTest::newRow("garbage keeps last value") << "abc" << false << false << 4.0 << "";
         QTest::newRow("division by zero is no number") << "1/0" << false << false << 4.0 << "";
-        QTest::newRow("time code") << "00:00:02:06" << true << true << 54.0 << "";
         QTest::newRow("frames in time display") << "30" << true << true << 30.0 << "";
         QTest::newRow("time code with letters") << "00:aa:00" << true << false << 4.0 << "";
         QTest::newRow("too many time fields") << "1:2:3:4:5" << true << false << 4.0 << "";
         QTest::newRow("negative time field") << "00:-1:00" << true << false << 4.0 << "";
-        QTest::newRow("expression") << "=3*4" << false << true << 12.0 << "3*4";
         QTest::newRow("expression trimmed") << " = time * 2 " << false << false << 4.0 << "time * 2";
     }
 

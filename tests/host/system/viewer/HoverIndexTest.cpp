@@ -7,8 +7,6 @@
 #include "ViewerFixture.h"
 
 #include "orbane/Input.h"
-#include "orbane/Registry.h"
-#include "orbane/RegistryList.h"
 
 #include <QtTest>
 
@@ -19,26 +17,27 @@ using namespace Orbane::Test;
 
 namespace {
 
-const OrbID kTestOverlayID("TestOverlay");
-
 // One viewer and its scene; `plain` asks every overlay on each hover.
 struct Scene
 {
-    Scene(bool plain, const std::vector<OrbPoint> &points, const std::vector<bool> &fades)
+    // Every `fadeEvery`-th overlay fades; 0: none.
+    Scene(bool plain, const std::vector<OrbPoint> &points, int fadeEvery = 0)
     {
         f.viewer.SetPlainHover(plain);
         for (std::size_t i = 0; i < points.size(); ++i) {
-            TagList attrs{{INPA_PreviewControl, kTestOverlayID}, {TestOverlay::TO_Fades, fades[i] ? 1 : 0}};
+            const bool fades = fadeEvery && i % std::size_t(fadeEvery) == 0;
+            TagList attrs{{INPA_PreviewControl, kTestOverlayID}, {TestOverlay::TO_Fades, fades ? 1 : 0}};
             inputs.push_back(f.AddPoint(("P" + std::to_string(i)).c_str(), points[i].x, points[i].y, attrs));
         }
     }
-    // After Show, in the inputs' order.
-    void Collect()
+    // Shows the viewer and collects the overlays in the inputs' order.
+    bool Show()
     {
+        const bool shown = f.Show();
         for (Input *in : inputs)
             overlays.push_back(dynamic_cast<TestOverlay *>(f.OverlayOf(in)));
+        return shown;
     }
-    TestOverlay *Overlay(std::size_t i) const { return overlays[i]; }
     int HoverIndex() const
     {
         const auto &all = f.viewer.Overlays();
@@ -82,7 +81,7 @@ public:
         }
         if (kind < 92) {
             const bool on = Int(0, 1) == 1;
-            Both([&](Scene &s) { s.Overlay(i)->SetActive(on ? 1 : 0, nullptr); });
+            Both([&](Scene &s) { s.overlays[i]->SetActive(on ? 1 : 0, nullptr); });
             return QString("P%1 %2").arg(i).arg(on ? "on" : "off");
         }
         if (kind < 97) {
@@ -99,8 +98,8 @@ public:
 private:
     template <class F> void Both(F f)
     {
-        f(mA);
-        f(mB);
+        for (Scene *s : {&mA, &mB})
+            f(*s);
     }
     int Int(int lo, int hi) { return std::uniform_int_distribution<int>(lo, hi)(mRandom); }
     float64 Real(float64 lo, float64 hi) { return std::uniform_real_distribution<float64>(lo, hi)(mRandom); }
@@ -117,21 +116,13 @@ class HoverIndexTest : public QObject
     Q_OBJECT
 
 private slots:
-    void initTestCase();
     void agreesWithThePlainWalk_data();
     void agreesWithThePlainWalk();
     void switchedOffHoverIsLetGoWhenBack();
 
 private:
-    Registry mTestOverlayClass;
+    TestOverlayClass mTestOverlayClass;
 };
-
-void HoverIndexTest::initTestCase()
-{
-    mTestOverlayClass._Init(
-        ClassRegistry, kTestOverlayID,
-        TagList{{REG_Factory, &NewObject<TestOverlay>}, {REG_Kind, REGKIND_PreviewControl}, {REG_Name, "TestOverlay"}});
-}
 
 void HoverIndexTest::agreesWithThePlainWalk_data()
 {
@@ -152,23 +143,17 @@ void HoverIndexTest::agreesWithThePlainWalk()
     std::mt19937 random(seed);
     std::uniform_real_distribution<float64> place(-0.1, 1.1);
     std::vector<OrbPoint> points;
-    std::vector<bool> fades;
-    for (int i = 0; i < count; ++i) {
+    for (int i = 0; i < count; ++i)
         points.emplace_back(place(random), place(random));
-        fades.push_back(fadeEvery && i % fadeEvery == 0);
-    }
-    Scene indexed(false, points, fades), plain(true, points, fades);
-    QVERIFY(indexed.f.Show());
-    QVERIFY(plain.f.Show());
-    indexed.Collect();
-    plain.Collect();
+    Scene indexed(false, points, fadeEvery), plain(true, points, fadeEvery);
+    QVERIFY(indexed.Show() && plain.Show());
     Stepper stepper(seed, indexed, plain);
     int askedIndexed = 0, askedPlain = 0;
     for (int step = 0; step < 300; ++step) {
         const QString what = QString("step %1: %2").arg(step).arg(stepper.Step());
         QVERIFY2(indexed.HoverIndex() == plain.HoverIndex(), qPrintable(what));
         for (std::size_t i = 0; i < points.size(); ++i) {
-            const TestOverlay *a = indexed.Overlay(i), *b = plain.Overlay(i);
+            const TestOverlay *a = indexed.overlays[i], *b = plain.overlays[i];
             QVERIFY2(a->hover == b->hover && a->redraws == b->redraws && a->fadeStep == b->fadeStep,
                      qPrintable(what + QString(", P%1").arg(i)));
         }
@@ -184,20 +169,17 @@ void HoverIndexTest::agreesWithThePlainWalk()
 // must still be asked to let go of it.
 void HoverIndexTest::switchedOffHoverIsLetGoWhenBack()
 {
-    Scene indexed(false, {{0.25, 0.5}, {0.75, 0.5}}, {false, false});
-    Scene plain(true, {{0.25, 0.5}, {0.75, 0.5}}, {false, false});
+    Scene indexed(false, {{0.25, 0.5}, {0.75, 0.5}}), plain(true, {{0.25, 0.5}, {0.75, 0.5}});
     for (Scene *s : {&indexed, &plain}) {
-        QVERIFY(s->f.Show());
-        s->Collect();
+        QVERIFY(s->Show());
         s->f.Hover(s->f.At({0.25, 0.5}));
-        s->Overlay(0)->SetActive(0, nullptr);
+        s->overlays[0]->SetActive(0, nullptr);
         s->f.Hover(s->f.At({0.75, 0.5}));
-        s->Overlay(0)->SetActive(1, nullptr);
+        s->overlays[0]->SetActive(1, nullptr);
         s->f.Hover(s->f.At({0.75, 0.5}, QPoint(2, 0)));
     }
-    QCOMPARE(plain.Overlay(0)->hover, false);
-    QCOMPARE(indexed.Overlay(0)->hover, false);
-    QCOMPARE(indexed.Overlay(0)->redraws, plain.Overlay(0)->redraws);
+    QVERIFY(!plain.overlays[0]->hover && !indexed.overlays[0]->hover);
+    QCOMPARE(indexed.overlays[0]->redraws, plain.overlays[0]->redraws);
 }
 
 QTEST_MAIN(HoverIndexTest)

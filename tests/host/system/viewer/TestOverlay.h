@@ -6,6 +6,8 @@
 #include "orbane/Point.h"
 #include "orbane/PreviewControl.h"
 #include "orbane/PreviewInfo.h"
+#include "orbane/Registry.h"
+#include "orbane/RegistryList.h"
 
 #include <QAction>
 #include <QGuiApplication>
@@ -173,6 +175,21 @@ public:
     std::vector<int32> passes;
     std::vector<int32> menuIDs;
     std::vector<Qt::KeyboardModifiers> modifiers;
+};
+
+inline const OrbID kTestOverlayID("TestOverlay");
+
+// Registers the class for as long as a test object lives.
+struct TestOverlayClass
+{
+    TestOverlayClass()
+    {
+        reg._Init(ClassRegistry, kTestOverlayID,
+                  TagList{{REG_Factory, &NewObject<TestOverlay>},
+                          {REG_Kind, REGKIND_PreviewControl},
+                          {REG_Name, "TestOverlay"}});
+    }
+    Registry reg;
 };
 
 } // namespace Test

@@ -19,50 +19,13 @@ QImage Render(QWidget &w, qreal dpr)
 
 } // namespace
 
-using StateList = QList<int>;
-
 class CustomCheckBoxTest : public QObject
 {
     Q_OBJECT
 private slots:
-    // Press and release come from the base button (see CustomButtonTest);
-    // the box cycles its states and reports the modifiers held.
-    void clicksCycleStates_data()
-    {
-        QTest::addColumn<int>("style");
-        QTest::addColumn<int>("start");
-        QTest::addColumn<int>("modifiers");
-        QTest::addColumn<StateList>("states");
-        QTest::newRow("two-state") << 1 << 0 << int(Qt::NoModifier) << StateList{1, 0, 1};
-        QTest::newRow("tri-state") << 2 << 0 << int(Qt::NoModifier) << StateList{1, 2, 0, 1};
-        QTest::newRow("ctrl and shift held") << 2 << 0 << int(Qt::ControlModifier | Qt::ShiftModifier) << StateList{1};
-    }
-
-    void clicksCycleStates()
-    {
-        QFETCH(int, style);
-        QFETCH(int, start);
-        QFETCH(int, modifiers);
-        QFETCH(StateList, states);
-        CustomCheckBox box;
-        box.SetLabel(QStringLiteral("Invert"));
-        box.resize(160, 22);
-        box.show();
-        box.SetStyle(style);
-        box.SetCheck(start);
-        // By signature, as controls connect.
-        QSignalSpy changed(&box, SIGNAL(CheckChanged(int32, uint64)));
-        QSignalSpy pressed(&box, SIGNAL(ButtonPressed(uint64, bool)));
-        for (int i = 0; i < states.size(); ++i) {
-            QTest::mouseClick(&box, Qt::LeftButton, Qt::KeyboardModifiers(modifiers), box.rect().center());
-            QCOMPARE(changed.count(), i + 1);
-            QCOMPARE(changed.last().at(0).value<int32>(), states[i]);
-            QCOMPARE(changed.last().at(1).value<uint64>(), uint64(modifiers));
-            QCOMPARE(box.GetCheck(), states[i]);
-            QCOMPARE(pressed.last().at(1).toBool(), states[i] != 0);
-        }
-    }
-
+    // Clicks cycle the states through the check box control
+    // (CheckBoxControlTest); the modifiers come from the base button
+    // (CustomButtonTest).
     // A program's SetCheck clamps to the style's states and tells no one.
     void setCheckClampsAndEmitsNothing()
     {
