@@ -224,57 +224,38 @@ void ComboControlTest::identifiers()
     QVERIFY(written->Equals(*MakeID(dataType, texts[2])));
 }
 
+// Keys in the open list preview each item, which a second control of the
+// Input follows; a gesture that ends on the value it started from leaves no
+// step. (Choosing and Escape are worked in the choices script.)
 void ComboControlTest::livePreview_data()
 {
     QTest::addColumn<QList<int>>("keys");
     QTest::addColumn<QList<double>>("previews"); // the value after each key but the last
-    QTest::addColumn<double>("final");
-    QTest::addColumn<int>("steps");
-    const int down = Qt::Key_Down, up = Qt::Key_Up;
-    QTest::newRow("preview two, choose the second")
-        << QList<int>{down, down, Qt::Key_Return} << QList<double>{1, 2} << 2.0 << 1;
-    QTest::newRow("preview and come back") << QList<int>{down, up, Qt::Key_Return} << QList<double>{1, 0} << 0.0 << 0;
-    // The value is as it was, so the gesture leaves no step.
-    QTest::newRow("choosing the shown item writes nothing")
-        << QList<int>{Qt::Key_Return} << QList<double>{} << 0.0 << 0;
-    QTest::newRow("escape puts the value back")
-        << QList<int>{down, down, Qt::Key_Escape} << QList<double>{1, 2} << 0.0 << 0;
+    QTest::newRow("preview and come back") << QList<int>{Qt::Key_Down, Qt::Key_Up, Qt::Key_Return} << QList<double>{1, 0};
+    QTest::newRow("choosing the shown item") << QList<int>{Qt::Key_Return} << QList<double>{};
 }
 
 void ComboControlTest::livePreview()
 {
     QFETCH(QList<int>, keys);
     QFETCH(QList<double>, previews);
-    QFETCH(double, final);
-    QFETCH(int, steps);
     ToolFixture f;
     Input *in = f.AddNumber("Mode", 0.0, ABC());
-    InputControl *c = f.Create(CLSID_InputControl_Combo, {in});
-    // A second control of the same Input follows every preview.
+    OrbComboBox *combo = ComboOf(f.Create(CLSID_InputControl_Combo, {in}));
     InputControl *other = f.Create(CLSID_InputControl_Combo, {in});
-    OrbComboBox *combo = ComboOf(c);
     combo->showPopup();
-    QVERIFY(combo->IsPopupVisible());
     for (int i = 0; i < keys.size(); ++i) {
         QTest::keyClick(combo->view(), Qt::Key(keys[i]));
         if (i < previews.size()) {
             QCOMPARE(f.NumberOf(in), previews[i]);
             QCOMPARE(ComboOf(other)->currentText(), QString("ABC").mid(int(previews[i]), 1));
-            // Still choosing: no step yet, nothing to undo.
-            QVERIFY(f.doc.UndoNames().isEmpty());
         }
     }
     QCoreApplication::processEvents();
     QVERIFY(!combo->IsPopupVisible());
-    QCOMPARE(f.NumberOf(in), final);
+    QCOMPARE(f.NumberOf(in), 0.0);
     QCOMPARE(f.doc.UndoDepth(), 0);
-    QCOMPARE(f.doc.UndoNames().size(), steps);
-    QCOMPARE(ComboOf(c)->currentText(), QString("ABC").mid(int(final), 1));
-    if (steps) {
-        QVERIFY(f.doc.Undo());
-        QCOMPARE(f.NumberOf(in), 0.0);
-        QCOMPARE(combo->currentText(), QString("A"));
-    }
+    QVERIFY(f.doc.UndoNames().isEmpty());
 }
 
 // A pick writes its item's integer (a zero one left out) and pointer.
