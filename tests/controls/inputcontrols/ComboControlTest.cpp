@@ -231,7 +231,8 @@ void ComboControlTest::livePreview_data()
 {
     QTest::addColumn<QList<int>>("keys");
     QTest::addColumn<QList<double>>("previews"); // the value after each key but the last
-    QTest::newRow("preview and come back") << QList<int>{Qt::Key_Down, Qt::Key_Up, Qt::Key_Return} << QList<double>{1, 0};
+    QTest::newRow("preview and come back")
+        << QList<int>{Qt::Key_Down, Qt::Key_Up, Qt::Key_Return} << QList<double>{1, 0};
     QTest::newRow("choosing the shown item") << QList<int>{Qt::Key_Return} << QList<double>{};
 }
 
