@@ -107,8 +107,6 @@ private slots:
     void livePreview_data();
     void livePreview();
     void writesCarryItemTags();
-    void disconnectWrite_data();
-    void disconnectWrite();
     void labelPosition_data();
     void labelPosition();
 };
@@ -161,18 +159,21 @@ void ComboControlTest::itemValues()
     }
 }
 
+// A value between items shows the nearest within reach; closing the control
+// writes the shown item's value back, or 0 where none is shown, in one step.
 void ComboControlTest::nearestItem_data()
 {
     QTest::addColumn<TagList>("attrs");
     QTest::addColumn<double>("value");
     QTest::addColumn<QString>("shown");
-    QTest::newRow("1.4 picks 1") << ABC() << 1.4 << "B";
-    QTest::newRow("1.6 picks 2") << ABC() << 1.6 << "C";
-    QTest::newRow("1.6 past the last") << TagList{{kAddString, "A"}, {kAddString, "B"}} << 1.6 << "";
+    QTest::addColumn<double>("closed");
+    QTest::newRow("1.4 picks 1") << ABC() << 1.4 << "B" << 1.0;
+    QTest::newRow("1.6 picks 2") << ABC() << 1.6 << "C" << 2.0;
+    QTest::newRow("1.6 past the last") << TagList{{kAddString, "A"}, {kAddString, "B"}} << 1.6 << "" << 0.0;
     QTest::newRow("equal distances: the first")
-        << TagList{{kAddString, "A"}, {kItemValue, 1.25}, {kAddString, "B"}, {kItemValue, 0.75}} << 1.0 << "A";
+        << TagList{{kAddString, "A"}, {kItemValue, 1.25}, {kAddString, "B"}, {kItemValue, 0.75}} << 1.0 << "A" << 1.25;
     QTest::newRow("nearest of two within reach")
-        << TagList{{kAddString, "A"}, {kItemValue, 1.4}, {kAddString, "B"}, {kItemValue, 1.0}} << 1.1 << "B";
+        << TagList{{kAddString, "A"}, {kItemValue, 1.4}, {kAddString, "B"}, {kItemValue, 1.0}} << 1.1 << "B" << 1.0;
 }
 
 void ComboControlTest::nearestItem()
@@ -180,13 +181,19 @@ void ComboControlTest::nearestItem()
     QFETCH(TagList, attrs);
     QFETCH(double, value);
     QFETCH(QString, shown);
+    QFETCH(double, closed);
     ToolFixture f;
     Input *in = f.AddNumber("Mode", kNoItem, attrs);
-    OrbComboBox *combo = ComboOf(f.Create(CLSID_InputControl_Combo, {in}));
-    QCOMPARE(combo->currentIndex(), -1);
+    InputControl *c = f.Create(CLSID_InputControl_Combo, {in});
+    QCOMPARE(ComboOf(c)->currentIndex(), -1);
     QVERIFY(in->SetValue(AutoNumber(value), f.doc.GetCurrentTime()));
-    QCOMPARE(combo->currentText(), shown);
+    QCOMPARE(ComboOf(c)->currentText(), shown);
     QCOMPARE(f.NumberOf(in), value);
+    const int steps = f.doc.UndoNames().size();
+    f.Destroy(c);
+    QCOMPARE(f.NumberOf(in), closed);
+    QCOMPARE(f.doc.UndoNames().size(), steps + 1);
+    QCOMPARE(f.doc.UndoDepth(), 0);
 }
 
 void ComboControlTest::identifiers_data()
@@ -280,27 +287,6 @@ void ComboControlTest::writesCarryItemTags()
         QVERIFY(!watcher.last.FindQuery(kWrittenInteger));
         QCOMPARE(watcher.last.GetPtr(kWrittenPointer, nullptr), address);
     }
-}
-
-void ComboControlTest::disconnectWrite_data()
-{
-    QTest::addColumn<double>("stored");
-    QTest::addColumn<double>("after");
-    QTest::newRow("the shown item's value") << 1.4 << 1.0;
-    QTest::newRow("no item: 0") << 5.0 << 0.0;
-}
-
-void ComboControlTest::disconnectWrite()
-{
-    QFETCH(double, stored);
-    QFETCH(double, after);
-    ToolFixture f;
-    Input *in = f.AddNumber("Mode", stored, ABC());
-    InputControl *c = f.Create(CLSID_InputControl_Combo, {in});
-    f.Destroy(c);
-    QCOMPARE(f.NumberOf(in), after);
-    QCOMPARE(f.doc.UndoNames().size(), 1);
-    QCOMPARE(f.doc.UndoDepth(), 0);
 }
 
 void ComboControlTest::labelPosition_data()
