@@ -8,18 +8,18 @@ orbane.ShowTool("Choices1")
 
 local function value(input) return orbane.GetValue("Choices1", input) end
 local function steps() return #orbane.UndoNames() end
+-- Opens the list with F4 and clicks a row.
+local function choose(box, row) orbane.Key(box, "F4") orbane.Click("popup", { row = row }) end
 
 -- Blend: Normal 0, separator, Add 1, Subtract 10, Multiply 3, separator, Screen 4.
 local blend = { tool = "Choices1", input = "Blend", child = "combo" }
 check.eq(orbane.State(blend).text, "Normal", "Blend starts on Normal")
 
 -- Open the list, click a row: the item's own value, one step per choice.
-orbane.Key(blend, "F4")
-orbane.Click("popup", { row = 4 })
+choose(blend, 4)
 check.eq(value("Blend"), 10, "Subtract gives its own value")
 check.eq(orbane.State(blend).text, "Subtract", "Subtract shown")
-orbane.Key(blend, "F4")
-orbane.Click("popup", { row = 7 })
+choose(blend, 7)
 check.eq(value("Blend"), 4, "Screen keeps its place among the items")
 check.eq(steps(), 2, "one step per choice")
 
@@ -54,8 +54,7 @@ check.fails(function() orbane.State("popup") end, "no popup", "the list is close
 -- Channel: an identifier, items sorted by name: Alpha, Blue, Green, Red.
 local channel = { tool = "Choices1", input = "Channel", child = "combo" }
 check.eq(orbane.State(channel).text, "Green", "Channel starts on green")
-orbane.Key(channel, "F4")
-orbane.Click("popup", { row = 1 })
+choose(channel, 1)
 check.eq(value("Channel"), "alpha", "Alpha's identifier")
 orbane.Key(channel, "End")
 check.eq(value("Channel"), "red", "End chooses Red")
@@ -68,8 +67,7 @@ orbane.Key(filter, "Down")
 check.eq(value("Filter"), "Gaussian", "after Box")
 orbane.Key(filter, "Down")
 check.eq(value("Filter"), "Lanczos 3", "3 before 10")
-orbane.Key(filter, "F4")
-orbane.Click("popup", { row = 4 })
+choose(filter, 4)
 check.eq(value("Filter"), "Lanczos 10", "last")
 
 -- Metadata: keys sorted: Camera (and its keys), Channels, Filename, FrameRate, Lens.

@@ -27,3 +27,4 @@ check.eq(ffi.cast("void *", ffi.C.ffi_CheckBoxControl_uncast(cast)) == ffi.cast(
 check.eq(ffi.C.ffi_CheckBoxControl_cast(button) == nil, true, "cast to another class")
 check.eq(ffi.C.ffi_PointControl_cast(box) == nil and ffi.C.ffi_PointControl_cast(point) ~= nil, true, "overlay cast")
 check.eq(ffi.C.ffi_CheckBoxControl_cast(nil) == nil, true, "cast of nil")
+check.eq(ffi.C.ffi_TransformControl_cast(orbane.Create("CameraControl", {})) ~= nil, true, "cast to the base class")

@@ -37,6 +37,9 @@ check.eq(orbane.State(first).check, 1, "undo re-notifies the first box")
 check.eq(orbane.State(second).check, 1, "undo re-notifies the second box")
 orbane.Redo()
 check.eq(orbane.GetValue(tool, "Channels"), -1, "redo")
+orbane.Undo()
+orbane.Click(second)
+check.eq(orbane.GetValue(tool, "Channels"), -1, "after an undo the second box clicks on from what it shows")
 
 -- A two-state box toggles, with Ctrl held too (modifiers do not change a toggle).
 orbane.Click({ tool = tool, input = "Invert", child = "checkbox" }, { mods = "ctrl" })

@@ -3,7 +3,6 @@
 #include "orbane/AutoParam.h"
 #include "orbane/ClassIDs.h"
 #include "orbane/CustomCheckBox.h"
-#include "orbane/ElideLabel.h"
 #include "orbane/Input.h"
 
 #include <QtTest>
@@ -21,11 +20,6 @@ constexpr Tag kAllowWrap = 0x10050001;
 CustomCheckBox *BoxOf(const InputControl *c)
 {
     return c->findChild<CustomCheckBox *>("checkbox");
-}
-
-ElideLabel *LabelOf(const InputControl *c)
-{
-    return c->findChild<ElideLabel *>("label");
 }
 
 InputControl *CheckBox(ToolFixture &f, Input *in, int32 width = ToolFixture::kWidth)
@@ -61,8 +55,6 @@ class CheckBoxControlTest : public QObject
     Q_OBJECT
 private slots:
     void initTestCase();
-    void textsShown_data();
-    void textsShown();
     void notifyGate_data();
     void notifyGate();
     void disconnectWrite_data();
@@ -70,35 +62,12 @@ private slots:
     void clicksWrite_data();
     void clicksWrite();
     void wrapping();
-    void undoRenotifiesEveryControl();
 };
 
 void CheckBoxControlTest::initTestCase()
 {
     std::string error;
     QVERIFY2(ToolFixture::LoadControls(&error), error.c_str());
-}
-
-// The label rule itself is the base's (LabelledInputControlTest): here, where
-// the check box puts the two texts.
-void CheckBoxControlTest::textsShown_data()
-{
-    QTest::addColumn<QString>("second");
-    QTest::newRow("no second text") << "";
-    QTest::newRow("second text") << "Channels";
-}
-
-void CheckBoxControlTest::textsShown()
-{
-    QFETCH(QString, second);
-    ToolFixture f;
-    const QByteArray text = second.toUtf8();
-    InputControl *c =
-        CheckBox(f, f.AddNumber("Red", 0.0, TagList{{0x30040000, "Red"}, {0x30040001, text.constData()}}));
-    QCOMPARE(BoxOf(c)->GetLabel(), QString("Red"));
-    QCOMPARE(LabelOf(c)->text(), second);
-    QCOMPARE(LabelOf(c)->isHidden(), second.isEmpty());
-    QCOMPARE(LabelOf(c)->focusProxy(), BoxOf(c));
 }
 
 void CheckBoxControlTest::notifyGate_data()
@@ -211,27 +180,8 @@ void CheckBoxControlTest::wrapping()
     QVERIFY(narrow > one->height());
     QVERIFY(f.Resize(many, 900) < narrow);
     QCOMPARE(fits->height(), one->height());
-}
-
-void CheckBoxControlTest::undoRenotifiesEveryControl()
-{
-    ToolFixture f;
-    Input *in = f.AddNumber("Invert", 0.0);
-    InputControl *first = CheckBox(f, in);
-    InputControl *second = CheckBox(f, in);
     // However many controls, the layout description is read once.
     QCOMPARE(ToolFixture::LayoutReadCount("Controls.CheckBox.Layout"), 1);
-    Click(first);
-    QCOMPARE(f.NumberOf(in), 1.0);
-    QCOMPARE(BoxOf(second)->GetCheck(), 1);
-    // The second control was told and wrote nothing.
-    QCOMPARE(f.doc.UndoNames(), QStringList{"Change Invert"});
-    QVERIFY(f.doc.Undo());
-    QCOMPARE(BoxOf(first)->GetCheck(), 0);
-    QCOMPARE(BoxOf(second)->GetCheck(), 0);
-    // Clicking the second after the undo toggles from what it shows.
-    Click(second);
-    QCOMPARE(f.NumberOf(in), 1.0);
 }
 
 QTEST_MAIN(CheckBoxControlTest)

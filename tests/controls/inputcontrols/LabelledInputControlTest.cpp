@@ -108,6 +108,8 @@ void LabelledInputControlTest::labelTexts()
     QVERIFY(c && LabelOf(c));
     const auto shown = [&](const QStringList &t) { return LabelShowsSecond(cls) ? t[1] : t[0]; };
     QCOMPARE(LabelOf(c)->text(), shown(Texts(c)));
+    // Where the label widget holds the second text it is hidden without one.
+    QCOMPARE(LabelOf(c)->isHidden(), LabelShowsSecond(cls) && Texts(c)[1].isEmpty());
     LabelOf(c)->setText("shown");
     QVERIFY(c->SetAttrsTagList(c->GetCurrentInput(), tags));
     c->UpdateDisplay(nullptr, nullptr);

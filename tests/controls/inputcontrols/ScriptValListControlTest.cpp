@@ -6,7 +6,6 @@
 #include "orbane/LuaRuntime.h"
 #include "orbane/Operator.h"
 
-#include <QClipboard>
 #include <QTreeWidget>
 #include <QtTest>
 
@@ -59,11 +58,6 @@ QStringList Rows(const InputControl *c)
     return Rows(TreeOf(c)->invisibleRootItem());
 }
 
-QPoint RowCentre(const QTreeWidget *tree, int row)
-{
-    return tree->visualItemRect(tree->topLevelItem(row)).center();
-}
-
 } // namespace
 
 class ScriptValListControlTest : public QObject
@@ -74,7 +68,6 @@ private slots:
     void contents_data();
     void contents();
     void followsTheInput();
-    void copyTwoRows();
 };
 
 void ScriptValListControlTest::initTestCase()
@@ -118,21 +111,6 @@ void ScriptValListControlTest::followsTheInput()
     QCOMPARE(Rows(c), (QStringList{"b = 2", "c = { 3 }"}));
     QVERIFY(f.doc.Undo());
     QCOMPARE(Rows(c), QStringList{"a = 1"});
-}
-
-void ScriptValListControlTest::copyTwoRows()
-{
-    ToolFixture f;
-    InputControl *c = List(f, "{ gamma = { 1, 2 }, alpha = 1, beta = 'two' }");
-    QTreeWidget *tree = TreeOf(c);
-    QApplication::clipboard()->setText("before");
-    QTest::mouseClick(tree->viewport(), Qt::LeftButton, Qt::NoModifier, RowCentre(tree, 0));
-    QTest::mouseClick(tree->viewport(), Qt::LeftButton, Qt::ControlModifier, RowCentre(tree, 2));
-    QCOMPARE(tree->selectionModel()->selectedRows().size(), 2);
-    QTest::keyClick(tree, Qt::Key_C, Qt::ControlModifier);
-    QCOMPARE(QApplication::clipboard()->text(), QString("alpha\t1\ngamma\t{ 1, 2 }\n"));
-    // Values are read-only: the Input is as it was.
-    QCOMPARE(f.doc.UndoNames().size(), 0);
 }
 
 QTEST_MAIN(ScriptValListControlTest)

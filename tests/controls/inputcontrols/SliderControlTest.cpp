@@ -114,12 +114,8 @@ class SliderControlTest : public QObject
     Q_OBJECT
 private slots:
     void initTestCase();
-    void drags_data();
-    void drags();
-    void keys_data();
-    void keys();
-    void rangeTags_data();
-    void rangeTags();
+    void gestures_data();
+    void gestures();
     void allowedRangeResets();
     void typedValues_data();
     void typedValues();
@@ -133,134 +129,100 @@ void SliderControlTest::initTestCase()
     QVERIFY2(ToolFixture::LoadControls(&error), error.c_str());
 }
 
-// Each drag presses on the knob and moves through `path`, offsets in pixels
-// from the press.
-void SliderControlTest::drags_data()
+// What the user does, one step a string: "drag DX DX... [ctrl|alt]" presses
+// on the knob, moves by DX pixels from the press and lets go; "key K [shift|
+// ctrl] [xN]" presses K held for N auto-repeats; "is V" checks the value
+// written so far. Every gesture that changes the value is one "Change Blend"
+// step, closed at its end.
+void SliderControlTest::gestures_data()
 {
     QTest::addColumn<TagList>("attrs");
     QTest::addColumn<double>("start");
-    QTest::addColumn<QList<int>>("path");
-    QTest::addColumn<int>("mods");
+    QTest::addColumn<QStringList>("steps");
     QTest::addColumn<double>("written");
-    QTest::addColumn<int>("steps");
-    const int none = Qt::NoModifier, ctrl = Qt::ControlModifier, alt = Qt::AltModifier;
-    using Path = QList<int>;
+    QTest::addColumn<int>("undoSteps");
+    using S = QStringList;
     // 0..1 over 200 pixels: 0.005 a pixel, shown to three places.
-    QTest::newRow("plain right") << Range(0, 1) << 0.5 << Path{10, 20} << none << 0.6 << 1;
+    QTest::newRow("plain right") << Range(0, 1) << 0.5 << S{"drag 10 20"} << 0.6 << 1;
     // Back within half a pixel: exactly the press value, and no undo step.
-    QTest::newRow("back to the press value") << Range(0, 1) << 0.123456 << Path{10, 0} << none << 0.123456 << 0;
-    QTest::newRow("Alt-click resets") << Range(0, 1, {{kDefault, 0.2523}}) << 0.5 << Path{0} << alt << 0.2523 << 1;
-    QTest::newRow("Alt-click without a default tag: 0") << Range(-1, 1) << 0.5 << Path{0} << alt << 0.0 << 1;
-    QTest::newRow("places 2: 0.127 writes 0.13")
-        << Range(0, 0.2, {{kPlaces, 2}}) << 0.1 << Path{27} << none << 0.13 << 1;
-    QTest::newRow("places -1: 0.123 as it is")
-        << Range(0, 0.2, {{kPlaces, -1}}) << 0.1 << Path{23} << none << 0.123 << 1;
+    QTest::newRow("back to the press value") << Range(0, 1) << 0.123456 << S{"drag 10 0"} << 0.123456 << 0;
+    QTest::newRow("Alt-click resets") << Range(0, 1, {{kDefault, 0.2523}}) << 0.5 << S{"drag 0 alt"} << 0.2523 << 1;
+    QTest::newRow("Alt-click without a default tag: 0") << Range(-1, 1) << 0.5 << S{"drag 0 alt"} << 0.0 << 1;
+    QTest::newRow("places 2: 0.127 writes 0.13") << Range(0, 0.2, {{kPlaces, 2}}) << 0.1 << S{"drag 27"} << 0.13 << 1;
+    QTest::newRow("places -1: 0.123 as it is") << Range(0, 0.2, {{kPlaces, -1}}) << 0.1 << S{"drag 23"} << 0.123 << 1;
     QTest::newRow("places 2: less than a step writes nothing")
-        << Range(0, 1, {{kPlaces, 2}}) << 0.5 << Path{3} << ctrl << 0.5 << 0;
+        << Range(0, 1, {{kPlaces, 2}}) << 0.5 << S{"drag 3 ctrl"} << 0.5 << 0;
     // Integer snapping adds a half, then truncates toward zero; it needs both tags.
     QTest::newRow("integer snap: -2.7 stored as -2")
-        << Range(-10, 10, {{kInteger, 1}, {kSnap, 1}}) << 0.0 << Path{-27} << none << -2.0 << 1;
-    QTest::newRow("snap without integer") << Range(-10, 10, {{kSnap, 1}}) << 0.0 << Path{-27} << none << -2.7 << 1;
+        << Range(-10, 10, {{kInteger, 1}, {kSnap, 1}}) << 0.0 << S{"drag -27"} << -2.0 << 1;
+    QTest::newRow("snap without integer") << Range(-10, 10, {{kSnap, 1}}) << 0.0 << S{"drag -27"} << -2.7 << 1;
     // The track fraction is the value squared: half way along it is sqrt(0.5).
     QTest::newRow("expression mapping") << Range(0, 1, {{kForwardExpr, "value^2"}, {kInverseExpr, "sqrt(value)"}})
-                                        << 0.0 << Path{100} << none << 0.707 << 1;
+                                        << 0.0 << S{"drag 100"} << 0.707 << 1;
+    // 100 steps (normal 0.01, fine 0.001) and 11 ticks (coarse 0.1).
+    const TagList steps = Range(0, 1, {{kStepCount, 100}, {kTickFreq, 11}});
+    QTest::newRow("Home, and Home again writes nothing") << steps << 0.5 << S{"key Home", "key Home"} << 0.0 << 1;
+    QTest::newRow("End") << steps << 0.5 << S{"key End"} << 1.0 << 1;
+    QTest::newRow("Shift+Page Up coarse") << steps << 0.5 << S{"key PageUp shift"} << 0.6 << 1;
+    QTest::newRow("Ctrl+Page Down fine") << steps << 0.5 << S{"key PageDown ctrl"} << 0.499 << 1;
+    QTest::newRow("Right held, 4 repeats") << steps << 0.5 << S{"key Right x4"} << 0.55 << 1;
+    QTest::newRow("Shift+Left held, 2 repeats") << steps << 0.5 << S{"key Left shift x2"} << 0.2 << 1;
+    QTest::newRow("Ctrl+Page Up held, 9 repeats, then Home")
+        << steps << 0.5 << S{"key PageUp ctrl x9", "is 0.51", "key Home"} << 0.0 << 2;
+    // Home and End go to the track's ends: the scale tags within the allowed range.
+    QTest::newRow("no tags: track 0..1") << TagList{} << 0.5 << S{"key Home", "is 0", "key End"} << 1.0 << 2;
+    QTest::newRow("scale tags narrow the track") << Range(-10, 10, {{kMinScale, -1.0}, {kMaxScale, 1.0}}) << 0.5
+                                                 << S{"key Home", "is -1", "key End"} << 1.0 << 2;
+    QTest::newRow("the allowed range clips the track")
+        << Range(0, 1, {{kMinScale, -5.0}, {kMaxScale, 5.0}}) << 0.5 << S{"key Home", "is 0", "key End"} << 1.0 << 2;
+    QTest::newRow("reversed pairs are ordered") << Range(3, -3) << 0.5 << S{"key Home", "is -3", "key End"} << 3.0 << 2;
 }
 
-void SliderControlTest::drags()
+void SliderControlTest::gestures()
 {
     QFETCH(TagList, attrs);
     QFETCH(double, start);
-    QFETCH(QList<int>, path);
-    QFETCH(int, mods);
+    QFETCH(QStringList, steps);
     QFETCH(double, written);
-    QFETCH(int, steps);
+    QFETCH(int, undoSteps);
     ToolFixture f;
     Input *in = f.AddNumber("Blend", start, attrs);
     InputControl *c = Slider(f, in);
     QWidget *slider = SliderOf(c);
-    const double lo = attrs.GetDouble(kMinAllowed), hi = attrs.GetDouble(kMaxAllowed);
-    const int x = KnobX(slider, (start - lo) / (hi - lo));
-    const Qt::KeyboardModifiers m(mods);
-    QTest::mousePress(slider, Qt::LeftButton, m, QPoint(x, kKnobY));
-    for (int dx : path)
-        SendMove(slider, QPoint(x + dx, kKnobY), m);
-    QTest::mouseRelease(slider, Qt::LeftButton, m, QPoint(x + path.last(), kKnobY));
+    slider->setFocus();
+    const QHash<QString, int> keys{{"Home", Qt::Key_Home},         {"End", Qt::Key_End},   {"PageUp", Qt::Key_PageUp},
+                                   {"PageDown", Qt::Key_PageDown}, {"Left", Qt::Key_Left}, {"Right", Qt::Key_Right}};
+    for (const QString &step : steps) {
+        QStringList words = step.split(' ');
+        const QString verb = words.takeFirst();
+        if (verb == "is") {
+            QCOMPARE(f.NumberOf(in), words[0].toDouble());
+            continue;
+        }
+        int repeats = 0;
+        if (words.last().startsWith('x'))
+            repeats = words.takeLast().mid(1).toInt();
+        const QString mod = words.last();
+        const Qt::KeyboardModifiers m(mod == "ctrl"    ? Qt::ControlModifier
+                                      : mod == "alt"   ? Qt::AltModifier
+                                      : mod == "shift" ? Qt::ShiftModifier
+                                                       : Qt::NoModifier);
+        if (verb == "key") {
+            HoldKey(slider, keys.value(words[0]), m, repeats);
+            continue;
+        }
+        if (m != Qt::NoModifier)
+            words.removeLast();
+        const double lo = attrs.GetDouble(kMinAllowed), hi = attrs.GetDouble(kMaxAllowed);
+        const int x = KnobX(slider, (start - lo) / (hi - lo));
+        QTest::mousePress(slider, Qt::LeftButton, m, QPoint(x, kKnobY));
+        for (const QString &dx : words)
+            SendMove(slider, QPoint(x + dx.toInt(), kKnobY), m);
+        QTest::mouseRelease(slider, Qt::LeftButton, m, QPoint(x + words.last().toInt(), kKnobY));
+    }
     QVERIFY2(f.NumberOf(in) == written, qPrintable(QString::number(f.NumberOf(in), 'g', 17)));
-    QCOMPARE(f.doc.UndoNames().size(), steps);
-    if (steps)
-        QCOMPARE(f.doc.UndoNames().last(), QString("Change Blend"));
+    QCOMPARE(f.doc.UndoNames(), QStringList(QVector<QString>(undoSteps, "Change Blend").toList()));
     QVERIFY(!c->IsUndoOpen());
-}
-
-void SliderControlTest::keys_data()
-{
-    QTest::addColumn<int>("key");
-    QTest::addColumn<int>("mods");
-    QTest::addColumn<int>("repeats");
-    QTest::addColumn<double>("written");
-    const int none = Qt::NoModifier, ctrl = Qt::ControlModifier, shift = Qt::ShiftModifier;
-    // From 0.5 on 0..1 with 100 steps (normal 0.01, fine 0.001) and 11 ticks (coarse 0.1).
-    QTest::newRow("Home") << int(Qt::Key_Home) << none << 0 << 0.0;
-    QTest::newRow("End") << int(Qt::Key_End) << none << 0 << 1.0;
-    QTest::newRow("Shift+Page Up coarse") << int(Qt::Key_PageUp) << shift << 0 << 0.6;
-    QTest::newRow("Ctrl+Page Down fine") << int(Qt::Key_PageDown) << ctrl << 0 << 0.499;
-    QTest::newRow("Right held, 4 repeats") << int(Qt::Key_Right) << none << 4 << 0.55;
-    QTest::newRow("Shift+Left held, 2 repeats") << int(Qt::Key_Left) << shift << 2 << 0.2;
-    QTest::newRow("Ctrl+Page Up held, 9 repeats") << int(Qt::Key_PageUp) << ctrl << 9 << 0.51;
-}
-
-void SliderControlTest::keys()
-{
-    QFETCH(int, key);
-    QFETCH(int, mods);
-    QFETCH(int, repeats);
-    QFETCH(double, written);
-    ToolFixture f;
-    Input *in = f.AddNumber("Blend", 0.5, Range(0, 1, {{kStepCount, 100}, {kTickFreq, 11}}));
-    InputControl *c = Slider(f, in);
-    QWidget *slider = SliderOf(c);
-    slider->setFocus();
-    HoldKey(slider, key, Qt::KeyboardModifiers(mods), repeats);
-    QCOMPARE(f.NumberOf(in), written);
-    QCOMPARE(f.doc.UndoNames(), QStringList{"Change Blend"});
-    QVERIFY(!c->IsUndoOpen());
-    HoldKey(slider, Qt::Key_Home, Qt::NoModifier, 0);
-    QCOMPARE(f.doc.UndoNames().size(), written == 0.0 ? 1 : 2);
-}
-
-void SliderControlTest::rangeTags_data()
-{
-    QTest::addColumn<TagList>("attrs");
-    QTest::addColumn<double>("minAllowed");
-    QTest::addColumn<double>("maxAllowed");
-    QTest::addColumn<double>("home");
-    QTest::addColumn<double>("end");
-    QTest::newRow("no tags: allowed +-1e6, track 0..1") << TagList{} << -1e6 << 1e6 << 0.0 << 1.0;
-    QTest::newRow("scale tags narrow the track")
-        << Range(-10, 10, {{kMinScale, -1.0}, {kMaxScale, 1.0}}) << -10.0 << 10.0 << -1.0 << 1.0;
-    QTest::newRow("the allowed range clips the track")
-        << Range(0, 1, {{kMinScale, -5.0}, {kMaxScale, 5.0}}) << 0.0 << 1.0 << 0.0 << 1.0;
-    QTest::newRow("reversed pairs are ordered") << Range(3, -3) << -3.0 << 3.0 << -3.0 << 3.0;
-}
-
-void SliderControlTest::rangeTags()
-{
-    QFETCH(TagList, attrs);
-    QFETCH(double, minAllowed);
-    QFETCH(double, maxAllowed);
-    QFETCH(double, home);
-    QFETCH(double, end);
-    ToolFixture f;
-    Input *in = f.AddNumber("Blend", 0.5, attrs);
-    InputControl *c = Slider(f, in);
-    QCOMPARE(std::min(CopyDouble(c, kMinAllowed), CopyDouble(c, kMaxAllowed)), minAllowed);
-    QCOMPARE(std::max(CopyDouble(c, kMinAllowed), CopyDouble(c, kMaxAllowed)), maxAllowed);
-    QWidget *slider = SliderOf(c);
-    slider->setFocus();
-    HoldKey(slider, Qt::Key_Home, Qt::NoModifier, 0);
-    QCOMPARE(f.NumberOf(in), home);
-    HoldKey(slider, Qt::Key_End, Qt::NoModifier, 0);
-    QCOMPARE(f.NumberOf(in), end);
 }
 
 // A call without the allowed range resets it and the default; places and

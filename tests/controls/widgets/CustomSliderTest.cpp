@@ -162,8 +162,7 @@ private slots:
     void keySteps();
     void dragDrivesDocument();
     void editDrag();
-    void knobAndMarkerDrawn();
-    void knobStates();
+    void knobPixels();
     void gradientPaintsTrack();
     void repaintsOnlyWhatChanged();
 };
@@ -342,9 +341,10 @@ void CustomSliderTest::editDrag()
     QCOMPARE(w.owner.resetUndos, 1);
 }
 
-// The knob is drawn at the value; the marker at the default while the value
-// is elsewhere.
-void CustomSliderTest::knobAndMarkerDrawn()
+// The knob is drawn at the value, the marker at the default while the value
+// is elsewhere. Pressed, the knob shows its held image; let go over it, it
+// is lit; away from it, plain again; disabled, faded and deaf to mouse and keys.
+void CustomSliderTest::knobPixels()
 {
     Shown w;
     w.s->SetDefault(0.3, true);
@@ -357,28 +357,19 @@ void CustomSliderTest::knobAndMarkerDrawn()
     QVERIFY(Close(w.OnTrack(65), kKnob));
     QVERIFY(!Close(w.OnTrack(165), kKnob));
     QVERIFY(Close(w.Pixel(65, markerY), w.owner.background));
-}
-
-// Pressed, the knob shows its held image; let go over it, it is lit; away
-// from it, plain again; disabled, faded and deaf to mouse and keys.
-void CustomSliderTest::knobStates()
-{
-    Shown w;
-    w.s->SetValue(0.5, true);
-    const QPoint knob(105, w.KnobY());
+    const QPoint knob = w.At(65);
     QEvent enter(QEvent::Enter), leave(QEvent::Leave); // hover needs the tracking that entering turns on
     QApplication::sendEvent(w.s, &enter);
     QTest::mousePress(w.s, Qt::LeftButton, Qt::NoModifier, knob);
-    QVERIFY(Close(w.OnTrack(105), kHeld));
+    QVERIFY(Close(w.OnTrack(65), kHeld));
     QTest::mouseRelease(w.s, Qt::LeftButton, Qt::NoModifier, knob);
-    QVERIFY(w.OnTrack(105).lightness() > kKnob.lightness() + 10);
+    QVERIFY(w.OnTrack(65).lightness() > kKnob.lightness() + 10);
     QApplication::sendEvent(w.s, &leave);
-    QVERIFY(Close(w.OnTrack(105), kKnob));
+    QVERIFY(Close(w.OnTrack(65), kKnob));
     w.s->SetDisabled(true);
-    QVERIFY(w.OnTrack(105).lightness() < kKnob.lightness() - 10);
-    Run(w, "press 105");
-    Run(w, "move 150");
-    Run(w, "release 150");
+    QVERIFY(w.OnTrack(65).lightness() < kKnob.lightness() - 10);
+    for (const char *step : {"press 65", "move 150", "release 150"})
+        Run(w, step);
     w.Key(Qt::Key_Right);
     QCOMPARE(w.pressed.count(), 1);
     QCOMPARE(w.valueChanged.count(), 0);

@@ -22,8 +22,10 @@ SliderMapping Make(const QByteArray &mode, double min, double max)
         {"steepest expressions", {"value^1000", "value^0.001"}},
     };
     SliderMapping m;
-    const bool twoSegment = mode == "two segments";
-    m.SetBounds({min, max, min, max, twoSegment ? 1.0 : 0.0, mode == "power 2" ? 2.0 : 1.0});
+    const bool twoSegment = mode.startsWith("two segments");
+    // "two segments at 0.5" and "two segments at 2.4" put the centre there.
+    const double centre = mode.contains(" at ") ? mode.split(' ').last().toDouble() : twoSegment ? 1.0 : 0.0;
+    m.SetBounds({min, max, min, max, centre, mode == "power 2" ? 2.0 : 1.0});
     m.SetTwoSegment(twoSegment);
     m.SetTrack(kLeft, kRight);
     if (mode == "steep callbacks")
@@ -34,69 +36,23 @@ SliderMapping Make(const QByteArray &mode, double min, double max)
     return m;
 }
 
-void AddMappingColumns()
+// One row of the table: a call on a mapping made by Make, its arguments and
+// the results expected.
+void Row(const char *name, const char *mode, double min, double max, const char *call, QList<double> args,
+         QList<double> expected)
 {
-    QTest::addColumn<QByteArray>("mode");
-    QTest::addColumn<double>("min");
-    QTest::addColumn<double>("max");
+    QTest::newRow(name) << QByteArray(mode) << min << max << QByteArray(call) << args << expected;
 }
 
-} // namespace
-
-class SliderMappingTest : public QObject
+bool Same(double a, double b)
 {
-    Q_OBJECT
-private slots:
-    void roundTrip_data();
-    void roundTrip();
-    void fineScaling_data();
-    void fineScaling();
-    void resolution_data();
-    void resolution();
-    void badExpressionIsDropped();
-    void copyCompilesItsOwnExpressions();
-    void dragValue_data();
-    void dragValue();
-    void trackStep_data();
-    void trackStep();
-    void snapToStep_data();
-    void snapToStep();
-    void roundings_data();
-    void roundings();
-    void halfUpHitsTheDecimal();
-};
-
-// The value at one pixel, the range's ends at the track's ends, and pixel to
-// value and back along the whole track.
-void SliderMappingTest::roundTrip_data()
-{
-    AddMappingColumns();
-    QTest::addColumn<double>("value");
-    QTest::addColumn<double>("pixel");
-    QTest::newRow("linear") << QByteArray("linear") << 0.0 << 1.0 << 0.5 << 105.0;
-    QTest::newRow("below clamps") << QByteArray("linear") << 0.0 << 1.0 << -3.0 << 5.0;
-    QTest::newRow("above clamps") << QByteArray("linear") << 0.0 << 1.0 << 9.0 << 205.0;
-    QTest::newRow("negative range") << QByteArray("linear") << -10.0 << -5.0 << -6.0 << 165.0;
-    QTest::newRow("power 2") << QByteArray("power 2") << 0.0 << 1.0 << 0.25 << 105.0;
-    QTest::newRow("power 2 about zero") << QByteArray("power 2") << -1.0 << 1.0 << -0.25 << 55.0;
-    QTest::newRow("callbacks") << QByteArray("steep callbacks") << 0.0 << 1.0 << 0.5 << 5.1953125;
-    QTest::newRow("expressions") << QByteArray("square expressions") << 0.0 << 2.0 << 1.0 << 55.0;
-    QTest::newRow("expressions with variables")
-        << QByteArray("expressions with variables") << 2.0 << 6.0 << 3.0 << 55.0;
-    QTest::newRow("two segments below") << QByteArray("two segments") << 0.0 << 10.0 << 0.5 << 55.0;
-    QTest::newRow("two segments centre") << QByteArray("two segments") << 0.0 << 10.0 << 1.0 << 105.0;
-    QTest::newRow("two segments above") << QByteArray("two segments") << 0.0 << 10.0 << 5.5 << 155.0;
+    return a == b || qFuzzyCompare(a, b);
 }
 
-void SliderMappingTest::roundTrip()
+// Value to pixel and back along the whole track, with the range's ends at the
+// track's ends.
+void CheckRoundTrip(const SliderMapping &m, double min, double max)
 {
-    QFETCH(QByteArray, mode);
-    QFETCH(double, min);
-    QFETCH(double, max);
-    QFETCH(double, value);
-    QFETCH(double, pixel);
-    const SliderMapping m = Make(mode, min, max);
-    QVERIFY(qAbs(m.ValueToPixel(value) - pixel) < 1e-9);
     QCOMPARE(m.ValueToPixel(min), kLeft);
     QCOMPARE(m.ValueToPixel(max), kRight);
     QVERIFY(qAbs(m.PixelToValue(kLeft) - min) < 1e-9);
@@ -114,65 +70,146 @@ void SliderMappingTest::roundTrip()
     }
 }
 
-// A scaling of 0.1 stretches the track tenfold about the anchor.
-void SliderMappingTest::fineScaling_data()
-{
-    QTest::addColumn<bool>("twoSegment");
-    QTest::addColumn<double>("anchor");
-    QTest::addColumn<double>("value");
-    QTest::addColumn<double>("pixel");
-    QTest::newRow("linear about 0") << false << 0.0 << 0.01 << 25.0;
-    QTest::newRow("linear about 0.5") << false << 0.5 << 0.49 << 85.0;
-    QTest::newRow("two segments") << true << 0.0 << 0.01 << 25.0;
-}
+} // namespace
 
-void SliderMappingTest::fineScaling()
+class SliderMappingTest : public QObject
 {
-    QFETCH(bool, twoSegment);
-    QFETCH(double, anchor);
-    QFETCH(double, value);
-    QFETCH(double, pixel);
-    SliderMapping m = Make("linear", 0.0, 1.0);
-    m.SetBounds({0.0, 1.0, 0.0, 1.0, 0.5, 1.0});
-    m.SetTwoSegment(twoSegment);
-    m.SetAnchor(anchor);
-    QVERIFY(qAbs(m.ValueToPixel(value, 0.1) - pixel) < 1e-9);
-    QVERIFY(qAbs(m.PixelToValue(pixel, 0.1) - value) < 1e-12);
-}
+    Q_OBJECT
+private slots:
+    void calls_data();
+    void calls();
+    void badExpressionIsDropped();
+    void copyCompilesItsOwnExpressions();
+    void halfUpHitsTheDecimal();
+};
 
-void SliderMappingTest::resolution_data()
+// pixel (value): the value's pixel, and the round trip of the whole track.
+// fine (anchor, value): the pixel at a scaling of 0.1, which stretches the
+// track tenfold about the anchor, and back.
+// resolution (value): the decimal steps a pixel needs there.
+// drag (x, k, default or -1): the value stored for a drag from 0.123456.
+// step (value, direction, level): a step on a bent track, a fraction of the
+// track rounded as a drag is; on a square track it differs either side.
+// snap (stepDown, stepUp, value): the value snapped to the side's step.
+// round (step, value): AddHalfTruncate, the widget's snap, and RoundHalfUp,
+// the control's rounding; they agree at halves and part below zero. Exact.
+void SliderMappingTest::calls_data()
 {
-    AddMappingColumns();
-    QTest::addColumn<double>("value");
-    QTest::addColumn<double>("resolution");
+    QTest::addColumn<QByteArray>("mode");
+    QTest::addColumn<double>("min");
+    QTest::addColumn<double>("max");
+    QTest::addColumn<QByteArray>("call");
+    QTest::addColumn<QList<double>>("args");
+    QTest::addColumn<QList<double>>("expected");
+    const double none = -1.0, pressX = kLeft + 200 * 0.123456;
+    // clang-format off
+    Row("linear", "linear", 0, 1, "pixel", {0.5}, {105});
+    Row("below clamps", "linear", 0, 1, "pixel", {-3}, {5});
+    Row("above clamps", "linear", 0, 1, "pixel", {9}, {205});
+    Row("negative range", "linear", -10, -5, "pixel", {-6}, {165});
+    Row("power 2", "power 2", 0, 1, "pixel", {0.25}, {105});
+    Row("power 2 about zero", "power 2", -1, 1, "pixel", {-0.25}, {55});
+    Row("callbacks", "steep callbacks", 0, 1, "pixel", {0.5}, {5.1953125});
+    Row("expressions", "square expressions", 0, 2, "pixel", {1}, {55});
+    Row("expressions with variables", "expressions with variables", 2, 6, "pixel", {3}, {55});
+    Row("two segments below", "two segments", 0, 10, "pixel", {0.5}, {55});
+    Row("two segments centre", "two segments", 0, 10, "pixel", {1}, {105});
+    Row("two segments above", "two segments", 0, 10, "pixel", {5.5}, {155});
+    Row("fine, linear about 0", "linear", 0, 1, "fine", {0, 0.01}, {25});
+    Row("fine, linear about 0.5", "linear", 0, 1, "fine", {0.5, 0.49}, {85});
+    Row("fine, two segments", "two segments at 0.5", 0, 1, "fine", {0, 0.01}, {25});
     // 200 pixels need three digits across the range.
-    QTest::newRow("unit range") << QByteArray("linear") << 0.0 << 1.0 << 0.3 << 1000.0;
-    QTest::newRow("hundred") << QByteArray("linear") << 0.0 << 100.0 << 30.0 << 10.0;
-    QTest::newRow("flat range") << QByteArray("linear") << 2.0 << 2.0 << 2.0 << 1.0;
-    QTest::newRow("power, steep end") << QByteArray("power 2") << 0.0 << 1.0 << 0.0001 << 1e5;
-    QTest::newRow("power, flat end") << QByteArray("power 2") << 0.0 << 1.0 << 1.0 << 1000.0;
+    Row("resolution, unit range", "linear", 0, 1, "resolution", {0.3}, {1000});
+    Row("resolution, hundred", "linear", 0, 100, "resolution", {30}, {10});
+    Row("resolution, flat range", "linear", 2, 2, "resolution", {2}, {1});
+    Row("resolution, power, steep end", "power 2", 0, 1, "resolution", {0.0001}, {1e5});
+    Row("resolution, power, flat end", "power 2", 0, 1, "resolution", {1}, {1000});
     // A steep mapping needs more digits where a pixel covers less of the
     // range, never more than two beyond the linear case.
-    QTest::newRow("callbacks, steep end") << QByteArray("steep callbacks") << 0.0 << 1.0 << 1.0 << 1e4;
-    QTest::newRow("expressions, flat end") << QByteArray("steep expressions") << 0.0 << 1.0 << 0.5 << 1000.0;
-    QTest::newRow("expressions, steep end") << QByteArray("steep expressions") << 0.0 << 1.0 << 1.0 << 1e4;
-    QTest::newRow("expressions, capped") << QByteArray("steepest expressions") << 0.0 << 1.0 << 1.0 << 1e5;
-    QTest::newRow("two segments below") << QByteArray("two segments") << 0.0 << 10.0 << 0.5 << 100.0;
-    QTest::newRow("two segments above") << QByteArray("two segments") << 0.0 << 10.0 << 5.0 << 100.0;
-    QTest::newRow("two segments at centre") << QByteArray("two segments") << 0.0 << 10.0 << 1.0 << 1.0;
+    Row("resolution, callbacks, steep end", "steep callbacks", 0, 1, "resolution", {1}, {1e4});
+    Row("resolution, expressions, flat end", "steep expressions", 0, 1, "resolution", {0.5}, {1000});
+    Row("resolution, expressions, steep end", "steep expressions", 0, 1, "resolution", {1}, {1e4});
+    Row("resolution, expressions, capped", "steepest expressions", 0, 1, "resolution", {1}, {1e5});
+    Row("resolution, two segments below", "two segments", 0, 10, "resolution", {0.5}, {100});
+    Row("resolution, two segments above", "two segments", 0, 10, "resolution", {5}, {100});
+    Row("resolution, two segments at centre", "two segments", 0, 10, "resolution", {1}, {1});
+    // 0..1 over 200 pixels is 0.005 a pixel.
+    Row("drag rounded to three places", "linear", 0, 1, "drag", {125.4, 1, none}, {0.602});
+    Row("drag back to the press value", "linear", 0, 1, "drag", {pressX + 0.4, 1, none}, {0.123456});
+    Row("drag, the press value before the default", "linear", 0, 1, "drag", {pressX + 0.4, 1, 0.1236}, {0.123456});
+    // The default lies 0.46 pixels from 0.25.
+    Row("drag onto the default", "linear", 0, 1, "drag", {55, 1, 0.2523}, {0.2523});
+    Row("drag past the default", "linear", 0, 1, "drag", {54.8, 1, 0.2523}, {0.249});
+    Row("fine drag keeps one more place", "linear", 0, 1, "drag", {108, 0.1, none}, {0.5015});
+    Row("drag beyond the end", "linear", 0, 1, "drag", {400, 1, none}, {1});
+    // Near the steep end of a power track a pixel is 0.0001 wide.
+    Row("power drag keeps the places a pixel needs", "power 2", 0, 1, "drag", {7.3, 1, none}, {0.00013});
+    Row("step, normal, a hundredth of the track", "square expressions", 0, 1, "step", {0.5, 1, 1}, {0.01});
+    Row("step, fine, one more place", "square expressions", 0, 1, "step", {0.5, 1, 0}, {0.001});
+    Row("step, coarse up", "square expressions", 0, 1, "step", {0.5, 1, 2}, {0.092});
+    Row("step, coarse down", "square expressions", 0, 1, "step", {0.5, -1, 2}, {0.113});
+    Row("step stops at the end", "square expressions", 0, 1, "step", {0.99, 1, 2}, {0.01});
+    Row("snap truncates toward zero", "linear", -10, 10, "snap", {1, 9, -2.7}, {-2});
+    Row("snap, step of five", "linear", -10, 10, "snap", {5, 9, 8}, {10});
+    Row("snap, negative step of five", "linear", -10, 10, "snap", {5, 9, -7}, {0});
+    Row("snap below the centre", "two segments at 2.4", -10, 10, "snap", {1, 9, 1.2}, {1});
+    Row("snap above the centre, the up step", "two segments at 2.4", -10, 10, "snap", {1, 3, 5}, {6});
+    Row("snap crossing the centre", "two segments at 2.4", -10, 10, "snap", {4, 9, 2.3}, {2});
+    Row("snap at the centre", "two segments at 2.4", -10, 10, "snap", {4, 9, 2.4}, {2});
+    Row("round -2.5", "linear", 0, 1, "round", {1, -2.5}, {-2, -2});
+    Row("round -0.5", "linear", 0, 1, "round", {1, -0.5}, {0, 0});
+    Row("round 0.5", "linear", 0, 1, "round", {1, 0.5}, {1, 1});
+    Row("round -2.7", "linear", 0, 1, "round", {1, -2.7}, {-2, -3});
+    Row("round -2.2", "linear", 0, 1, "round", {1, -2.2}, {-1, -2});
+    Row("round 2.2", "linear", 0, 1, "round", {1, 2.2}, {2, 2});
+    Row("round quarter -0.625", "linear", 0, 1, "round", {0.25, -0.625}, {-0.5, -0.5});
+    Row("round quarter -0.125", "linear", 0, 1, "round", {0.25, -0.125}, {0, 0});
+    Row("round quarter 0.125", "linear", 0, 1, "round", {0.25, 0.125}, {0.25, 0.25});
+    Row("round quarter -0.6", "linear", 0, 1, "round", {0.25, -0.6}, {-0.25, -0.5});
+    Row("round, no step", "linear", 0, 1, "round", {0, -2.7}, {-2.7, -2.7});
+    // clang-format on
 }
 
-void SliderMappingTest::resolution()
+void SliderMappingTest::calls()
 {
     QFETCH(QByteArray, mode);
     QFETCH(double, min);
     QFETCH(double, max);
-    QFETCH(double, value);
-    QFETCH(double, resolution);
+    QFETCH(QByteArray, call);
+    QFETCH(QList<double>, args);
+    QFETCH(QList<double>, expected);
     const SliderMapping m = Make(mode, min, max);
-    QCOMPARE(m.Resolution(value), resolution);
-    if (min == max)
-        QCOMPARE(m.ValueToPixel(min + 7.0), kLeft);
+    QList<double> got;
+    if (call == "pixel") {
+        QVERIFY(qAbs(m.ValueToPixel(args[0]) - expected[0]) < 1e-9);
+        return CheckRoundTrip(m, min, max);
+    }
+    if (call == "fine") {
+        SliderMapping fine = m;
+        fine.SetAnchor(args[0]);
+        QVERIFY(qAbs(fine.ValueToPixel(args[1], 0.1) - expected[0]) < 1e-9);
+        QVERIFY(qAbs(fine.PixelToValue(expected[0], 0.1) - args[1]) < 1e-12);
+        return;
+    }
+    if (call == "resolution") {
+        got << m.Resolution(args[0]);
+        if (min == max)
+            QCOMPARE(m.ValueToPixel(min + 7.0), kLeft);
+    } else if (call == "drag") {
+        SliderMapping drag = m;
+        drag.SetAnchor(0.5);
+        got << drag.DragValue(args[0], args[1], 0.123456, args[2] >= 0 ? std::optional<double>(args[2]) : std::nullopt);
+    } else if (call == "step") {
+        QVERIFY(m.HasMapping());
+        got << m.TrackStep(args[0], int(args[1]), int(args[2]));
+    } else if (call == "snap") {
+        got << m.SnapToStep(args[2], args[0], args[1]);
+    } else {
+        got << SliderMapping::AddHalfTruncate(args[1], args[0]) << SliderMapping::RoundHalfUp(args[1], args[0]);
+    }
+    for (int i = 0; i < got.size(); ++i)
+        QVERIFY2(call == "round" ? got[i] == expected[i] : Same(got[i], expected[i]),
+                 qPrintable(QString::number(got[i], 'g', 17)));
 }
 
 void SliderMappingTest::badExpressionIsDropped()
@@ -200,132 +237,6 @@ void SliderMappingTest::copyCompilesItsOwnExpressions()
     other.SetBounds({0.0, 100.0, 0.0, 100.0, 0.0, 1.0});
     QCOMPARE(other.ValueToPixel(3.0), 11.0);
     QCOMPARE(copy.ValueToPixel(3.0), 55.0);
-}
-
-// From 0..1 over 200 pixels, 0.005 a pixel; the value the press started from
-// is 0.123456.
-void SliderMappingTest::dragValue_data()
-{
-    QTest::addColumn<QByteArray>("mode");
-    QTest::addColumn<double>("x");
-    QTest::addColumn<double>("k");
-    QTest::addColumn<double>("def");
-    QTest::addColumn<double>("stored");
-    const double none = -1.0;
-    const double pressX = kLeft + 200 * 0.123456;
-    QTest::newRow("rounded to three places") << QByteArray("linear") << 125.4 << 1.0 << none << 0.602;
-    QTest::newRow("back to the press value") << QByteArray("linear") << pressX + 0.4 << 1.0 << none << 0.123456;
-    QTest::newRow("the press value before the default")
-        << QByteArray("linear") << pressX + 0.4 << 1.0 << 0.1236 << 0.123456;
-    // The default lies 0.46 pixels from 0.25.
-    QTest::newRow("onto the default") << QByteArray("linear") << 55.0 << 1.0 << 0.2523 << 0.2523;
-    QTest::newRow("past the default") << QByteArray("linear") << 54.8 << 1.0 << 0.2523 << 0.249;
-    QTest::newRow("fine keeps one more place") << QByteArray("linear") << 108.0 << 0.1 << none << 0.5015;
-    QTest::newRow("beyond the end") << QByteArray("linear") << 400.0 << 1.0 << none << 1.0;
-    // Near the steep end of a power track a pixel is 0.0001 wide.
-    QTest::newRow("power keeps the places a pixel needs") << QByteArray("power 2") << 7.3 << 1.0 << none << 0.00013;
-}
-
-void SliderMappingTest::dragValue()
-{
-    QFETCH(QByteArray, mode);
-    QFETCH(double, x);
-    QFETCH(double, k);
-    QFETCH(double, def);
-    QFETCH(double, stored);
-    SliderMapping m = Make(mode, 0.0, 1.0);
-    m.SetAnchor(0.5);
-    const std::optional<double> theDefault = def >= 0.0 ? std::optional<double>(def) : std::nullopt;
-    QCOMPARE(m.DragValue(x, k, 0.123456, theDefault), stored);
-}
-
-// Steps on a bent track are a fraction of the track, rounded as a drag is:
-// on a square track they differ on either side of a value.
-void SliderMappingTest::trackStep_data()
-{
-    QTest::addColumn<double>("value");
-    QTest::addColumn<int>("direction");
-    QTest::addColumn<int>("level");
-    QTest::addColumn<double>("step");
-    QTest::newRow("normal, a hundredth of the track") << 0.5 << 1 << 1 << 0.01;
-    QTest::newRow("fine, one more place") << 0.5 << 1 << 0 << 0.001;
-    QTest::newRow("coarse up") << 0.5 << 1 << 2 << 0.092;
-    QTest::newRow("coarse down") << 0.5 << -1 << 2 << 0.113;
-    QTest::newRow("stops at the end") << 0.99 << 1 << 2 << 0.01;
-}
-
-void SliderMappingTest::trackStep()
-{
-    QFETCH(double, value);
-    QFETCH(int, direction);
-    QFETCH(int, level);
-    QFETCH(double, step);
-    const SliderMapping m = Make("square expressions", 0.0, 1.0);
-    QVERIFY(m.HasMapping());
-    QCOMPARE(m.TrackStep(value, direction, level), step);
-}
-
-void SliderMappingTest::snapToStep_data()
-{
-    QTest::addColumn<double>("centre");
-    QTest::addColumn<double>("stepDown");
-    QTest::addColumn<double>("stepUp");
-    QTest::addColumn<double>("value");
-    QTest::addColumn<double>("snapped");
-    const double linear = -100.0; // no centre inside the range
-    QTest::newRow("truncates toward zero") << linear << 1.0 << 9.0 << -2.7 << -2.0;
-    QTest::newRow("step of five") << linear << 5.0 << 9.0 << 8.0 << 10.0;
-    QTest::newRow("negative step of five") << linear << 5.0 << 9.0 << -7.0 << 0.0;
-    QTest::newRow("below the centre") << 2.4 << 1.0 << 9.0 << 1.2 << 1.0;
-    QTest::newRow("above the centre, the up step") << 2.4 << 1.0 << 3.0 << 5.0 << 6.0;
-    QTest::newRow("crossing the centre") << 2.4 << 4.0 << 9.0 << 2.3 << 2.0;
-    QTest::newRow("at the centre") << 2.4 << 4.0 << 9.0 << 2.4 << 2.0;
-}
-
-void SliderMappingTest::snapToStep()
-{
-    QFETCH(double, centre);
-    QFETCH(double, stepDown);
-    QFETCH(double, stepUp);
-    QFETCH(double, value);
-    QFETCH(double, snapped);
-    SliderMapping m = Make("linear", -10.0, 10.0);
-    m.SetBounds({-10.0, 10.0, -10.0, 10.0, centre, 1.0});
-    m.SetTwoSegment(centre > -10.0);
-    QCOMPARE(m.SnapToStep(value, stepDown, stepUp), snapped);
-}
-
-// The widget's snap and the control's rounding agree at halves and part
-// below zero, as their comment says. Results are compared exactly.
-void SliderMappingTest::roundings_data()
-{
-    QTest::addColumn<double>("step");
-    QTest::addColumn<double>("value");
-    QTest::addColumn<double>("truncated"); // AddHalfTruncate
-    QTest::addColumn<double>("halfUp");    // RoundHalfUp
-    QTest::newRow("-2.5") << 1.0 << -2.5 << -2.0 << -2.0;
-    QTest::newRow("-0.5") << 1.0 << -0.5 << 0.0 << 0.0;
-    QTest::newRow("0.5") << 1.0 << 0.5 << 1.0 << 1.0;
-    QTest::newRow("-2.7") << 1.0 << -2.7 << -2.0 << -3.0;
-    QTest::newRow("-2.2") << 1.0 << -2.2 << -1.0 << -2.0;
-    QTest::newRow("2.2") << 1.0 << 2.2 << 2.0 << 2.0;
-    QTest::newRow("quarter -0.625") << 0.25 << -0.625 << -0.5 << -0.5;
-    QTest::newRow("quarter -0.125") << 0.25 << -0.125 << 0.0 << 0.0;
-    QTest::newRow("quarter 0.125") << 0.25 << 0.125 << 0.25 << 0.25;
-    QTest::newRow("quarter -0.6") << 0.25 << -0.6 << -0.25 << -0.5;
-    QTest::newRow("no step") << 0.0 << -2.7 << -2.7 << -2.7;
-}
-
-void SliderMappingTest::roundings()
-{
-    QFETCH(double, step);
-    QFETCH(double, value);
-    QFETCH(double, truncated);
-    QFETCH(double, halfUp);
-    QVERIFY2(SliderMapping::AddHalfTruncate(value, step) == truncated,
-             qPrintable(QString::number(SliderMapping::AddHalfTruncate(value, step), 'g', 17)));
-    QVERIFY2(SliderMapping::RoundHalfUp(value, step) == halfUp,
-             qPrintable(QString::number(SliderMapping::RoundHalfUp(value, step), 'g', 17)));
 }
 
 // Decimal places give the double nearest the decimal: 0.57, not 57 * 0.01.
