@@ -212,4 +212,19 @@ bool HandleOverlay::UpdateFade(const PreviewInfo &info)
     return changed;
 }
 
+bool HandleOverlay::CopyAttr(Tag tag, void *out)
+{
+    if (!out || (tag != PCA_GrabOffsetX && tag != PCA_GrabOffsetY))
+        return PreviewControl::CopyAttr(tag, out);
+    *static_cast<float64 *>(out) = tag == PCA_GrabOffsetX ? mGrabOffset.x : mGrabOffset.y;
+    // False: the value was supplied.
+    return false;
+}
+
+void HandleOverlay::ReadGrabOffset(const TagList &tags)
+{
+    mGrabOffset.x = tags.GetDouble(PCA_GrabOffsetX, mGrabOffset.x);
+    mGrabOffset.y = tags.GetDouble(PCA_GrabOffsetY, mGrabOffset.y);
+}
+
 } // namespace Orbane

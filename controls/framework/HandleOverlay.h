@@ -32,6 +32,8 @@ public:
     using PreviewControl::PreviewControl;
 
     std::size_t SizeOf() const override { return sizeof(HandleOverlay); }
+    // Supplies the grab offset (PCA_GrabOffsetX, PCA_GrabOffsetY).
+    bool CopyAttr(Tag tag, void *out) override;
     void ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
     uint64 ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags) override;
     bool HoverBounds(const PreviewInfo &info, OrbRect &bounds) const override;
@@ -93,6 +95,13 @@ protected:
     static OrbPoint NudgeOffset(uint64 key, float64 stepX, float64 stepY, Qt::KeyboardModifiers mods) noexcept;
     // The keyboard's modifiers now, as the application sees them.
     static Qt::KeyboardModifiers KeyModifiers();
+
+    // Takes the grab offset a tool or script gives (PCA_GrabOffsetX/Y).
+    void ReadGrabOffset(const TagList &tags);
+
+    // Where the mouse held the handle at the press, in the overlay's own
+    // units (viewer units for most; the rectangle's frame for it).
+    OrbPoint mGrabOffset;
 
 private:
     // The base's highlight follows the handles: drawn highlighted while one

@@ -90,12 +90,6 @@ bool AngleControl::CopyAttr(Tag tag, void *out)
     case ACD_FollowAngle:
         value = mFollowAngle;
         break;
-    case PCA_GrabOffsetX:
-        value = mGrabOffset.x;
-        break;
-    case PCA_GrabOffsetY:
-        value = mGrabOffset.y;
-        break;
     default:
         return HandleOverlay::CopyAttr(tag, out);
     }
@@ -141,8 +135,7 @@ bool AngleControl::SetAttrsTagList(Input *input, const TagList &tags)
     mFollow.x = tags.GetDouble(ACD_FollowX, mFollow.x);
     mFollow.y = tags.GetDouble(ACD_FollowY, mFollow.y);
     mFollowAngle = tags.GetDouble(ACD_FollowAngle, mFollowAngle);
-    mGrabOffset.x = tags.GetDouble(PCA_GrabOffsetX, mGrabOffset.x);
-    mGrabOffset.y = tags.GetDouble(PCA_GrabOffsetY, mGrabOffset.y);
+    ReadGrabOffset(tags);
     mDialStyle = tags.GetInt(AC_DialStyle, mDialStyle);
     UpdateDisplay(nullptr, nullptr);
     return HandleOverlay::SetAttrsTagList(input, tags);

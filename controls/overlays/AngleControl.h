@@ -75,7 +75,6 @@ private:
     uint8 mFollowCursor = 0;
     OrbPoint mFollow;
     float64 mFollowAngle = 0.0;
-    OrbPoint mGrabOffset;
     float64 mAngleAtPress = 0.0;
     float64 mAngleOffset = 0.0;
     // For a press flagged PEF_StartGrab: the centre of a dial whose arm

@@ -32,12 +32,6 @@ bool CrosshairControl::CopyAttr(Tag tag, void *out)
     case CHCD_CurrentY:
         value = mDrawnPoint.y;
         break;
-    case PCA_GrabOffsetX:
-        value = mGrabOffset.x;
-        break;
-    case PCA_GrabOffsetY:
-        value = mGrabOffset.y;
-        break;
     default:
         return HandleOverlay::CopyAttr(tag, out);
     }
@@ -77,8 +71,7 @@ bool CrosshairControl::SetAttrsTagList(Input *input, const TagList &tags)
     mFollow.y = tags.GetDouble(CHCD_FollowY, mFollow.y);
     mFollowOrig.x = tags.GetDouble(CHCD_FollowOrigX, mFollowOrig.x);
     mFollowOrig.y = tags.GetDouble(CHCD_FollowOrigY, mFollowOrig.y);
-    mGrabOffset.x = tags.GetDouble(PCA_GrabOffsetX, mGrabOffset.x);
-    mGrabOffset.y = tags.GetDouble(PCA_GrabOffsetY, mGrabOffset.y);
+    ReadGrabOffset(tags);
     mHideWhileDragging = tags.GetInt(PCA_HideWhileDragging, mHideWhileDragging);
     UpdateDisplay(nullptr, nullptr);
     return HandleOverlay::SetAttrsTagList(input, tags);

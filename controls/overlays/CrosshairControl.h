@@ -86,7 +86,6 @@ private:
     int32 mHideWhileDragging = 0;
     OrbPoint mFollow;
     OrbPoint mFollowOrig;
-    OrbPoint mGrabOffset;
     OrbPoint mStartGrab;
     OrbPoint mPressPoint;
 

@@ -26,15 +26,6 @@ PointControl::~PointControl()
     DetachLinkedInputs(*this, Links);
 }
 
-bool PointControl::CopyAttr(Tag tag, void *out)
-{
-    if (!out || (tag != PCA_GrabOffsetX && tag != PCA_GrabOffsetY))
-        return HandleOverlay::CopyAttr(tag, out);
-    *static_cast<float64 *>(out) = tag == PCA_GrabOffsetX ? mGrabOffset.x : mGrabOffset.y;
-    // False: the value was supplied.
-    return false;
-}
-
 bool PointControl::GetAttrsTagList(TagList &tags) const
 {
     WriteLinkedInputIds(*this, Links, tags);
@@ -56,8 +47,7 @@ bool PointControl::SetAttrsTagList(Input *input, const TagList &tags)
         const AutoParameter prev(mPrevInput->GetValue(GetCurrentTime()));
         NotifyChanged(mPrevInput, prev.get(), nullptr);
     }
-    mGrabOffset.x = tags.GetDouble(PCA_GrabOffsetX, mGrabOffset.x);
-    mGrabOffset.y = tags.GetDouble(PCA_GrabOffsetY, mGrabOffset.y);
+    ReadGrabOffset(tags);
     UpdateDisplay(nullptr, nullptr);
     return HandleOverlay::SetAttrsTagList(input, tags);
 }

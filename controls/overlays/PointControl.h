@@ -17,7 +17,6 @@ public:
     ~PointControl() override;
 
     std::size_t SizeOf() const override { return sizeof(PointControl); }
-    bool CopyAttr(Tag tag, void *out) override;
     bool GetAttrsTagList(TagList &tags) const override;
 
     using PreviewControl::SetAttrsTagList;
@@ -53,7 +52,6 @@ private:
     OrbPoint mDrawnPoint{0.5, 0.5};
     OrbPoint mPrevValue{0.5, 0.5};
     OrbPoint mDrawnPrev{0.5, 0.5};
-    OrbPoint mGrabOffset;
     Input *mPrevInput = nullptr; // one reference, watched
 };
 

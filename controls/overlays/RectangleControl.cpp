@@ -98,15 +98,6 @@ RectangleControl::~RectangleControl()
     DetachLinkedInputs(*this, Links);
 }
 
-bool RectangleControl::CopyAttr(Tag tag, void *out)
-{
-    if (!out || (tag != PCA_GrabOffsetX && tag != PCA_GrabOffsetY))
-        return HandleOverlay::CopyAttr(tag, out);
-    *static_cast<float64 *>(out) = tag == PCA_GrabOffsetX ? mGrabOffset.x : mGrabOffset.y;
-    // False: the value was supplied.
-    return false;
-}
-
 bool RectangleControl::GetAttrsTagList(TagList &tags) const
 {
     WriteLinkedInputIds(*this, Links, tags);

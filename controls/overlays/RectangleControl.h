@@ -25,7 +25,6 @@ public:
     ~RectangleControl() override;
 
     std::size_t SizeOf() const override { return sizeof(RectangleControl); }
-    bool CopyAttr(Tag tag, void *out) override;
     bool GetAttrsTagList(TagList &tags) const override;
     void GetState(ScriptVal &state) const override;
 
@@ -103,7 +102,6 @@ private:
     uint8 mDragWidth = 0, mDragHeight = 0;
     int32 mDragPart = 1, mLastPart = 9;
     float64 mCornerRound = 0.0;
-    OrbPoint mGrabOffset;
     QImage mImage;           // the image Input's pixels, shown inside
     RectangleShape mDrawn;   // the shape as last drawn, which the mouse meets
     bool mAdjusting = false; // our own undo group is open
