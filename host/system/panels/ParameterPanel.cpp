@@ -116,15 +116,18 @@ void ParameterPanel::OnToolRemoving(Operator *tool)
         ShowTool(nullptr);
 }
 
-// Unbinds and destroys every control. A script may still hold one, so each
-// leaves the page before its reference is dropped.
+// Unbinds and destroys every control. A script may still hold one, so that
+// one leaves the page before its reference is dropped; the others are
+// destroyed in place. Taking a widget out of its window walks the window's
+// whole focus chain, so unparenting every control made clearing quadratic.
 void ParameterPanel::Clear()
 {
     for (InputControl *c : mControls) {
         const std::vector<Input *> inputs = c->Inputs();
         for (Input *in : inputs)
             c->OnDisconnect(in, nullptr);
-        c->setParent(nullptr);
+        if (c->RefCount() > 1)
+            c->setParent(nullptr);
         c->DecRef();
     }
     mControls.clear();
