@@ -11,7 +11,11 @@ void GoalReporter::ReportRuns(const std::vector<Run> &runs)
         std::string name = run.run_name.function_name;
         if (!run.run_name.args.empty())
             name += "/" + run.run_name.args;
-        const double seconds = run.GetAdjustedRealTime() / benchmark::GetTimeUnitMultiplier(run.time_unit);
+        // CPU time, unless the benchmark times itself or asks for real time:
+        // on a shared machine, real time counts the waits for a core.
+        const bool real = !run.run_name.time_type.empty();
+        const double seconds = (real ? run.GetAdjustedRealTime() : run.GetAdjustedCPUTime()) /
+                               benchmark::GetTimeUnitMultiplier(run.time_unit);
         auto found = mBest.find(name);
         if (found == mBest.end())
             mBest.emplace(name, seconds);

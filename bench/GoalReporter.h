@@ -12,7 +12,8 @@
 // Shows every run as the console reporter does and keeps each benchmark's
 // best time per iteration, then prints one line per goal. The best of the
 // repetitions, not the mean, because the machine is shared: noise only ever
-// adds time.
+// adds time. The time is the process's CPU time (the benchmarks run on one
+// thread, painting included), unless a benchmark reports its own.
 class GoalReporter : public benchmark::ConsoleReporter
 {
 public:
@@ -22,6 +23,6 @@ public:
     int PrintGoals(const std::vector<Goal> &goals, std::FILE *out) const;
 
 private:
-    // Best real time per iteration in seconds, by "function/args".
+    // Best time per iteration in seconds, by "function/args".
     std::map<std::string, double> mBest;
 };

@@ -26,8 +26,8 @@ double TimeOneLoad()
     return parsed ? ns * 1e-9 : -1.0;
 }
 
-// Each iteration is the fastest of a few loads: a process that the shared
-// machine preempts in the middle of its load says nothing about the library.
+// Each iteration is the fastest of a few loads, so that the page cache and
+// the machine's other work weigh as little as they can.
 void BM_ControlLibrary_Load(benchmark::State &state)
 {
     for (auto _ : state) {
