@@ -69,6 +69,7 @@ private:
     InputControl *CreateControl(Input *input, const char *classID, QWidget *page);
     void BuildUntil(QWidget *page, int32 bottom, size_t count);
     void BuildThrough(size_t count);
+    void PredictWidth();
     void Place(InputControl *control, int32 inner);
     int32 InnerWidth() const;
     void ResizePage();

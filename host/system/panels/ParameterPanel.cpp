@@ -53,6 +53,8 @@ void ParameterPanel::ShowTool(Operator *tool)
         QWidget *page = new QWidget;
         page->hide();
         mLaidOutWidth = viewport()->width();
+        BuildUntil(page, 0, 1);
+        PredictWidth();
         BuildUntil(page, 2 * viewport()->height(), kFirstBuilt);
         setWidget(page);
         ResizePage();
@@ -121,6 +123,27 @@ void ParameterPanel::BuildThrough(size_t count)
     ResizePage();
     if (hide)
         page->show();
+}
+
+// The vertical scroll bar comes or goes with the new page, narrowing or
+// widening the view, which would size every built control twice. From the
+// first control's height the page's height is foreseen, and the first
+// control sized again at the width the view will have; where the guess is
+// wrong, the resize that follows lays out again.
+void ParameterPanel::PredictWidth()
+{
+    QScrollBar *bar = verticalScrollBar();
+    if (mControls.empty() || verticalScrollBarPolicy() != Qt::ScrollBarAsNeeded)
+        return;
+    const int32 height = (mBuiltBottom - kSideMargin) * int32(mSlots.size()) + 2 * kSideMargin;
+    const bool shown = !bar->isHidden(), needed = height > viewport()->height();
+    const int32 extent = bar->sizeHint().width();
+    const int32 width = viewport()->width() + (shown ? extent : 0) - (needed ? extent : 0);
+    if (width == mLaidOutWidth || width < 1)
+        return;
+    mLaidOutWidth = width;
+    mBuiltBottom = kSideMargin;
+    Place(mControls.front(), InnerWidth());
 }
 
 int32 ParameterPanel::InnerWidth() const
