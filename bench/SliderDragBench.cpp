@@ -133,7 +133,7 @@ void BM_SliderControl_Drag(benchmark::State &state)
     if (!page.Moved())
         state.SkipWithError("the drags did not move the value");
 }
-BENCHMARK(BM_SliderControl_Drag)->Arg(1)->Arg(2)->Unit(benchmark::kMillisecond);
+BENCHMARK(BM_SliderControl_Drag)->Arg(1)->Arg(3)->Unit(benchmark::kMillisecond);
 
 // The stock alternative: a QSlider and a QDoubleSpinBox per view, each
 // showing a plain value that the slider's moves write.
@@ -220,7 +220,7 @@ void BM_QSliderSpinBox_Drag(benchmark::State &state)
     if (!page.Moved())
         state.SkipWithError("the drags did not move the value");
 }
-BENCHMARK(BM_QSliderSpinBox_Drag)->Arg(1)->Arg(2)->Unit(benchmark::kMillisecond);
+BENCHMARK(BM_QSliderSpinBox_Drag)->Arg(1)->Arg(3)->Unit(benchmark::kMillisecond);
 
 } // namespace
 

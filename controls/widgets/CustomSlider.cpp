@@ -307,8 +307,13 @@ void CustomSlider::Redraw(bool full)
         update();
         return;
     }
-    update(KnobUpdateRect(mLastKnobX));
-    update(KnobUpdateRect(KnobX()));
+    // A drag moves the knob a few pixels at a time: where the old and new
+    // places overlap, one rectangle over both is one update instead of two.
+    const QRect before = KnobUpdateRect(mLastKnobX), after = KnobUpdateRect(KnobX());
+    if (before.intersects(after))
+        update(before.united(after));
+    else
+        update(QRegion(before).united(after));
 }
 
 } // namespace Orbane

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "orbane/OrbID.h"
 #include "orbane/Types.h"
 
 #include <QPointer>
@@ -20,19 +21,32 @@ class OrbaneDoc;
 // Open and SetSize; a width change sizes every control again. When the tool
 // leaves the document, or another tool is shown, each control is unbound
 // (OnDisconnect) and destroyed.
+//
+// Controls are built in Input order as far as the view needs them: the first
+// screens' worth (and at least kFirstBuilt) when the tool is shown, more as the
+// view scrolls towards them, and all up to an Input whose controls are asked
+// for. A tool of thousands of Inputs thus shows at once; the page keeps the
+// height the unbuilt rest is estimated to take, so the scroll bar is right.
 class ParameterPanel : public QScrollArea
 {
     Q_OBJECT
 public:
+    // Controls built when a tool is shown, whatever the view's height.
+    static constexpr size_t kFirstBuilt = 100;
+
     explicit ParameterPanel(OrbaneDoc *doc, QWidget *parent = nullptr);
     ~ParameterPanel() override;
 
     void ShowTool(Operator *tool);
     Operator *GetTool() const { return mTool; }
 
-    // The controls of an Input, in creation order.
-    std::vector<InputControl *> ControlsOf(const Input *input) const;
+    // The controls of an Input, in creation order; builds them, and those of
+    // every Input before it, where they are not built yet.
+    std::vector<InputControl *> ControlsOf(const Input *input);
+    // The controls built so far, in Input order.
     const std::vector<InputControl *> &Controls() const { return mControls; }
+    // How many controls the shown tool has, built or not.
+    size_t ControlCount() const { return mSlots.size(); }
 
 signals:
     void toolShown(Orbane::Operator *tool);
@@ -42,16 +56,32 @@ protected:
 
 private slots:
     void OnToolRemoving(Orbane::Operator *tool);
+    void OnScrolled(int value);
 
 private:
-    InputControl *CreateControl(Input *input, const char *classID);
+    // A control to build: the Input and the class it names.
+    struct Slot
+    {
+        Input *input;
+        OrbID classID;
+    };
+
+    InputControl *CreateControl(Input *input, const char *classID, QWidget *page);
+    void BuildUntil(QWidget *page, int32 bottom, size_t count);
+    void BuildThrough(size_t count);
+    void PredictWidth();
+    void Place(InputControl *control, int32 inner);
+    int32 InnerWidth() const;
+    void ResizePage();
     void Clear();
     void LayOut();
 
     OrbaneDoc *mDoc;
     Operator *mTool = nullptr;
-    std::vector<InputControl *> mControls; // one reference each
+    std::vector<Slot> mSlots;              // every control of the tool, in order
+    std::vector<InputControl *> mControls; // the built ones, one reference each
     int32 mLaidOutWidth = -1;
+    int32 mBuiltBottom = 0; // where the next built control goes
 };
 
 } // namespace Orbane

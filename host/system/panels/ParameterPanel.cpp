@@ -9,7 +9,9 @@
 #include "orbane/RegistryList.h"
 #include "orbane/ScriptVal.h"
 
+#include <QApplication>
 #include <QResizeEvent>
+#include <QScrollBar>
 
 namespace Orbane {
 
@@ -27,6 +29,7 @@ ParameterPanel::ParameterPanel(OrbaneDoc *doc, QWidget *parent) : QScrollArea(pa
     setFrameShape(QFrame::NoFrame);
     setWidget(new QWidget);
     connect(doc, SIGNAL(toolRemoving(Orbane::Operator *)), this, SLOT(OnToolRemoving(Orbane::Operator *)));
+    connect(verticalScrollBar(), SIGNAL(valueChanged(int)), this, SLOT(OnScrolled(int)));
 }
 
 ParameterPanel::~ParameterPanel()
@@ -41,26 +44,41 @@ void ParameterPanel::ShowTool(Operator *tool)
     Clear();
     mTool = tool;
     if (tool) {
+        for (Input *input : tool->Inputs())
+            for (const TagItem *item = input->GetAttrs().Find(INPA_InputControl); item;
+                 item = input->GetAttrs().FindNext(item))
+                mSlots.push_back({input, item->id});
         // The page is built hidden and shown once: adding widgets one by one
         // to a visible page costs a relayout each.
         QWidget *page = new QWidget;
         page->hide();
-        for (Input *input : tool->Inputs())
-            for (const TagItem *item = input->GetAttrs().Find(INPA_InputControl); item;
-                 item = input->GetAttrs().FindNext(item))
-                if (InputControl *control = CreateControl(input, item->id.c_str())) {
-                    control->setParent(page);
-                    mControls.push_back(control);
-                }
+        mLaidOutWidth = viewport()->width();
+        BuildUntil(page, 0, 1);
+        PredictWidth();
+        BuildUntil(page, 2 * viewport()->height(), kFirstBuilt);
         setWidget(page);
-        mLaidOutWidth = -1;
-        LayOut();
+        ResizePage();
         page->show();
     }
     emit toolShown(tool);
 }
 
-InputControl *ParameterPanel::CreateControl(Input *input, const char *classID)
+// Builds the next controls in Input order until the built ones reach `bottom`
+// and at least `count` are built, each placed under the one before.
+void ParameterPanel::BuildUntil(QWidget *page, int32 bottom, size_t count)
+{
+    const int32 inner = InnerWidth();
+    while (mControls.size() < mSlots.size() && (mBuiltBottom < bottom || mControls.size() < count)) {
+        const Slot &slot = mSlots[mControls.size()];
+        InputControl *control = CreateControl(slot.input, slot.classID.c_str(), page);
+        mControls.push_back(control);
+        Place(control, inner);
+    }
+}
+
+// The controls are opened on the page they live on: opening one on a page in
+// the window and moving it to another walks the window's focus chain.
+InputControl *ParameterPanel::CreateControl(Input *input, const char *classID, QWidget *page)
 {
     const TagList &attrs = input->GetAttrs();
     const Registry *reg = ClassRegistry.FindScriptName(classID);
@@ -72,12 +90,18 @@ InputControl *ParameterPanel::CreateControl(Input *input, const char *classID)
     }
     control->AddInput(input, &attrs);
     control->SetAttrsTagList(input, attrs);
-    control->Open(widget(), QRect(), nullptr);
+    control->Open(page, QRect(), nullptr);
     return control;
 }
 
-std::vector<InputControl *> ParameterPanel::ControlsOf(const Input *input) const
+std::vector<InputControl *> ParameterPanel::ControlsOf(const Input *input)
 {
+    size_t last = 0;
+    for (size_t i = 0; i < mSlots.size(); ++i)
+        if (mSlots[i].input == input)
+            last = i + 1;
+    if (last > mControls.size() && widget())
+        BuildThrough(last);
     std::vector<InputControl *> found;
     for (InputControl *c : mControls)
         for (Input *in : c->Inputs())
@@ -86,28 +110,93 @@ std::vector<InputControl *> ParameterPanel::ControlsOf(const Input *input) const
     return found;
 }
 
+// Many controls added to a shown page cost a relayout and a repaint each, so
+// a long build hides the page, unless the user is typing in it.
+void ParameterPanel::BuildThrough(size_t count)
+{
+    QWidget *page = widget();
+    const bool hide =
+        count - mControls.size() > kFirstBuilt && page->isVisible() && !page->isAncestorOf(QApplication::focusWidget());
+    if (hide)
+        page->hide();
+    BuildUntil(page, 0, count);
+    ResizePage();
+    if (hide)
+        page->show();
+}
+
+// The vertical scroll bar comes or goes with the new page, narrowing or
+// widening the view, which would size every built control twice. From the
+// first control's height the page's height is foreseen, and the first
+// control sized again at the width the view will have; where the guess is
+// wrong, the resize that follows lays out again.
+void ParameterPanel::PredictWidth()
+{
+    QScrollBar *bar = verticalScrollBar();
+    if (mControls.empty() || verticalScrollBarPolicy() != Qt::ScrollBarAsNeeded)
+        return;
+    const int32 height = (mBuiltBottom - kSideMargin) * int32(mSlots.size()) + 2 * kSideMargin;
+    const bool shown = !bar->isHidden(), needed = height > viewport()->height();
+    const int32 extent = bar->sizeHint().width();
+    const int32 width = viewport()->width() + (shown ? extent : 0) - (needed ? extent : 0);
+    if (width == mLaidOutWidth || width < 1)
+        return;
+    mLaidOutWidth = width;
+    mBuiltBottom = kSideMargin;
+    Place(mControls.front(), InnerWidth());
+}
+
+int32 ParameterPanel::InnerWidth() const
+{
+    return qMax(1, mLaidOutWidth - 2 * kSideMargin);
+}
+
+void ParameterPanel::Place(InputControl *control, int32 inner)
+{
+    int32 w = inner, h = 0;
+    control->SetSize(w, h, nullptr);
+    control->setGeometry(kSideMargin, mBuiltBottom, inner, h);
+    control->show();
+    mBuiltBottom += h;
+}
+
+// The page is as high as the built controls, plus the unbuilt ones at the
+// built ones' mean height.
+void ParameterPanel::ResizePage()
+{
+    const size_t built = mControls.size(), unbuilt = mSlots.size() - built;
+    const int32 mean = built ? (mBuiltBottom - kSideMargin) / int32(built) : 0;
+    widget()->resize(mLaidOutWidth, mBuiltBottom + mean * int32(unbuilt) + kSideMargin);
+}
+
 void ParameterPanel::LayOut()
 {
     const int32 width = viewport()->width();
     if (width == mLaidOutWidth || !widget())
         return;
     mLaidOutWidth = width;
-    const int32 inner = qMax(1, width - 2 * kSideMargin);
-    int32 y = kSideMargin;
-    for (InputControl *c : mControls) {
-        int32 w = inner, h = 0;
-        c->SetSize(w, h, nullptr);
-        c->setGeometry(kSideMargin, y, inner, h);
-        c->show();
-        y += h;
+    mBuiltBottom = kSideMargin;
+    const int32 inner = InnerWidth();
+    for (InputControl *c : mControls)
+        Place(c, inner);
+    ResizePage();
+}
+
+// Builds ahead of the view by a screen, so scrolling finds controls there.
+void ParameterPanel::OnScrolled(int value)
+{
+    const int32 ahead = value + 2 * viewport()->height();
+    if (mControls.size() < mSlots.size() && widget() && mBuiltBottom < ahead) {
+        BuildUntil(widget(), ahead + viewport()->height(), 0);
+        ResizePage();
     }
-    widget()->resize(width, y + kSideMargin);
 }
 
 void ParameterPanel::resizeEvent(QResizeEvent *event)
 {
     QScrollArea::resizeEvent(event);
     LayOut();
+    OnScrolled(verticalScrollBar()->value());
 }
 
 void ParameterPanel::OnToolRemoving(Operator *tool)
@@ -116,18 +205,23 @@ void ParameterPanel::OnToolRemoving(Operator *tool)
         ShowTool(nullptr);
 }
 
-// Unbinds and destroys every control. A script may still hold one, so each
-// leaves the page before its reference is dropped.
+// Unbinds and destroys every control. A script may still hold one, so that
+// one leaves the page before its reference is dropped; the others are
+// destroyed in place. Taking a widget out of its window walks the window's
+// whole focus chain, so unparenting every control made clearing quadratic.
 void ParameterPanel::Clear()
 {
     for (InputControl *c : mControls) {
         const std::vector<Input *> inputs = c->Inputs();
         for (Input *in : inputs)
             c->OnDisconnect(in, nullptr);
-        c->setParent(nullptr);
+        if (c->RefCount() > 1)
+            c->setParent(nullptr);
         c->DecRef();
     }
     mControls.clear();
+    mSlots.clear();
+    mBuiltBottom = kSideMargin;
     mTool = nullptr;
 }
 

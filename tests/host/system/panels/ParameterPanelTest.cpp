@@ -4,8 +4,11 @@
 #include "LoadControlModule.h"
 
 #include "orbane/AutoParam.h"
+#include "orbane/ClassIDs.h"
 #include "orbane/FallbackControl.h"
 #include "orbane/Input.h"
+#include "orbane/InputControl.h"
+#include "orbane/InputWatcher.h"
 #include "orbane/LuaRuntime.h"
 #include "orbane/Operator.h"
 #include "orbane/OrbaneDoc.h"
@@ -15,6 +18,7 @@
 
 #include <QLabel>
 #include <QRegularExpression>
+#include <QScrollBar>
 #include <QTest>
 
 using namespace Orbane;
@@ -56,6 +60,26 @@ struct Shown
     OrbaneDoc doc;
     Operator *tool = nullptr;
     ParameterPanel panel{&doc};
+};
+
+// A tool of `count` number Inputs at 0.3, each shown by a check box, which
+// shows 0 and so writes 0 back when it is unbound.
+Operator *AddCheckBoxTool(OrbaneDoc &doc, const char *name, int count)
+{
+    const TagList attrs{{INPA_InputControl, OrbID("CheckboxControl")}};
+    AutoRef<Operator> tool(new Operator(name, "Checks"));
+    for (int i = 0; i < count; ++i) {
+        const std::string id = "Check" + std::to_string(i);
+        tool->AddInput(OrbID(id.c_str()), id.c_str(), CLSID_DataType_Number, attrs, AutoNumber(0.3));
+    }
+    return doc.AddTool(tool.get()) ? tool.get() : nullptr;
+}
+
+// Records which Inputs were written, in order.
+struct WriteLog : InputWatcher
+{
+    void OnInputChanged(Input *in, Parameter *, const TagList *) override { written.push_back(in); }
+    std::vector<Input *> written;
 };
 
 } // namespace
@@ -139,6 +163,66 @@ private slots:
         QVERIFY2(first.isNull(), "the control is destroyed");
         for (Input *in : keep->Inputs())
             QVERIFY(in->Watchers().empty());
+    }
+
+    // A large tool builds what the view shows (and a first batch), each
+    // control bound, opened and sized, one under the other; scrolling builds
+    // on in Input order up to the end.
+    void largeToolBuildsWhatShowsAndTheRestOnScrolling()
+    {
+        OrbaneDoc doc;
+        Operator *tool = AddCheckBoxTool(doc, "Large1", 1000);
+        QVERIFY(tool);
+        ParameterPanel panel(&doc);
+        panel.resize(300, 400);
+        panel.show();
+        panel.ShowTool(tool);
+        QCOMPARE(panel.ControlCount(), size_t(1000));
+        QVERIFY(panel.Controls().size() >= ParameterPanel::kFirstBuilt && panel.Controls().size() < 1000);
+        QScrollBar *bar = panel.verticalScrollBar();
+        for (int guard = 0; panel.Controls().size() < 1000 && guard < 1000; ++guard)
+            bar->setValue(bar->maximum());
+        QCOMPARE(panel.Controls().size(), size_t(1000));
+        int top = panel.Controls().front()->y();
+        for (size_t i = 0; i < panel.Controls().size(); ++i) {
+            InputControl *c = panel.Controls()[i];
+            QCOMPARE(c->Inputs(), std::vector<Input *>{tool->Inputs()[i]});
+            QVERIFY(c->IsOpen() && c->isVisible() && c->parentWidget() == panel.widget());
+            QVERIFY2(c->height() > 0 && c->y() == top, "sized and placed under the one before");
+            top = c->geometry().bottom() + 1;
+        }
+        QVERIFY2(panel.widget()->height() >= top, "the page holds every control");
+    }
+
+    // Leaving the tool writes back through every built control, in order, and
+    // through no other; a control a script still holds outlives its page.
+    void leavingWritesThroughTheBuiltControlsOnly()
+    {
+        OrbaneDoc doc;
+        Operator *tool = AddCheckBoxTool(doc, "Large1", 1000);
+        Operator *other = AddCheckBoxTool(doc, "Small1", 1);
+        QVERIFY(tool && other);
+        WriteLog log;
+        for (Input *in : tool->Inputs())
+            in->AttachWatcher(&log);
+        ParameterPanel panel(&doc);
+        panel.resize(300, 400);
+        panel.show();
+        panel.ShowTool(tool);
+        Input *asked = tool->Inputs()[600];
+        QCOMPARE(panel.ControlsOf(asked).size(), size_t(1));
+        QCOMPARE(panel.Controls().size(), size_t(601));
+        QPointer<InputControl> held = panel.Controls().front(), dropped = panel.Controls().back();
+        held->IncRef();
+        panel.ShowTool(other);
+        const std::vector<Input *> built(tool->Inputs().begin(), tool->Inputs().begin() + 601);
+        QVERIFY(log.written == built);
+        QVERIFY(dropped.isNull());
+        QVERIFY(held && !held->parentWidget() && held->Inputs().empty());
+        held->DecRef();
+        QVERIFY(held.isNull());
+        for (Input *in : tool->Inputs())
+            in->DetachWatcher(&log);
     }
 
     void badDescriptionsFailWithClearMessages_data()

@@ -1,0 +1,23 @@
+// The project's performance goals: adding one is adding a line here.
+#include "Goal.h"
+
+const std::vector<Goal> &Goals()
+{
+    static const std::vector<Goal> goals{
+        {"P1", "inspector build, 500 sliders", "BM_Inspector_Build/500", "BM_StockRows_Build/500", 1.0,
+         "stock Qt rows"},
+        {"P1", "inspector build, 2000 sliders", "BM_Inspector_Build/2000", "BM_Inspector_Build/500", 4.4,
+         "the time for 500"},
+        {"P1b", "inspector teardown, 2000 sliders", "BM_Inspector_Teardown/2000", "BM_Inspector_Teardown/500", 4.4,
+         "the time for 500"},
+        {"P1c", "switch to a tool of 10,000 Inputs and back", "BM_Inspector_SwitchLarge/10000", nullptr, 1000.0, ""},
+        {"P2", "slider repaint after a value change", "BM_CustomSlider_ValueUpdate", "BM_QSlider_ValueUpdate", 0.5,
+         "a stock QSlider"},
+        {"P3", "drag move to three bound controls", "BM_SliderControl_Drag/3", "BM_QSliderSpinBox_Drag/3", 2.0,
+         "a QSlider to QDoubleSpinBox signal"},
+        {"P5", "load the control library and register every class", "BM_ControlLibrary_Load", nullptr, 2.0, ""},
+        {"V1", "hover over 100 rectangles and 100 angle dials, one mouse event", "BM_Viewer_HoverShapes/100/100",
+         nullptr, 0.5, ""},
+    };
+    return goals;
+}
