@@ -266,14 +266,15 @@ bool QtGPainter::IsEnabled(int32 capability) const
 
 void QtGPainter::PushAttrib()
 {
-    mSavedStates.append(mState);
+    mSavedStates.push_back(mState);
 }
 
 void QtGPainter::PopAttrib()
 {
-    if (mSavedStates.isEmpty())
+    if (mSavedStates.empty())
         return;
-    mState = mSavedStates.takeLast();
+    mState = mSavedStates.back();
+    mSavedStates.pop_back();
 }
 
 void QtGPainter::BlendFunc(int32 source, int32 destination)

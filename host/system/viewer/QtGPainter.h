@@ -7,6 +7,8 @@
 
 #include <QVector>
 
+#include <vector>
+
 class QColor;
 class QPainter;
 
@@ -93,7 +95,9 @@ private:
     float64 mViewportHeight;
     MatrixStack mMatrices;
     PainterState mState;
-    QVector<PainterState> mSavedStates;
+    // A std::vector: QVector<PainterState>::append trips a false
+    // -Wstringop-overflow in GCC 12's release builds.
+    std::vector<PainterState> mSavedStates;
 
     int32 mBeginMode = -1; // -1: not between Begin and End
     QVector<QPointF> mVertices;
