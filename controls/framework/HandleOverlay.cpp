@@ -22,6 +22,12 @@ constexpr float32 kFadeStep = 0.05f;
 
 void HandleOverlay::ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
 {
+    // A follow drag ends with the release: the overlay stops following.
+    if (mFollowCursor && mDragType == DRAG_Linked) {
+        mDragType = DRAG_None;
+        SetAttrsTagList(TagList{{PCA_FollowCursor, 0}});
+    }
+    mStartGrab = OrbPoint();
     PreviewControl::ControlUp(info, mouse, tags);
     Pick({});
 }

@@ -102,6 +102,11 @@ protected:
     // Where the mouse held the handle at the press, in the overlay's own
     // units (viewer units for most; the rectangle's frame for it).
     OrbPoint mGrabOffset;
+    // The overlay follows the cursor (PCA_FollowCursor) until the release
+    // that ends the follow drag.
+    int32 mFollowCursor = 0;
+    // Where a press flagged PEF_StartGrab began its drag; cleared at release.
+    OrbPoint mStartGrab;
 
 private:
     // The base's highlight follows the handles: drawn highlighted while one

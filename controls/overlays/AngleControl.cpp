@@ -296,16 +296,6 @@ bool AngleControl::Follows(const PreviewInfo &info) const
     return mDragType == DRAG_Linked && mFollowCursor && dynamic_cast<const AngleControl *>(hot);
 }
 
-void AngleControl::ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
-{
-    if (mFollowCursor && mDragType == DRAG_Linked) {
-        mDragType = DRAG_None;
-        SetAttrsTagList(TagList{{PCA_FollowCursor, 0}});
-    }
-    mStartGrab = OrbPoint();
-    HandleOverlay::ControlUp(info, mouse, tags);
-}
-
 uint64 AngleControl::ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags)
 {
     uint64 result = 0;

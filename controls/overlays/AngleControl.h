@@ -36,7 +36,6 @@ public:
     void DrawControls(PreviewInfo *info, const TagList *tags) override;
     DragType ControlDown(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
     void ControlMove(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
-    void ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
     uint64 ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags) override;
 
     // Frees the dial's ring, shared by every angle overlay, then the base's.
@@ -72,7 +71,6 @@ private:
     float64 mRadiusScale = 0.5;
     float64 mRadiusValue = 0.1;
     float64 mRadius = 0.1;
-    uint8 mFollowCursor = 0;
     OrbPoint mFollow;
     float64 mFollowAngle = 0.0;
     float64 mAngleAtPress = 0.0;
@@ -80,7 +78,6 @@ private:
     // For a press flagged PEF_StartGrab: the centre of a dial whose arm
     // reaches where the press began (viewer units). The dial is drawn there
     // a second time while the drag lasts; 0, 0 when none.
-    OrbPoint mStartGrab;
     int32 mDialStyle = 1;
     // As last drawn.
     float64 mDrawnAngle = 0.0;

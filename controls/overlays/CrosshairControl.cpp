@@ -154,16 +154,6 @@ void CrosshairControl::ControlMove(PreviewInfo *info, const OrbPointI &mouse, co
     }
 }
 
-void CrosshairControl::ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
-{
-    if (mFollowCursor && mDragType == DRAG_Linked) {
-        mDragType = DRAG_None;
-        SetAttrsTagList(TagList{{PCA_FollowCursor, 0}});
-    }
-    mStartGrab = OrbPoint();
-    HandleOverlay::ControlUp(info, mouse, tags);
-}
-
 uint64 CrosshairControl::ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags)
 {
     // One image pixel on each axis: the width's on X, the height's on Y.

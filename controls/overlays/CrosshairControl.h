@@ -51,7 +51,6 @@ public:
     void DrawControls(PreviewInfo *info, const TagList *tags) override;
     DragType ControlDown(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
     void ControlMove(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
-    void ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
     uint64 ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags) override;
 
     int32 Style() const { return mStyle; }
@@ -82,11 +81,9 @@ private:
     OrbPoint mValue{0.5, 0.5};
     OrbPoint mDrawnPoint{0.5, 0.5};
     int32 mStyle = 0;
-    int32 mFollowCursor = 0;
     int32 mHideWhileDragging = 0;
     OrbPoint mFollow;
     OrbPoint mFollowOrig;
-    OrbPoint mStartGrab;
     OrbPoint mPressPoint;
 
     CrosshairGeometry mGeometry;
