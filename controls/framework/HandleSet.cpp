@@ -10,38 +10,35 @@ Handle &HandleSet::Add(const Handle &handle)
     return mHandles.back();
 }
 
-Handle &HandleSet::AddBox(OrbPoint at, OrbPoint lo, OrbPoint hi, uint32 part, int32 priority, uint8 grow)
+Handle &HandleSet::Start(HandleShape shape, OrbPoint at, uint32 part, int32 priority)
 {
     Handle h;
-    h.shape = HSH_Box;
+    h.shape = shape;
     h.at = at;
-    h.lo = lo;
-    h.hi = hi;
-    h.grow = grow;
     h.part = part;
     h.priority = priority;
     return Add(h);
+}
+
+Handle &HandleSet::AddBox(OrbPoint at, OrbPoint lo, OrbPoint hi, uint32 part, int32 priority, uint8 grow)
+{
+    Handle &h = Start(HSH_Box, at, part, priority);
+    h.lo = lo;
+    h.hi = hi;
+    h.grow = grow;
+    return h;
 }
 
 Handle &HandleSet::AddPixelSquare(OrbPoint at, uint32 part, int32 priority)
 {
-    Handle h;
-    h.shape = HSH_PixelSquare;
-    h.at = at;
-    h.part = part;
-    h.priority = priority;
-    return Add(h);
+    return Start(HSH_PixelSquare, at, part, priority);
 }
 
 Handle &HandleSet::AddRing(OrbPoint at, float64 radius, uint32 part, int32 priority)
 {
-    Handle h;
-    h.shape = HSH_Ring;
-    h.at = at;
+    Handle &h = Start(HSH_Ring, at, part, priority);
     h.radius = radius;
-    h.part = part;
-    h.priority = priority;
-    return Add(h);
+    return h;
 }
 
 Handle &HandleSet::AddDisc(OrbPoint at, float64 radius, uint32 part, int32 priority)

@@ -64,6 +64,9 @@ public:
     Graphics::GColor FillOf(const Graphics::GColor &fill, uint32 part, int32 item = -1) const;
 
 private:
+    // A handle of `shape` at `at`, added; the shape's own fields follow.
+    Handle &Start(HandleShape shape, OrbPoint at, uint32 part, int32 priority);
+
     std::vector<Handle> mHandles;
     HandleHit mPoised;
     HandleHit mPicked;
