@@ -81,7 +81,10 @@ void CustomControl::MakeBackBuffer(int32 width, int32 height, qreal ratio)
 
 bool CustomControl::BeginDraw(const QRect &rect)
 {
-    if (visibleRegion().isEmpty())
+    // Inside a paint event Qt has already left out what is hidden, so the
+    // event's rectangle is visible; visibleRegion() would walk every sibling
+    // up the parents (every row of an inspector) on each paint to say so.
+    if (!testAttribute(Qt::WA_WState_InPaintEvent) && visibleRegion().isEmpty())
         return false;
     mDrawRect = OrbRectT<int32>(rect.left(), rect.top(), rect.left() + rect.width(), rect.top() + rect.height());
     if (rect.isEmpty())
@@ -93,7 +96,7 @@ bool CustomControl::BeginDraw(const QRect &rect)
         MakeBackBuffer(width, height, devicePixelRatioF());
     if (!mBackBuffer)
         return false;
-    if (mOwner)
+    if (mOwner && mBackPainter->font() != mOwner->font())
         mBackPainter->setFont(mOwner->font());
     const QColor background = BackgroundColor();
     mBackBuffer->SetAntiAlias(false);

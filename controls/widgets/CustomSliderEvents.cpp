@@ -364,7 +364,10 @@ void CustomSlider::PaintTrack(QPainter &painter, int32 knobY)
     }
     const int32 knobHeight = mKnobImage ? mKnobImage->Height() : 0;
     const int32 y = knobY + (knobHeight - mTrack->Height()) / 2;
-    mTrack->Merge(painter, mTrack->Rect(), mTrack->Rect().translated(0, y));
+    // Only the columns being repainted: a knob move damages a narrow strip.
+    const OrbRectT<int32> &d = GetDrawRect();
+    const QRect place = mTrack->Rect().translated(0, y).intersected(QRect(d.x1, d.y1, d.Width(), d.Height()));
+    mTrack->Merge(painter, place.translated(0, -y), place);
 }
 
 // The ramp is drawn once into the cached track, over the columns the knob

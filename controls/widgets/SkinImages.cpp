@@ -2,6 +2,7 @@
 
 #include "orbane/DIB.h"
 
+#include <functional>
 #include <map>
 #include <string>
 
@@ -28,7 +29,8 @@ public:
     }
 
 private:
-    std::map<std::string, DIB *> mImages;
+    // Found by the name as given: no string is made for a lookup on each paint.
+    std::map<std::string, DIB *, std::less<>> mImages;
 };
 
 } // namespace
