@@ -12,7 +12,7 @@ const std::vector<Goal> &Goals()
          "the time for 500"},
         {"P1c", "switch to a tool of 10,000 Inputs and back", "BM_Inspector_SwitchLarge/10000", nullptr, 1000.0, ""},
         {"P2", "slider repaint after a value change", "BM_CustomSlider_ValueUpdate", "BM_QSlider_ValueUpdate", 0.5,
-         "a stock QSlider"},
+         "a stock QSlider", "BM_Unpainted_ValueUpdate"},
         {"P3", "drag move to three bound controls", "BM_SliderControl_Drag/3", "BM_QSliderSpinBox_Drag/3", 2.0,
          "a QSlider to QDoubleSpinBox signal"},
         {"P5", "load the control library and register every class", "BM_ControlLibrary_Load", nullptr, 2.0, ""},
