@@ -142,6 +142,12 @@ void LabelledInputControl::TakeTexts(const TagList &tags)
     mTexts.Take(tags);
 }
 
+void LabelledInputControl::ShowChild(QWidget *child)
+{
+    if (child->testAttribute(Qt::WA_WState_ExplicitShowHide) && child->isHidden())
+        child->show();
+}
+
 void LabelledInputControl::ShowTexts()
 {
     mLabel->setText(QString::fromStdString(mTexts.label.str()));

@@ -82,6 +82,10 @@ protected:
     // The class layout description in the look-pack item `itemName` (key 1
     // of its table), read by the first call in the process and kept.
     static const ScriptVal &ClassLayout(const char *itemName);
+    // Shows a child at Open. A child never hidden shows with the control
+    // already; showing it on its own would have Qt guess its size from its
+    // size hint (measuring its text), only for the layout to place it anew.
+    static void ShowChild(QWidget *child);
     // Builds the layout from `description` and, with `expressionField`,
     // places the Input's expression field in its "expression" container.
     void PlaceChildren(const ScriptVal &description, bool expressionField);

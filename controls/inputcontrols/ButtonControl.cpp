@@ -44,7 +44,7 @@ bool ButtonControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
         return false;
     mButton->SetFont(GetControlFont());
     mButton->SetBackgroundColor(ToOrbColor(GetBackgroundColor()));
-    mButton->show();
+    ShowChild(mButton);
     mButton->update();
     LoadLayout("Controls.Button.Layout");
     return true;

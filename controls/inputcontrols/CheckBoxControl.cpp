@@ -71,7 +71,7 @@ bool CheckBoxControl::Open(QWidget *host, const QRect &rect, const TagList *tags
             mValue = RoundValue(now->Value);
     }
     mCheckBox->SetValue(mValue);
-    mCheckBox->show();
+    ShowChild(mCheckBox);
     PlaceChildren(ClassLayout(kLayoutItem), true);
     if (Layout::LayoutObj *row = FindLayoutObj("checkbox"))
         mRowHeight = row->GetHeight();

@@ -110,8 +110,8 @@ bool ComboControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
             mSelection = SelectionFor(now);
     }
     mCombo->ShowItem(mSelection);
-    Label()->show();
-    mCombo->show();
+    ShowChild(Label());
+    ShowChild(mCombo);
     // Only a number can come from a typed expression.
     PlaceChildren(ClassLayout(LayoutItemFor(mLabelPosition)), !IsIDVariant());
     return true;

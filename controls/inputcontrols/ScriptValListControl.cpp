@@ -94,9 +94,9 @@ bool ScriptValListControl::Open(QWidget *host, const QRect &rect, const TagList 
         return false;
     Label()->setAlignment(Qt::AlignLeft);
     Label()->setWordWrap(false);
-    Label()->show();
+    ShowChild(Label());
     SetupTree();
-    mTree->show();
+    ShowChild(mTree);
     if (Input *in = GetCurrentInput()) {
         const AutoParameter now(in->GetValue(GetCurrentTime()));
         Hold(now);

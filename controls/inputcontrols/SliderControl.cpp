@@ -39,7 +39,7 @@ SliderControl::SliderControl(const Registry *reg, const ScriptVal &args, const T
     mEdit->setObjectName("edit");
     mSlider->setObjectName("slider");
     connect(mSlider, SIGNAL(ValueChanged(float64)), this, SLOT(OnValueChanged(float64)));
-    connect(mEdit, SIGNAL(digitChanged(TimeCodeEdit *)), this, SLOT(OnDigitEdit()));
+    connect(mEdit, SIGNAL(digitChanged(TimeCodeEdit *)), this, SLOT(OnDigitEdit())); // normalised: found at once
     connect(mEdit, SIGNAL(editingFinished()), this, SLOT(OnOK()));
     connect(mEdit, SIGNAL(textEdited(QString)), this, SLOT(OnValueEdit()));
     // Dragging the edit box sideways drives the slider.
@@ -234,10 +234,9 @@ bool SliderControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
 {
     if (!LabelledInputControl::Open(host, rect, tags))
         return false;
-    for (QWidget *child :
-         {static_cast<QWidget *>(Label()), static_cast<QWidget *>(mEdit), static_cast<QWidget *>(mCaptions[0]),
-          static_cast<QWidget *>(mCaptions[1]), static_cast<QWidget *>(mCaptions[2])})
-        child->setFont(GetControlFont());
+    // The children have the control font already: the control takes it
+    // before it makes them, and they inherit it. Setting it on each again
+    // would lay out every text once more.
     if (GetCurrentInput()) {
         const AutoNumber now(GetCurrentInput(), GetCurrentTime());
         if (now)
@@ -246,9 +245,9 @@ bool SliderControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
     ApplyKnobStyle();
     mEdit->SetValue(mValue, mPlaces);
     mSlider->SetValue(mValue, false);
-    Label()->show();
-    mEdit->show();
-    mSlider->show();
+    ShowChild(Label());
+    ShowChild(mEdit);
+    ShowChild(mSlider);
     PlaceChildren(ClassLayout(kLayoutItem), true);
     mKnobStyleChanged = false;
     return true;

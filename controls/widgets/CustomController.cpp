@@ -119,9 +119,11 @@ void CustomController::AttachEdit(TimeCodeEdit *edit)
     if (!edit)
         return;
     edit->SetVirtual(true);
-    connect(edit, "2StartDrag(TimeCodeEdit *)", this, "1OnEditStartDrag(TimeCodeEdit *)");
-    connect(edit, "2EndDrag(TimeCodeEdit *)", this, "1OnEditEndDrag(TimeCodeEdit *)");
-    connect(edit, "2Drag(float64, TimeCodeEdit *)", this, "1OnEditDrag(float64, TimeCodeEdit *)");
+    // Spelt in Qt's normalised form, which it finds at once; any other
+    // spelling is looked up, normalised and looked up again, on every slider.
+    connect(edit, "2StartDrag(TimeCodeEdit*)", this, "1OnEditStartDrag(TimeCodeEdit*)");
+    connect(edit, "2EndDrag(TimeCodeEdit*)", this, "1OnEditEndDrag(TimeCodeEdit*)");
+    connect(edit, "2Drag(float64,TimeCodeEdit*)", this, "1OnEditDrag(float64,TimeCodeEdit*)");
 }
 
 void CustomController::SetTrackRect(const OrbRectT<int32> &rect)

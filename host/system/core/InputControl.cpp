@@ -30,6 +30,9 @@ InputControl::InputControl(const Registry *reg, const ScriptVal &args, const Tag
     : _InputControl(reg, args, tags), mControlFont(Theme::ControlFont())
 {
     mDisabled = GetDisabledTags(tags, false);
+    // Before a subclass makes its children, so that they are born with the
+    // control font instead of each being told of it again when Open sets it.
+    setFont(mControlFont);
 }
 
 InputControl::~InputControl()

@@ -44,12 +44,16 @@ QLineEdit *InputControl::MakeExpressionEdit(int32 index)
         return edit;
     mExpressionEdits.resize(mInputs.size());
     mExpressions.resize(mInputs.size());
+    // A child of the control, so it has the control font already. Most
+    // Inputs have no expression: an empty field is left without text, as
+    // setting even an empty text lays the line out again.
     auto *edit = new QLineEdit(this);
     edit->setObjectName("expression");
-    edit->setFont(mControlFont);
     edit->setPlaceholderText("Expression");
-    edit->setText(QString::fromStdString(mExpressions[std::size_t(index)].str()));
-    edit->setVisible(!mExpressions[std::size_t(index)].IsEmpty());
+    const OrbString &expression = mExpressions[std::size_t(index)];
+    if (!expression.IsEmpty())
+        edit->setText(QString::fromStdString(expression.str()));
+    edit->setVisible(!expression.IsEmpty());
     edit->installEventFilter(this);
     connect(edit, SIGNAL(returnPressed()), this, SLOT(OnExpressionEntered()));
     mExpressionEdits[std::size_t(index)] = edit;
