@@ -115,7 +115,7 @@ void FileControlTest::choose()
         auto *dialog = c->findChild<QFileDialog *>("browseDialog");
         QVERIFY(dialog);
         dialog->selectFile(path);
-        dialog->accept();
+        QMetaObject::invokeMethod(dialog, "accept");
     }
     QCOMPARE(TextOf(f, in), path);
     QCOMPARE(f.doc.UndoNames(), QStringList{"Change Plate"});
