@@ -151,7 +151,8 @@ void ClipControl::Detect()
     if (mDetected)
         return;
     const QString path = QString::fromStdString(mPath.str());
-    mClip = path.isEmpty() ? ClipSequence() : ClipSequence::Detect(PathChooser::Resolve(path, QString()));
+    mClip = path.isEmpty() ? ClipSequence()
+                           : ClipSequence::Detect(PathChooser::Resolve(path, PathChooser::CompFolder(GetDoc())));
     mDetected = true;
 }
 
@@ -193,7 +194,7 @@ bool ClipControl::WriteFrame(Input *input, int32 frame)
 
 void ClipControl::OnChosen(const QString &path)
 {
-    const ClipSequence clip = ClipSequence::Detect(PathChooser::Resolve(path, QString()));
+    const ClipSequence clip = ClipSequence::Detect(PathChooser::Resolve(path, PathChooser::CompFolder(GetDoc())));
     const QString stored = clip.IsSequence() && !clip.IsEmpty() ? clip.pattern : path;
     const AutoText text(OrbString(stored.toStdString()));
     mGesture.Write(GetCurrentInput(), text, UndoName());

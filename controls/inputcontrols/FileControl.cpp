@@ -6,8 +6,6 @@
 
 #include "orbane/AutoParam.h"
 #include "orbane/ElideLabel.h"
-#include "orbane/OrbaneDoc.h"
-#include "orbane/Prefs.h"
 #include "orbane/Text.h"
 
 #include <QDir>
@@ -112,22 +110,16 @@ QString FileControl::MissingReason(const QString &path, bool save, bool folder)
     return info.isFile() ? QString() : "No such file: " + path;
 }
 
-QString FileControl::CompFolder() const
-{
-    const OrbaneDoc *doc = GetDoc();
-    return doc ? QString::fromUtf8(doc->GetPrefs().GetString(PREF_CompFolder, "")) : QString();
-}
-
 void FileControl::ShowPath()
 {
     const QString path = QString::fromStdString(mPath.str());
-    const QString why = MissingReason(PathChooser::Resolve(path, CompFolder()), mSave, mDirectory);
+    const QString why = MissingReason(PathChooser::Resolve(path, PathChooser::CompFolder(GetDoc())), mSave, mDirectory);
     mChooser->Show(path, !why.isEmpty(), why);
 }
 
 void FileControl::OnChosen(const QString &path)
 {
-    const OrbString stored(PathChooser::Stored(path, CompFolder(), mRelative).toStdString());
+    const OrbString stored(PathChooser::Stored(path, PathChooser::CompFolder(GetDoc()), mRelative).toStdString());
     if (stored != mPath) {
         const AutoText text(stored);
         SetInputs(text, GetCurrentTime(), 0, false, nullptr);

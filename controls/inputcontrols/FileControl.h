@@ -38,7 +38,6 @@ private slots:
 
 private:
     void ReadOwnTags(const TagList &tags);
-    QString CompFolder() const;
     void ShowPath();
 
     OrbString mPath;

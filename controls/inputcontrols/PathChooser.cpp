@@ -1,5 +1,8 @@
 #include "inputcontrols/PathChooser.h"
 
+#include "orbane/OrbaneDoc.h"
+#include "orbane/Prefs.h"
+
 #include <QDir>
 #include <QDragEnterEvent>
 #include <QDropEvent>
@@ -70,6 +73,11 @@ QString PathChooser::Stored(const QString &path, const QString &folder, bool rel
     if (!relative || path.isEmpty() || !QDir::isAbsolutePath(path))
         return path;
     return QDir(folder.isEmpty() ? QDir::currentPath() : folder).relativeFilePath(path);
+}
+
+QString PathChooser::CompFolder(const OrbaneDoc *doc)
+{
+    return doc ? QString::fromUtf8(doc->GetPrefs().GetString(PREF_CompFolder, "")) : QString();
 }
 
 void PathChooser::OnEdited()

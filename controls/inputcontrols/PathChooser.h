@@ -11,6 +11,8 @@ class QWidget;
 
 namespace Orbane {
 
+class OrbaneDoc;
+
 // The path part of the file and clip controls: an edit box ("edit") that
 // takes a typed path on Enter, a browse button ("browse") that opens a file
 // dialog, and drops of a file anywhere on the owning control. Whichever way
@@ -46,6 +48,9 @@ public:
     // What to write for a path the user gave: with `relative`, an absolute
     // path is written relative to `folder`.
     static QString Stored(const QString &path, const QString &folder, bool relative);
+    // Where relative paths start: the folder of the document's comp, or
+    // empty (the current directory).
+    static QString CompFolder(const OrbaneDoc *doc);
 
 signals:
     void Chosen(const QString &path);
