@@ -17,6 +17,11 @@ bool InputGesture::Write(Input *input, Parameter *value, const OrbString &name)
     return input->SetValue(value, mOwner.GetCurrentTime(), 0, nullptr);
 }
 
+OrbString InputGesture::StepName(const InputControl &control)
+{
+    return OrbString("Change " + InputControl::LabelOf(control.GetCurrentInput()).str());
+}
+
 void InputGesture::End()
 {
     if (OrbaneDoc *doc = mDoc.data()) {

@@ -32,6 +32,9 @@ public:
     void End();
     bool IsOpen() const { return !mDoc.isNull(); }
 
+    // The name the base gives a gesture of `control`: "Change <label>".
+    static OrbString StepName(const InputControl &control);
+
 private:
     const InputControl &mOwner;
     QPointer<OrbaneDoc> mDoc;

@@ -181,15 +181,10 @@ void ClipControl::ShowTrims()
     mOutBox->setValue(mOut);
 }
 
-OrbString ClipControl::UndoName() const
-{
-    return OrbString("Change " + GetLabelTexts().label.str());
-}
-
 bool ClipControl::WriteFrame(Input *input, int32 frame)
 {
     const AutoNumber number{float64(frame)};
-    return mGesture.Write(input, number, UndoName());
+    return mGesture.Write(input, number, InputGesture::StepName(*this));
 }
 
 void ClipControl::OnChosen(const QString &path)
@@ -197,7 +192,7 @@ void ClipControl::OnChosen(const QString &path)
     const ClipSequence clip = ClipSequence::Detect(PathChooser::Resolve(path, PathChooser::CompFolder(GetDoc())));
     const QString stored = clip.IsSequence() && !clip.IsEmpty() ? clip.pattern : path;
     const AutoText text(OrbString(stored.toStdString()));
-    mGesture.Write(GetCurrentInput(), text, UndoName());
+    mGesture.Write(GetCurrentInput(), text, InputGesture::StepName(*this));
     if (clip.IsSequence() && !clip.IsEmpty()) {
         WriteFrame(mInInput, clip.first);
         WriteFrame(mOutInput, clip.last);

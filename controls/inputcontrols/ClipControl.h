@@ -50,7 +50,6 @@ private:
     void ShowClip();
     void ShowTrims();
     bool WriteFrame(Input *input, int32 frame);
-    OrbString UndoName() const;
 
     OrbString mPath;
     OrbString mFilter;

@@ -204,11 +204,6 @@ void FontfileControl::FillStyles()
     mStyles->setCurrentIndex(std::max(0, mStyles->findData(style)));
 }
 
-OrbString FontfileControl::UndoName() const
-{
-    return OrbString("Change " + GetLabelTexts().label.str());
-}
-
 // A new family keeps the style where it has it; both are one step.
 void FontfileControl::OnFamily(int row)
 {
@@ -216,10 +211,10 @@ void FontfileControl::OnFamily(int row)
     if (family == ToQString(mFamily))
         return;
     const AutoText familyText(OrbString(family.toStdString()));
-    mGesture.Write(GetCurrentInput(), familyText, UndoName());
+    mGesture.Write(GetCurrentInput(), familyText, InputGesture::StepName(*this));
     if (mStyleInput) {
         const AutoText styleText(OrbString(StyleFor(family, ToQString(mStyle)).toStdString()));
-        mGesture.Write(mStyleInput, styleText, UndoName());
+        mGesture.Write(mStyleInput, styleText, InputGesture::StepName(*this));
     }
     mGesture.End();
 }
@@ -230,7 +225,7 @@ void FontfileControl::OnStyle(int row)
     if (style == ToQString(mStyle))
         return;
     const AutoText styleText(OrbString(style.toStdString()));
-    mGesture.Write(mStyleInput, styleText, UndoName());
+    mGesture.Write(mStyleInput, styleText, InputGesture::StepName(*this));
     mGesture.End();
 }
 

@@ -52,7 +52,6 @@ private slots:
 private:
     void ReadOwnTags(const TagList &tags);
     void ShowFont();
-    OrbString UndoName() const;
 
     OrbString mFamily;
     OrbString mStyle;

@@ -174,8 +174,8 @@ OrbString RangeControl::UndoName(RangeLimits::End moved) const
 {
     const OrbString &name = moved == RangeLimits::End_Low    ? mLowName
                             : moved == RangeLimits::End_High ? mHighName
-                                                             : GetLabelTexts().label;
-    return OrbString("Change " + (name.IsEmpty() ? GetLabelTexts().label : name).str());
+                                                             : OrbString();
+    return name.IsEmpty() ? InputGesture::StepName(*this) : OrbString("Change " + name.str());
 }
 
 // Only the ends that really change are written; without a high Input the

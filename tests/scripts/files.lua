@@ -70,3 +70,13 @@ orbane.Undo()
 check.eq(value("Plate"), "images/dusk.png", "undo takes the whole choice back")
 check.eq(value("PlateOut"), 0, "with its trims")
 os.execute("rm -r " .. folder)
+
+-- Bad tags are errors naming the tag; good ones read back by name.
+check.fails(function() orbane.Create("RangeControl", { RNGC_TickCount = "many" }) end, "RNGC_TickCount",
+  "a text for a number tag")
+check.fails(function() orbane.Create("FileControl", { FC_Savefile = true }) end, "FC_Savefile", "a misspelt tag")
+local range = orbane.Create("RangeControl", { RNGCD_MinSpan = 0.1, RNGCS_LowName = "In" })
+check.eq(range:GetAttrs().RNGCD_MinSpan, 0.1, "the least span read back")
+check.eq(range:GetAttrs().RNGCS_LowName, "In", "the low end's name read back")
+check.eq(orbane.Create("FontFileControl", { FFCS_PreviewText = "Aa" }):GetAttrs().FFCS_PreviewText, "Aa",
+  "the font's preview text read back")
