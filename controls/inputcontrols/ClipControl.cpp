@@ -43,18 +43,12 @@ int32 FrameOf(const Parameter *value, int32 current)
 } // namespace
 
 ClipControl::ClipControl(const Registry *reg, const ScriptVal &args, const TagList &tags)
-    : LabelledInputControl(reg, args, tags), mGesture(*this), mChooser(new PathChooser(this)),
-      mInBox(MakeFrameBox(this, "in", "First frame used")), mOutBox(MakeFrameBox(this, "out", "Last frame used")),
-      mFrames(new QLabel(this))
+    : LabelledInputControl(reg, args, tags), mGesture(*this), mChooser(new PathChooser(this)), mFrames(new QLabel(this))
 {
     mFrames->setObjectName("frames");
     connect(mChooser, SIGNAL(Chosen(QString)), this, SLOT(OnChosen(QString)));
-    connect(mInBox, SIGNAL(valueChanged(int)), this, SLOT(OnIn(int)));
-    connect(mOutBox, SIGNAL(valueChanged(int)), this, SLOT(OnOut(int)));
     RegisterChild("edit", mChooser->Edit());
     RegisterChild("browse", mChooser->Browse());
-    RegisterChild("in", mInBox);
-    RegisterChild("out", mOutBox);
     RegisterChild("frames", mFrames);
     Label()->setFocusProxy(mChooser->Edit());
     ListAttr(CLCS_Filter, &mFilter);
@@ -75,8 +69,26 @@ void ClipControl::LinkTrimInputs(const TagList &tags)
 {
     const bool in = LinkInput(*this, tags, CLCP_InInput, mInInput);
     const bool out = LinkInput(*this, tags, CLCP_OutInput, mOutInput);
+    // Trims linked once the control is open need their boxes placed.
+    if ((in || out) && IsOpen() && MakeTrimBoxes())
+        PlaceChildren(ClassLayout(kLayoutItem), false);
     if (in || out)
         ReadTrims();
+}
+
+// The boxes are made only for a clip with trim Inputs: a spin box costs as
+// much to build as the rest of the control.
+bool ClipControl::MakeTrimBoxes()
+{
+    if (mInBox || (!mInInput && !mOutInput))
+        return false;
+    mInBox = MakeFrameBox(this, "in", "First frame used");
+    mOutBox = MakeFrameBox(this, "out", "Last frame used");
+    connect(mInBox, SIGNAL(valueChanged(int)), this, SLOT(OnIn(int)));
+    connect(mOutBox, SIGNAL(valueChanged(int)), this, SLOT(OnOut(int)));
+    RegisterChild("in", mInBox);
+    RegisterChild("out", mOutBox);
+    return true;
 }
 
 void ClipControl::ReadTrims()
@@ -114,6 +126,7 @@ bool ClipControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
     for (QWidget *child : {static_cast<QWidget *>(Label()), static_cast<QWidget *>(mChooser->Edit()),
                            static_cast<QWidget *>(mChooser->Browse()), static_cast<QWidget *>(mFrames)})
         child->show();
+    MakeTrimBoxes();
     ShowClip();
     PlaceChildren(ClassLayout(kLayoutItem), false);
     return true;
@@ -171,6 +184,8 @@ void ClipControl::ShowClip()
 // (frames removed from disk since) is shown as it is, not rewritten.
 void ClipControl::ShowTrims()
 {
+    if (!mInBox)
+        return;
     const bool trims = mClip.IsSequence() && !mClip.IsEmpty();
     const QSignalBlocker blockIn(mInBox), blockOut(mOutBox);
     mInBox->setVisible(mInInput && trims);

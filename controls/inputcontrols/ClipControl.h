@@ -19,7 +19,7 @@ class PathChooser;
 // used. The frames on disk are found whenever the path changes; choosing a
 // clip (typed, browsed or dropped) sets the trim to all its frames in the
 // same undo step. The trim boxes ("in", "out") keep in <= out inside the
-// frames found.
+// frames found; they are made only where there are trim Inputs.
 class ClipControl : public LabelledInputControl
 {
     Q_OBJECT
@@ -45,6 +45,7 @@ private slots:
 private:
     void ReadOwnTags(const TagList &tags);
     void LinkTrimInputs(const TagList &tags);
+    bool MakeTrimBoxes();
     void ReadTrims();
     void Detect();
     void ShowClip();
@@ -61,8 +62,8 @@ private:
     Input *mOutInput = nullptr;
     InputGesture mGesture;
     PathChooser *mChooser;
-    QSpinBox *mInBox;
-    QSpinBox *mOutBox;
+    QSpinBox *mInBox = nullptr;
+    QSpinBox *mOutBox = nullptr;
     QLabel *mFrames;
 };
 
