@@ -16,6 +16,8 @@ const std::vector<Goal> &Goals()
         {"P3", "drag move to three bound controls", "BM_SliderControl_Drag/3", "BM_QSliderSpinBox_Drag/3", 2.0,
          "a QSlider to QDoubleSpinBox signal"},
         {"P5", "load the control library and register every class", "BM_ControlLibrary_Load", nullptr, 2.0, ""},
+        {"P1d", "inspector build, 500 mixed file, font, clip, range and slider controls", "BM_Inspector_BuildMixed/500",
+         "BM_StockRows_Build/500", 1.0, "stock Qt rows"},
         {"V1", "hover over 100 rectangles and 100 angle dials, one mouse event", "BM_Viewer_HoverShapes/100/100",
          nullptr, 0.5, ""},
     };

@@ -11,6 +11,7 @@
 #include "orbane/OrbaneDoc.h"
 #include "orbane/ParameterPanel.h"
 #include "orbane/Tags.h"
+#include "orbane/Text.h"
 
 #include <benchmark/benchmark.h>
 
@@ -41,6 +42,36 @@ Operator *AddSliderTool(OrbaneDoc &doc, const char *name, int count)
     for (int i = 0; i < count; ++i) {
         const std::string id = "Value" + std::to_string(i + 1);
         tool->AddInput(OrbID(id.c_str()), id.c_str(), CLSID_DataType_Number, attrs, AutoNumber(0.5));
+    }
+    return tool;
+}
+
+// A tool of `count` controls, the file, font, clip and range controls and
+// the slider in turn; each range has a second Input, shown by no control.
+Operator *AddMixedTool(OrbaneDoc &doc, const char *name, int count)
+{
+    Operator *tool = new Operator(name, "Bench");
+    doc.AddTool(tool);
+    tool->DecRef();
+    const char *const texts[3][2] = {
+        {"FileControl", "images/dusk.png"}, {"FontFileControl", "DejaVu Sans"}, {"ClipControl", "plate.####.exr"}};
+    for (int i = 0; i < count; ++i) {
+        const std::string id = "Value" + std::to_string(i + 1);
+        const OrbID oid(id.c_str());
+        if (i % 5 < 3) {
+            const TagList attrs{{INPA_InputControl, OrbID(texts[i % 5][0])}};
+            tool->AddInput(oid, id.c_str(), CLSID_DataType_Text, attrs, AutoText(texts[i % 5][1]));
+        } else if (i % 5 == 3) {
+            const std::string high = id + "High";
+            Input *end =
+                tool->AddInput(OrbID(high.c_str()), high.c_str(), CLSID_DataType_Number, TagList(), AutoNumber(0.8));
+            const TagList attrs{{INPA_InputControl, OrbID("RangeControl")},
+                                {0x40050000, static_cast<ScriptObject *>(end)}};
+            tool->AddInput(oid, id.c_str(), CLSID_DataType_Number, attrs, AutoNumber(0.2));
+        } else {
+            const TagList attrs{{INPA_InputControl, OrbID("SliderControl")}};
+            tool->AddInput(oid, id.c_str(), CLSID_DataType_Number, attrs, AutoNumber(0.5));
+        }
     }
     return tool;
 }
@@ -92,6 +123,22 @@ void BM_Inspector_Build(benchmark::State &state)
     state.counters["built"] = double(built);
 }
 BENCHMARK(BM_Inspector_Build)->Arg(500)->Arg(2000)->Unit(benchmark::kMillisecond);
+
+// The same for a tool of mixed controls, every one built.
+void BM_Inspector_BuildMixed(benchmark::State &state)
+{
+    if (!LoadControlModule())
+        return state.SkipWithError("the control library did not load");
+    Inspector in(3);
+    Operator *mixed = AddMixedTool(in.doc, "Mixed", int(state.range(0)));
+    for (auto _ : state) {
+        ShowAllAndSettle(in.panel, mixed);
+        state.PauseTiming();
+        ShowAndSettle(in.panel, nullptr);
+        state.ResumeTiming();
+    }
+}
+BENCHMARK(BM_Inspector_BuildMixed)->Arg(500)->Unit(benchmark::kMillisecond);
 
 void BM_Inspector_Teardown(benchmark::State &state)
 {

@@ -5,7 +5,11 @@
 
 #include "inputcontrols/ButtonControl.h"
 #include "inputcontrols/CheckBoxControl.h"
+#include "inputcontrols/ClipControl.h"
 #include "inputcontrols/ComboControl.h"
+#include "inputcontrols/FileControl.h"
+#include "inputcontrols/FontfileControl.h"
+#include "inputcontrols/RangeControl.h"
 #include "inputcontrols/ScriptValListControl.h"
 #include "inputcontrols/SliderControl.h"
 #include "overlays/AngleControl.h"
@@ -36,7 +40,6 @@ namespace Orbane {
 ORBANE_PENDING_PREVIEW(TransformControl);
 ORBANE_PENDING_DERIVED(CameraControl, TransformControl);
 ORBANE_PENDING_INPUT(CheckListControl);
-ORBANE_PENDING_INPUT(ClipControl);
 ORBANE_PENDING_INPUT(ColorControl);
 ORBANE_PENDING_INPUT(ColorGamutControl);
 ORBANE_PENDING_INPUT(ColorRangesControl);
@@ -45,8 +48,6 @@ ORBANE_PENDING_INPUT(ColorWheelControl);
 ORBANE_PENDING_PREVIEW(CropControl);
 ORBANE_PENDING_INPUT(CustomFilterControl);
 ORBANE_PENDING_PREVIEW(EllipseControl);
-ORBANE_PENDING_INPUT(FileControl);
-ORBANE_PENDING_INPUT(FontfileControl);
 ORBANE_PENDING_INPUT(GammaControl);
 ORBANE_PENDING_INPUT(GradientControl);
 ORBANE_PENDING_INPUT(HistogramControl);
@@ -65,7 +66,6 @@ ORBANE_PENDING_INPUT(OffsetControl);
 ORBANE_PENDING_INPUT(PatternControl);
 ORBANE_PENDING_PREVIEW(PolyLineControl);
 ORBANE_PENDING_PREVIEW(PositionerControl);
-ORBANE_PENDING_INPUT(RangeControl);
 ORBANE_PENDING_INPUT(ScrewControl);
 ORBANE_PENDING_DERIVED(SliderOverlay, OverlayControl);
 ORBANE_PENDING_INPUT(SplineControl);

@@ -8,13 +8,17 @@
 #include "framework/AngleTags.h"
 #include "framework/ButtonTags.h"
 #include "framework/CheckBoxTags.h"
+#include "framework/ClipTags.h"
 #include "framework/ComboTags.h"
 #include "framework/ControlClasses.h"
 #include "framework/ControlRegistration.h"
 #include "framework/CrosshairTags.h"
 #include "framework/FFICasts.h"
+#include "framework/FileTags.h"
+#include "framework/FontfileTags.h"
 #include "framework/ListTags.h"
 #include "framework/PointTags.h"
+#include "framework/RangeTags.h"
 #include "framework/RectangleTags.h"
 #include "framework/SliderTags.h"
 #include "framework/VariantRegistration.h"
@@ -73,7 +77,7 @@ ControlRegistration<CameraControl, TransformControl> gCamera{D::Preview("CameraC
 ControlRegistration<CheckBoxControl> gCheckBox{
     D::Input("CheckBoxControl", CLSID_InputControl_Checkbox).Script("CheckboxControl").Tags<CheckBoxControlTags>()};
 ControlRegistration<CheckListControl> gCheckList{D::Input("CheckListControl")};
-ControlRegistration<ClipControl> gClip{D::Input("ClipControl")};
+ControlRegistration<ClipControl> gClip{D::Input("ClipControl").Tags<ClipControlTags>()};
 ControlRegistration<ColorControl> gColor{D::Input("ColorControl")};
 ControlRegistration<ColorGamutControl> gColorGamut{D::Input("ColorGamutControl")};
 ControlRegistration<ColorRangesControl> gColorRanges{D::Input("ColorRangesControl")};
@@ -85,9 +89,11 @@ ControlRegistration<CropControl> gCrop{D::Preview("CropControl", CLSID_PreviewCo
 ControlRegistration<CrosshairControl> gCrosshair{D::Preview("CrosshairControl").Tags<CrosshairControlTags>()};
 ControlRegistration<CustomFilterControl> gCustomFilter{D::Input("CustomFilterControl")};
 ControlRegistration<EllipseControl> gEllipse{D::Preview("EllipseControl").Cleanup(&EllipseControl::RegCleanup)};
-ControlRegistration<FileControl> gFile{D::Input("FileControl")};
-ControlRegistration<FontfileControl> gFontfile{
-    D::Input("FontfileControl", "FontFileControl").Script("FontFileControl").Cleanup(&FontfileControl::RegCleanup)};
+ControlRegistration<FileControl> gFile{D::Input("FileControl").Tags<FileControlTags>()};
+ControlRegistration<FontfileControl> gFontfile{D::Input("FontfileControl", "FontFileControl")
+                                                   .Script("FontFileControl")
+                                                   .Tags<FontfileControlTags>()
+                                                   .Cleanup(&FontfileControl::RegCleanup)};
 ControlRegistration<GammaControl> gGamma{D::Input("GammaControl")};
 ControlRegistration<GradientControl> gGradient{D::Input("GradientControl")};
 ControlRegistration<HistogramControl> gHistogram{D::Input("HistogramControl")};
@@ -116,7 +122,7 @@ ControlRegistration<PointControl> gPoint{D::Preview("PointControl").Tags<PointCo
 ControlRegistration<PolyLineControl> gPolyLine{
     D::Preview("PolyLineControl", "PolylineControl").Script("PolylineControl").Tags<PolyLineControlTags>()};
 ControlRegistration<PositionerControl> gPositioner{D::Preview("PositionerControl")};
-ControlRegistration<RangeControl> gRange{D::Input("RangeControl")};
+ControlRegistration<RangeControl> gRange{D::Input("RangeControl").Tags<RangeControlTags>()};
 ControlRegistration<RectangleControl> gRectangle{D::Preview("RectangleControl").Tags<RectangleControlTags>()};
 ControlRegistration<ScrewControl> gScrew{D::Input("ScrewControl")};
 ControlRegistration<ScriptValListControl> gScriptValList{D::Input("ScriptValListControl").Tags<ListControlTags>()};

@@ -19,6 +19,9 @@ enum PrefTag : Tag
     // The width of one pixel of that image over its height (a comp's
     // `pixelAspect`; 2 for a 2:1 squeeze). None or not positive: 1.
     PREF_ViewerPixelAspect = MakeTag(TAGTYPE_Double, TAGGROUP_Prefs, 3),
+    // The folder of the comp file loaded last: file Inputs asked to be
+    // relative are relative to it. None: the current directory.
+    PREF_CompFolder = MakeTag(TAGTYPE_String, TAGGROUP_Prefs, 4),
 };
 
 } // namespace Orbane

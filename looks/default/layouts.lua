@@ -120,4 +120,52 @@ return {
             expression(),
         },
     },
+    -- The path across the row, the browse button at its end.
+    ["Controls.File.Layout"] = {
+        { kind = "hbox", spacing = 4,
+            label(),
+            { name = "edit", stretch = 1, minwidth = 60 },
+            { name = "browse", width = 24 },
+        },
+    },
+
+    -- The path row, then what was found on disk and the trim boxes.
+    ["Controls.Clip.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 4,
+                label(),
+                { name = "edit", stretch = 1, minwidth = 60 },
+                { name = "browse", width = 24 },
+            },
+            { kind = "hbox", spacing = 4,
+                { name = "frames", stretch = 1 },
+                { name = "in", width = 70 },
+                { name = "out", width = 70 },
+            },
+        },
+    },
+
+    -- Family and style side by side, the preview line under them.
+    ["Controls.Fontfile.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 4,
+                label(),
+                { name = "family", stretch = 3, minwidth = 60 },
+                { name = "style", stretch = 2, minwidth = 40 },
+            },
+            { name = "preview", minheight = 18 },
+        },
+    },
+
+    -- Label and the two ends on one line, the track across the width.
+    ["Controls.Range.Layout"] = {
+        { kind = "vbox", spacing = 1,
+            { kind = "hbox", spacing = 4,
+                { name = "label", stretch = 1 },
+                { name = "low", width = 64 },
+                { name = "high", width = 64 },
+            },
+            { name = "span", height = 20 },
+        },
+    },
 }

@@ -309,6 +309,7 @@ bool ToolLoader::LoadComp(OrbaneDoc &doc, const std::string &path, std::string *
             return false;
         }
     }
+    doc.SetPref(PREF_CompFolder, base.absolutePath().toStdString());
     if (const ScriptVal *time = comp.FindKeyConst(ScriptVal("time")))
         doc.SetCurrentTime(time->GetNumber());
     // The pixel aspect first, so the image is fitted with it.
