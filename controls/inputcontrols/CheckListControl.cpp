@@ -177,13 +177,13 @@ bool CheckListControl::UpdateDisplay(Input *input, const TagList *tags)
 
 void CheckListControl::Write(uint64 bits)
 {
-    if (bits == mBits) {
-        ShowBits();
-        return;
+    if (bits != mBits) {
+        mBits = bits;
+        SetInputs(AutoNumber(float64(bits)), GetCurrentTime(), 0, false, nullptr);
+        ResetUndo(nullptr);
     }
-    mBits = bits;
-    SetInputs(AutoNumber(float64(bits)), GetCurrentTime(), 0, false, nullptr);
-    ResetUndo(nullptr);
+    // The write's notice finds the bits already shown here: show them now.
+    ShowBits();
 }
 
 void CheckListControl::OnBoxToggled()

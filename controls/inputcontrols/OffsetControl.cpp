@@ -109,6 +109,8 @@ void OffsetControl::Write(float64 x, float64 y)
     mX = x;
     mY = y;
     SetInputs(AutoPoint(x, y), GetCurrentTime(), 0, false, nullptr);
+    // The write's notice finds the point already cached: show it here.
+    ShowValue();
 }
 
 void OffsetControl::OnTyped()

@@ -264,14 +264,16 @@ TEST(TagMaps, PublishedMapsAreWellFormed)
         ExpectRowsWellFormed(map->Table());
     }
     const std::map<std::string, int> published = {
-        {"AngleControl", 16},  {"ButtonControl", 2},    {"CheckboxControl", 1},   {"ComboControl", 5},
-        {"ComboIDControl", 5}, {"CrosshairControl", 7}, {"ListControl", 4},       {"ListIDControl", 4},
-        {"PointControl", 4},   {"PolylineControl", 56}, {"RectangleControl", 35}, {"ScriptValListControl", 4},
-        {"SliderControl", 4}};
+        {"AngleControl", 16},        {"ButtonControl", 2},  {"CheckboxControl", 1},     {"CheckListControl", 7},
+        {"ComboControl", 5},         {"ComboIDControl", 5}, {"CrosshairControl", 7},    {"LabelControl", 10},
+        {"ListControl", 4},          {"ListIDControl", 4},  {"MultiButtonControl", 33}, {"MultiButtonIDControl", 33},
+        {"OffsetControl", 2},        {"PointControl", 4},   {"PolylineControl", 56},    {"RectangleControl", 35},
+        {"ScriptValListControl", 4}, {"ScrewControl", 1},   {"SliderControl", 4}};
     EXPECT_EQ(counts, published);
     const auto table = [](const char *type) { return FFITagMap::ForType(FFIType::FindScriptName(type))->Table(); };
     EXPECT_EQ(table("ComboIDControl"), table("ComboControl")) << "variants share their primary's table";
     EXPECT_EQ(table("ListIDControl"), table("ListControl"));
+    EXPECT_EQ(table("MultiButtonIDControl"), table("MultiButtonControl"));
     EXPECT_EQ(table("ScriptValListControl"), table("ListControl"));
 }
 
