@@ -18,6 +18,8 @@ const std::vector<Goal> &Goals()
         {"P5", "load the control library and register every class", "BM_ControlLibrary_Load", nullptr, 2.0, ""},
         {"V1", "hover over 100 rectangles and 100 angle dials, one mouse event", "BM_Viewer_HoverShapes/100/100",
          nullptr, 0.5, ""},
+        {"P1d", "inspector build, 500 button rows, lists, check lists, offsets, screws and labels",
+         "BM_Inspector_BuildMixed/500", "BM_StockMixedRows_Build/500", 1.0, "stock Qt rows"},
     };
     return goals;
 }
