@@ -77,15 +77,11 @@ bool CheckListControl::SetAttrsTagList(Input *input, const TagList &tags)
 bool CheckListControl::AddInput(Input *input, const TagList *tags)
 {
     // The boxes belong to the first Input; further ones share them.
-    if (input && !GetCurrentInput()) {
+    if (IsFirstInput(input)) {
         mChoice.Read(input);
         MakeBoxes();
     }
-    if (!InputControl::AddInput(input, tags))
-        return false;
-    if (GetCurrentInput() == input)
-        ReadTexts(input);
-    return true;
+    return BindKeepingFirstTexts(input, tags);
 }
 
 void CheckListControl::MakeBoxes()

@@ -66,16 +66,11 @@ bool ComboControl::SetAttrsTagList(Input *input, const TagList &tags)
 bool ComboControl::AddInput(Input *input, const TagList *tags)
 {
     // The items belong to the first Input; further ones share them.
-    if (input && !GetCurrentInput()) {
+    if (IsFirstInput(input)) {
         mChoice.Read(input);
         FillRows();
     }
-    // The host's AddInput, not the base's: the texts, too, are the first Input's.
-    if (!InputControl::AddInput(input, tags))
-        return false;
-    if (GetCurrentInput() == input)
-        ReadTexts(input);
-    return true;
+    return BindKeepingFirstTexts(input, tags);
 }
 
 void ComboControl::FillRows()
@@ -116,12 +111,8 @@ void ComboControl::ShowTexts()
 
 bool ComboControl::NotifyChanged(Input *input, Parameter *value, const TagList *tags)
 {
-    if (!value)
-        return LabelledInputControl::NotifyChanged(input, value, tags);
-    const int32 selection = mChoice.SelectionFor(value);
-    if (selection == mSelection)
+    if (value && !mChoice.Follow(value, mSelection))
         return true;
-    mSelection = selection;
     return LabelledInputControl::NotifyChanged(input, value, tags);
 }
 

@@ -46,6 +46,15 @@ int32 ItemChoice::SelectionFor(const Parameter *value) const
     return id ? mItems.FindID(id->Value) : -1;
 }
 
+bool ItemChoice::Follow(const Parameter *value, int32 &selection) const
+{
+    const int32 chosen = SelectionFor(value);
+    if (chosen == selection)
+        return false;
+    selection = chosen;
+    return true;
+}
+
 AutoParameter ItemChoice::ValueOf(int32 index) const
 {
     const std::size_t i = std::size_t(index);

@@ -39,6 +39,9 @@ public:
     // The item a value chooses, or -1: the nearest within reach by value,
     // or the first with the identifier.
     int32 SelectionFor(const Parameter *value) const;
+    // Sets `selection` to the item `value` chooses; false where that is
+    // the one it held (the notify gate: nothing to show again).
+    bool Follow(const Parameter *value, int32 &selection) const;
     // The value that chooses item `index`; outside the items, 0 (plain) or
     // an empty identifier.
     AutoParameter ValueOf(int32 index) const;

@@ -61,17 +61,13 @@ bool ListControl::SetAttrsTagList(Input *input, const TagList &tags)
 bool ListControl::AddInput(Input *input, const TagList *tags)
 {
     // The items belong to the first Input; further ones share them.
-    if (input && !GetCurrentInput()) {
+    if (IsFirstInput(input)) {
         mChoice.Read(input);
         mMulti = !IsIDVariant() && input->GetAttrs().GetBool(LCA_MultiSelect, false);
         mList->setSelectionMode(mMulti ? QAbstractItemView::ExtendedSelection : QAbstractItemView::SingleSelection);
         FillRows();
     }
-    if (!InputControl::AddInput(input, tags))
-        return false;
-    if (GetCurrentInput() == input)
-        ReadTexts(input);
-    return true;
+    return BindKeepingFirstTexts(input, tags);
 }
 
 void ListControl::FillRows()
@@ -144,11 +140,8 @@ bool ListControl::NotifyChanged(Input *input, Parameter *value, const TagList *t
         if (bits == mBits)
             return true;
         mBits = bits;
-    } else {
-        const int32 selection = mChoice.SelectionFor(value);
-        if (selection == mSelection)
-            return true;
-        mSelection = selection;
+    } else if (!mChoice.Follow(value, mSelection)) {
+        return true;
     }
     return LabelledInputControl::NotifyChanged(input, value, tags);
 }

@@ -142,7 +142,7 @@ void MultiButtonControl::ReadExtras(const TagList &attrs)
 bool MultiButtonControl::AddInput(Input *input, const TagList *tags)
 {
     // The buttons belong to the first Input; further ones share them.
-    if (input && !GetCurrentInput()) {
+    if (IsFirstInput(input)) {
         mChoice.Read(input);
         {
             const LockableObject::ReadGuard guard(*input);
@@ -150,11 +150,7 @@ bool MultiButtonControl::AddInput(Input *input, const TagList *tags)
         }
         MakeButtons();
     }
-    if (!InputControl::AddInput(input, tags))
-        return false;
-    if (GetCurrentInput() == input)
-        ReadTexts(input);
-    return true;
+    return BindKeepingFirstTexts(input, tags);
 }
 
 void MultiButtonControl::MakeButtons()
@@ -228,7 +224,9 @@ void MultiButtonControl::StyleButtons()
     int32 widest = 0;
     for (QToolButton *button : mButtons) {
         StyleButton(button, button->property("item").toInt());
-        button->setStyleSheet(sheet);
+        // A style sheet, even an empty one, costs a polish of its own.
+        if (!sheet.isEmpty() || !button->styleSheet().isEmpty())
+            button->setStyleSheet(sheet);
         widest = std::max(widest, button->sizeHint().width());
     }
     if (mLook.widthMode == Width_Equal)
@@ -243,7 +241,8 @@ bool MultiButtonControl::SetAttrsTagList(Input *input, const TagList &tags)
     ReadLook(tags);
     if (IsOpen()) {
         StyleButtons();
-        Arrange(mColumnsShown);
+        if (GetLayout())
+            Arrange(mColumnsShown);
     }
     return LabelledInputControl::SetAttrsTagList(input, tags);
 }
@@ -260,7 +259,9 @@ bool MultiButtonControl::Open(QWidget *host, const QRect &rect, const TagList *t
     StyleButtons();
     for (QToolButton *button : mButtons)
         button->show();
-    Arrange(ColumnsFor(width()));
+    // Rows that follow the width are laid out when the width is known.
+    if (mLook.columns > 0)
+        Arrange(mLook.columns);
     ShowChoice();
     return true;
 }
@@ -314,7 +315,7 @@ void MultiButtonControl::Arrange(int32 columns)
 bool MultiButtonControl::SetSize(int32 &width, int32 &height, const TagList *tags)
 {
     const int32 columns = ColumnsFor(width);
-    if (IsOpen() && columns != mColumnsShown)
+    if (IsOpen() && (columns != mColumnsShown || !GetLayout()))
         Arrange(columns);
     return LabelledInputControl::SetSize(width, height, tags);
 }
@@ -330,12 +331,8 @@ void MultiButtonControl::ShowChoice()
 
 bool MultiButtonControl::NotifyChanged(Input *input, Parameter *value, const TagList *tags)
 {
-    if (!value)
-        return LabelledInputControl::NotifyChanged(input, value, tags);
-    const int32 selection = mChoice.SelectionFor(value);
-    if (selection == mSelection)
+    if (value && !mChoice.Follow(value, mSelection))
         return true;
-    mSelection = selection;
     return LabelledInputControl::NotifyChanged(input, value, tags);
 }
 
