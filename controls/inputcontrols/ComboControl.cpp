@@ -90,11 +90,7 @@ bool ComboControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
 {
     if (!LabelledInputControl::Open(host, rect, tags))
         return false;
-    if (Input *in = GetCurrentInput()) {
-        const AutoParameter now(in->GetValue(GetCurrentTime()));
-        if (now)
-            mSelection = mChoice.SelectionFor(now);
-    }
+    mSelection = mChoice.SelectionAt(GetCurrentInput(), GetCurrentTime(), mSelection);
     mCombo->ShowItem(mSelection);
     Label()->show();
     mCombo->show();

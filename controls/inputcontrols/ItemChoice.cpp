@@ -46,6 +46,12 @@ int32 ItemChoice::SelectionFor(const Parameter *value) const
     return id ? mItems.FindID(id->Value) : -1;
 }
 
+int32 ItemChoice::SelectionAt(Input *input, float64 time, int32 current) const
+{
+    const AutoParameter now(input ? input->GetValue(time) : nullptr);
+    return now ? SelectionFor(now) : current;
+}
+
 bool ItemChoice::Follow(const Parameter *value, int32 &selection) const
 {
     const int32 chosen = SelectionFor(value);

@@ -39,6 +39,9 @@ public:
     // The item a value chooses, or -1: the nearest within reach by value,
     // or the first with the identifier.
     int32 SelectionFor(const Parameter *value) const;
+    // The item the Input's value at `time` chooses; `current` where the
+    // Input has no value.
+    int32 SelectionAt(Input *input, float64 time, int32 current) const;
     // Sets `selection` to the item `value` chooses; false where that is
     // the one it held (the notify gate: nothing to show again).
     bool Follow(const Parameter *value, int32 &selection) const;

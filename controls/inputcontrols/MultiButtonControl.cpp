@@ -251,11 +251,7 @@ bool MultiButtonControl::Open(QWidget *host, const QRect &rect, const TagList *t
 {
     if (!LabelledInputControl::Open(host, rect, tags))
         return false;
-    if (Input *in = GetCurrentInput()) {
-        const AutoParameter now(in->GetValue(GetCurrentTime()));
-        if (now)
-            mSelection = mChoice.SelectionFor(now);
-    }
+    mSelection = mChoice.SelectionAt(GetCurrentInput(), GetCurrentTime(), mSelection);
     StyleButtons();
     for (QToolButton *button : mButtons)
         button->show();

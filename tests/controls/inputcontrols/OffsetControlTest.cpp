@@ -10,6 +10,8 @@
 using namespace Orbane;
 using namespace Orbane::Test;
 
+Q_DECLARE_METATYPE(std::vector<int32>)
+
 Q_DECLARE_METATYPE(Qt::KeyboardModifiers)
 
 namespace {
@@ -30,19 +32,6 @@ QPointF PointOf(const ToolFixture &f, Input *in)
 InputControl *MakeOffset(ToolFixture &f, Input *in)
 {
     return f.Create(OrbID("OffsetControl"), {in});
-}
-
-// Presses on the box, moves by `steps` pixels at a time and lets go there.
-void DragSideways(QWidget *w, const QList<int> &steps, Qt::KeyboardModifiers mods)
-{
-    QPoint at(w->width() / 2, w->height() / 2);
-    QTest::mousePress(w, Qt::LeftButton, mods, at);
-    for (int dx : steps) {
-        at.rx() += dx;
-        QMouseEvent move(QEvent::MouseMove, at, w->mapToGlobal(at), Qt::NoButton, Qt::LeftButton, mods);
-        QApplication::sendEvent(w, &move);
-    }
-    QTest::mouseRelease(w, Qt::LeftButton, mods, at);
 }
 
 } // namespace
@@ -102,26 +91,26 @@ void OffsetControlTest::typing()
 
 void OffsetControlTest::dragging_data()
 {
-    QTest::addColumn<QList<int>>("moves");
+    QTest::addColumn<std::vector<int32>>("moves");
     QTest::addColumn<Qt::KeyboardModifiers>("mods");
     QTest::addColumn<double>("x");
-    QTest::newRow("a pixel a step") << QList<int>{10, 10, 20} << Qt::KeyboardModifiers() << 0.1 + 40 * 0.002;
-    QTest::newRow("back past the start") << QList<int>{30, -50} << Qt::KeyboardModifiers() << 0.1 - 20 * 0.002;
-    QTest::newRow("ctrl: a tenth") << QList<int>{20, 20} << Qt::KeyboardModifiers(Qt::ControlModifier)
+    QTest::newRow("a pixel a step") << std::vector<int32>{10, 10, 20} << Qt::KeyboardModifiers() << 0.1 + 40 * 0.002;
+    QTest::newRow("back past the start") << std::vector<int32>{30, -50} << Qt::KeyboardModifiers() << 0.1 - 20 * 0.002;
+    QTest::newRow("ctrl: a tenth") << std::vector<int32>{20, 20} << Qt::KeyboardModifiers(Qt::ControlModifier)
                                    << 0.1 + 4 * 0.002;
-    QTest::newRow("shift: ten times") << QList<int>{5, 5} << Qt::KeyboardModifiers(Qt::ShiftModifier)
+    QTest::newRow("shift: ten times") << std::vector<int32>{5, 5} << Qt::KeyboardModifiers(Qt::ShiftModifier)
                                       << 0.1 + 100 * 0.002;
 }
 
 void OffsetControlTest::dragging()
 {
-    QFETCH(QList<int>, moves);
+    QFETCH(std::vector<int32>, moves);
     QFETCH(Qt::KeyboardModifiers, mods);
     QFETCH(double, x);
     ToolFixture f;
     Input *in = f.AddPoint("Center", 0.1, 0.2, {{kDragStep, 0.002}});
     InputControl *c = MakeOffset(f, in);
-    DragSideways(Edit(c, "x"), moves, mods);
+    ToolFixture::DragSideways(Edit(c, "x"), moves, mods);
     const QPointF now = PointOf(f, in);
     QVERIFY2(std::fabs(now.x() - x) < 1e-12, qPrintable(QString::number(now.x(), 'g', 17)));
     QCOMPARE(now.y(), 0.2);

@@ -9,6 +9,8 @@
 using namespace Orbane;
 using namespace Orbane::Test;
 
+Q_DECLARE_METATYPE(std::vector<int32>)
+
 Q_DECLARE_METATYPE(Qt::KeyboardModifiers)
 
 namespace {
@@ -23,18 +25,6 @@ QWidget *Wheel(const InputControl *c)
 InputControl *MakeScrew(ToolFixture &f, Input *in)
 {
     return f.Create(OrbID("ScrewControl"), {in});
-}
-
-void Turn(QWidget *wheel, const QList<int> &moves, Qt::KeyboardModifiers mods)
-{
-    QPoint at(wheel->width() / 2, wheel->height() / 2);
-    QTest::mousePress(wheel, Qt::LeftButton, mods, at);
-    for (int dx : moves) {
-        at.rx() += dx;
-        QMouseEvent move(QEvent::MouseMove, at, wheel->mapToGlobal(at), Qt::NoButton, Qt::LeftButton, mods);
-        QApplication::sendEvent(wheel, &move);
-    }
-    QTest::mouseRelease(wheel, Qt::LeftButton, mods, at);
 }
 
 void Notch(QWidget *wheel, int notches, Qt::KeyboardModifiers mods)
@@ -67,27 +57,27 @@ void ScrewControlTest::initTestCase()
 // has no bounds, and each drag or notch is one undo step.
 void ScrewControlTest::turning_data()
 {
-    QTest::addColumn<QList<int>>("moves");
+    QTest::addColumn<std::vector<int32>>("moves");
     QTest::addColumn<int>("notches");
     QTest::addColumn<Qt::KeyboardModifiers>("mods");
     QTest::addColumn<double>("value");
     QTest::addColumn<int>("steps");
     const Qt::KeyboardModifiers none;
-    QTest::newRow("drag right") << QList<int>{10, 30} << 0 << none << 1000.0 + 40 * 0.5 << 1;
-    QTest::newRow("far below zero") << QList<int>{-3000, -2000} << 0 << none << 1000.0 - 5000 * 0.5 << 1;
-    QTest::newRow("ctrl drag: a tenth") << QList<int>{40} << 0 << Qt::KeyboardModifiers(Qt::ControlModifier)
+    QTest::newRow("drag right") << std::vector<int32>{10, 30} << 0 << none << 1000.0 + 40 * 0.5 << 1;
+    QTest::newRow("far below zero") << std::vector<int32>{-3000, -2000} << 0 << none << 1000.0 - 5000 * 0.5 << 1;
+    QTest::newRow("ctrl drag: a tenth") << std::vector<int32>{40} << 0 << Qt::KeyboardModifiers(Qt::ControlModifier)
                                         << 1000.0 + 4 * 0.5 << 1;
     QTest::newRow("shift drag: ten times")
-        << QList<int>{4} << 0 << Qt::KeyboardModifiers(Qt::ShiftModifier) << 1000.0 + 40 * 0.5 << 1;
-    QTest::newRow("a notch") << QList<int>{} << 1 << none << 1000.0 + 10 * 0.5 << 1;
+        << std::vector<int32>{4} << 0 << Qt::KeyboardModifiers(Qt::ShiftModifier) << 1000.0 + 40 * 0.5 << 1;
+    QTest::newRow("a notch") << std::vector<int32>{} << 1 << none << 1000.0 + 10 * 0.5 << 1;
     QTest::newRow("notch down with ctrl")
-        << QList<int>{} << -1 << Qt::KeyboardModifiers(Qt::ControlModifier) << 1000.0 - 0.5 << 1;
-    QTest::newRow("drag then notch") << QList<int>{2} << 1 << none << 1000.0 + 12 * 0.5 << 2;
+        << std::vector<int32>{} << -1 << Qt::KeyboardModifiers(Qt::ControlModifier) << 1000.0 - 0.5 << 1;
+    QTest::newRow("drag then notch") << std::vector<int32>{2} << 1 << none << 1000.0 + 12 * 0.5 << 2;
 }
 
 void ScrewControlTest::turning()
 {
-    QFETCH(QList<int>, moves);
+    QFETCH(std::vector<int32>, moves);
     QFETCH(int, notches);
     QFETCH(Qt::KeyboardModifiers, mods);
     QFETCH(double, value);
@@ -95,8 +85,8 @@ void ScrewControlTest::turning()
     ToolFixture f;
     Input *in = f.AddNumber("Angle", 1000.0, {{kStep, 0.5}});
     InputControl *c = MakeScrew(f, in);
-    if (!moves.isEmpty())
-        Turn(Wheel(c), moves, mods);
+    if (!moves.empty())
+        ToolFixture::DragSideways(Wheel(c), moves, mods);
     if (notches)
         Notch(Wheel(c), notches, mods);
     QCOMPARE(f.NumberOf(in), value);
