@@ -84,6 +84,14 @@ TagList ItemChoice::ItemTags(int32 index) const
     return tags;
 }
 
+bool ItemChoice::WriteOnDisconnect(Input *input, int32 selection) const
+{
+    if (!input || !IsChoosable(selection))
+        return false;
+    const TagList tags = ItemTags(selection);
+    return input->SetValue(ValueOf(selection), TIME_DISCONNECT, SETVALUE_NoUndo, tags.IsEmpty() ? nullptr : &tags);
+}
+
 uint64 ItemChoice::BitOf(int32 index) const
 {
     if (!IsChoosable(index))

@@ -50,6 +50,11 @@ public:
     AutoParameter ValueOf(int32 index) const;
     // The tags sent with a write of item `index`.
     TagList ItemTags(int32 index) const;
+    // What a control that shows item `selection` writes when unbound from
+    // `input`: the item's value or identifier, with its tags, at the
+    // disconnect time and without undo. With no item shown it writes
+    // nothing: no value stands for none but the one the Input holds.
+    bool WriteOnDisconnect(Input *input, int32 selection) const;
     // Is `index` an item that can be chosen (no separator)?
     bool IsChoosable(int32 index) const { return mItems.IsItem(index) && !mItems.IsSeparator(index); }
 

@@ -1,6 +1,7 @@
 #include "inputcontrols/ListControl.h"
 
 #include "framework/ListTags.h"
+#include "inputcontrols/DisconnectWrite.h"
 
 #include "orbane/ClassIDs.h"
 #include "orbane/ElideLabel.h"
@@ -196,9 +197,10 @@ void ListControl::OnSelectionChanged()
 
 bool ListControl::OnDisconnect(Input *input, const TagList *tags)
 {
-    // The identifier variant has no identifier to write without a choice.
-    if (input && (!IsIDVariant() || mChoice.IsChoosable(mSelection)))
-        input->SetValue(ValueToWrite(), TIME_DISCONNECT, SETVALUE_NoUndo, nullptr);
+    if (!mMulti)
+        mChoice.WriteOnDisconnect(input, mSelection);
+    else
+        WriteOnDisconnect(input, float64(mBits));
     return LabelledInputControl::OnDisconnect(input, tags);
 }
 

@@ -393,13 +393,7 @@ bool MultiButtonControl::eventFilter(QObject *watched, QEvent *event)
 
 bool MultiButtonControl::OnDisconnect(Input *input, const TagList *tags)
 {
-    // The identifier variant has no identifier to write without a choice.
-    if (!IsIDVariant() || mChoice.IsChoosable(mSelection)) {
-        const TagList items = mChoice.ItemTags(mSelection);
-        const AutoParameter value =
-            mSelection < 0 && !IsIDVariant() ? AutoParameter(AutoNumber(kNoChoice)) : mChoice.ValueOf(mSelection);
-        input->SetValue(value, TIME_DISCONNECT, SETVALUE_NoUndo, items.IsEmpty() ? nullptr : &items);
-    }
+    mChoice.WriteOnDisconnect(input, mSelection);
     return LabelledInputControl::OnDisconnect(input, tags);
 }
 

@@ -75,6 +75,8 @@ private slots:
     void rows_data();
     void rows();
     void keysChooseNeighbours();
+    void noneShownWritesNothing_data();
+    void noneShownWritesNothing();
 };
 
 void MultiButtonControlTest::initTestCase()
@@ -198,6 +200,32 @@ void MultiButtonControlTest::keysChooseNeighbours()
     QTest::keyClick(Button(c, 3), Qt::Key_Left);
     QCOMPARE(f.NumberOf(in), 0.0);
     QCOMPARE(f.doc.UndoNames().size(), 2);
+}
+
+// A row with no buttons, or a value no button has, shows nothing chosen
+// and leaves the Input's value alone when it is unbound.
+void MultiButtonControlTest::noneShownWritesNothing_data()
+{
+    QTest::addColumn<bool>("idVariant");
+    QTest::addColumn<TagList>("attrs");
+    QTest::newRow("no buttons") << false << TagList();
+    QTest::newRow("no button has the value") << false << Fruit();
+    QTest::newRow("no button has the identifier") << true << Fruit();
+}
+
+void MultiButtonControlTest::noneShownWritesNothing()
+{
+    QFETCH(bool, idVariant);
+    QFETCH(TagList, attrs);
+    ToolFixture f;
+    Input *in = AddRow(f, idVariant, attrs);
+    const QString before = ValueOf(f, in);
+    InputControl *c = MakeRow(f, idVariant, in);
+    QVERIFY(c->height() > 0);
+    for (const QToolButton *button : c->findChildren<QToolButton *>())
+        QVERIFY(!button->isChecked());
+    f.Destroy(c);
+    QCOMPARE(ValueOf(f, in), before);
 }
 
 QTEST_MAIN(MultiButtonControlTest)
