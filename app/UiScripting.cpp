@@ -17,6 +17,7 @@
 #include "orbane/ScriptVal.h"
 #include "orbane/ToolLoader.h"
 
+#include <QAbstractButton>
 #include <QApplication>
 #include <QClipboard>
 #include <QComboBox>
@@ -277,6 +278,8 @@ QString TextOf(QWidget *w)
         return button->GetLabel();
     if (auto *combo = qobject_cast<QComboBox *>(w))
         return combo->currentText();
+    if (auto *plain = qobject_cast<QAbstractButton *>(w))
+        return plain->text();
     return QString();
 }
 
@@ -298,6 +301,9 @@ int State(lua_State *L)
     lua_setfield(L, -2, "text");
     if (auto *button = qobject_cast<CustomButton *>(w)) {
         lua_pushinteger(L, button->GetCheck());
+        lua_setfield(L, -2, "check");
+    } else if (auto *plain = qobject_cast<QAbstractButton *>(w); plain && plain->isCheckable()) {
+        lua_pushinteger(L, plain->isChecked() ? 1 : 0);
         lua_setfield(L, -2, "check");
     }
     return 1;

@@ -20,6 +20,8 @@ const std::vector<Goal> &Goals()
          "BM_StockRows_Build/500", 1.0, "stock Qt rows"},
         {"V1", "hover over 100 rectangles and 100 angle dials, one mouse event", "BM_Viewer_HoverShapes/100/100",
          nullptr, 0.5, ""},
+        {"P1e", "inspector build, 500 button rows, lists, check lists, offsets, screws and labels",
+         "BM_Inspector_BuildChoices/500", "BM_StockChoiceRows_Build/500", 1.0, "stock Qt rows"},
     };
     return goals;
 }

@@ -10,5 +10,6 @@ return {
     { file = "tools/Choices.lua", name = "Choices1" },
     { file = "tools/Transform.lua", name = "Transform1" },
     { file = "tools/Files.lua", name = "Files1" },
+    { file = "tools/Groups.lua", name = "Groups1" },
   },
 }

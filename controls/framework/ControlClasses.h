@@ -5,11 +5,17 @@
 
 #include "inputcontrols/ButtonControl.h"
 #include "inputcontrols/CheckBoxControl.h"
+#include "inputcontrols/CheckListControl.h"
 #include "inputcontrols/ClipControl.h"
 #include "inputcontrols/ComboControl.h"
 #include "inputcontrols/FileControl.h"
 #include "inputcontrols/FontfileControl.h"
+#include "inputcontrols/LabelControl.h"
+#include "inputcontrols/ListControl.h"
+#include "inputcontrols/MultiButtonControl.h"
+#include "inputcontrols/OffsetControl.h"
 #include "inputcontrols/RangeControl.h"
+#include "inputcontrols/ScrewControl.h"
 #include "inputcontrols/ScriptValListControl.h"
 #include "inputcontrols/SliderControl.h"
 #include "overlays/AngleControl.h"
@@ -39,7 +45,6 @@ namespace Orbane {
 // Before the camera and light, which derive from it.
 ORBANE_PENDING_PREVIEW(TransformControl);
 ORBANE_PENDING_DERIVED(CameraControl, TransformControl);
-ORBANE_PENDING_INPUT(CheckListControl);
 ORBANE_PENDING_INPUT(ColorControl);
 ORBANE_PENDING_INPUT(ColorGamutControl);
 ORBANE_PENDING_INPUT(ColorRangesControl);
@@ -53,20 +58,15 @@ ORBANE_PENDING_INPUT(GradientControl);
 ORBANE_PENDING_INPUT(HistogramControl);
 ORBANE_PENDING_INPUT(ImageControl);
 ORBANE_PENDING_PREVIEW(ImgOverlayControl);
-ORBANE_PENDING_INPUT(LabelControl);
 ORBANE_PENDING_INPUT(LevelsControl);
 ORBANE_PENDING_INPUT(LevelsOutputControl);
 ORBANE_PENDING_DERIVED(LightControl, TransformControl);
-ORBANE_PENDING_INPUT(ListControl);
 ORBANE_PENDING_INPUT(LogControl);
 ORBANE_PENDING_PREVIEW(MeshControl);
-ORBANE_PENDING_INPUT(MultiButtonControl);
 ORBANE_PENDING_PREVIEW(ObloidControl);
-ORBANE_PENDING_INPUT(OffsetControl);
 ORBANE_PENDING_INPUT(PatternControl);
 ORBANE_PENDING_PREVIEW(PolyLineControl);
 ORBANE_PENDING_PREVIEW(PositionerControl);
-ORBANE_PENDING_INPUT(ScrewControl);
 ORBANE_PENDING_DERIVED(SliderOverlay, OverlayControl);
 ORBANE_PENDING_INPUT(SplineControl);
 ORBANE_PENDING_PREVIEW(TrackerControl);

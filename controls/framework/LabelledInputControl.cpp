@@ -173,6 +173,15 @@ bool LabelledInputControl::AddInput(Input *input, const TagList *tags)
     return true;
 }
 
+bool LabelledInputControl::BindKeepingFirstTexts(Input *input, const TagList *tags)
+{
+    if (!InputControl::AddInput(input, tags))
+        return false;
+    if (GetCurrentInput() == input)
+        ReadTexts(input);
+    return true;
+}
+
 bool LabelledInputControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
 {
     if (!InputControl::Open(host, rect, tags))

@@ -96,6 +96,11 @@ protected:
     ElideLabel *Label() const { return mLabel; }
     // The rule of AddInput, for controls that bind otherwise.
     void ReadTexts(const Input *input);
+    // Binds with the host's AddInput, taking the texts of the first Input
+    // only: for controls whose items, too, are the first Input's (read them
+    // before, while IsFirstInput).
+    bool BindKeepingFirstTexts(Input *input, const TagList *tags);
+    bool IsFirstInput(const Input *input) const { return input && !GetCurrentInput(); }
     // The texts of a tag list, as SetAttrsTagList takes them.
     void TakeTexts(const TagList &tags);
     // Something else that ShowTexts shows has changed.

@@ -8,6 +8,7 @@
 #include "framework/AngleTags.h"
 #include "framework/ButtonTags.h"
 #include "framework/CheckBoxTags.h"
+#include "framework/CheckListTags.h"
 #include "framework/ClipTags.h"
 #include "framework/ComboTags.h"
 #include "framework/ControlClasses.h"
@@ -16,10 +17,14 @@
 #include "framework/FFICasts.h"
 #include "framework/FileTags.h"
 #include "framework/FontfileTags.h"
+#include "framework/LabelTags.h"
 #include "framework/ListTags.h"
+#include "framework/MultiButtonTags.h"
+#include "framework/OffsetTags.h"
 #include "framework/PointTags.h"
 #include "framework/RangeTags.h"
 #include "framework/RectangleTags.h"
+#include "framework/ScrewTags.h"
 #include "framework/SliderTags.h"
 #include "framework/VariantRegistration.h"
 #include "polyline/PolyLineTags.h"
@@ -53,7 +58,7 @@ ControlDesc ComboDesc()
 
 ControlDesc LabelDesc()
 {
-    return D::Input("LabelControl", CLSID_InputControl_Label);
+    return D::Input("LabelControl", CLSID_InputControl_Label).Tags<LabelControlTags>();
 }
 
 // ListControl shares its tag names with ScriptValListControl.
@@ -64,7 +69,7 @@ ControlDesc ListDesc()
 
 ControlDesc MultiButtonDesc()
 {
-    return D::Input("MultiButtonControl", CLSID_InputControl_MultiButton);
+    return D::Input("MultiButtonControl", CLSID_InputControl_MultiButton).Tags<MultiButtonControlTags>();
 }
 
 ControlRegistration<AngleControl> gAngle{
@@ -76,7 +81,7 @@ ControlRegistration<CameraControl, TransformControl> gCamera{D::Preview("CameraC
                                                                  .Flag(REG_PreviewFlag65)};
 ControlRegistration<CheckBoxControl> gCheckBox{
     D::Input("CheckBoxControl", CLSID_InputControl_Checkbox).Script("CheckboxControl").Tags<CheckBoxControlTags>()};
-ControlRegistration<CheckListControl> gCheckList{D::Input("CheckListControl")};
+ControlRegistration<CheckListControl> gCheckList{D::Input("CheckListControl").Tags<CheckListControlTags>()};
 ControlRegistration<ClipControl> gClip{D::Input("ClipControl").Tags<ClipControlTags>()};
 ControlRegistration<ColorControl> gColor{D::Input("ColorControl")};
 ControlRegistration<ColorGamutControl> gColorGamut{D::Input("ColorGamutControl")};
@@ -116,7 +121,7 @@ ControlRegistration<MultiButtonControl> gMultiButton{MultiButtonDesc()};
 VariantRegistration<MultiButtonControl> gMultiButtonID{
     MultiButtonDesc().Variant(CLSID_InputControl_MultiButtonID, "MultiButtonIDControl")};
 ControlRegistration<ObloidControl> gObloid{D::Preview("ObloidControl", "CubeControl")};
-ControlRegistration<OffsetControl> gOffset{D::Input("OffsetControl")};
+ControlRegistration<OffsetControl> gOffset{D::Input("OffsetControl").Tags<OffsetControlTags>()};
 ControlRegistration<PatternControl> gPattern{D::Input("PatternControl")};
 ControlRegistration<PointControl> gPoint{D::Preview("PointControl").Tags<PointControlTags>()};
 ControlRegistration<PolyLineControl> gPolyLine{
@@ -124,7 +129,7 @@ ControlRegistration<PolyLineControl> gPolyLine{
 ControlRegistration<PositionerControl> gPositioner{D::Preview("PositionerControl")};
 ControlRegistration<RangeControl> gRange{D::Input("RangeControl").Tags<RangeControlTags>()};
 ControlRegistration<RectangleControl> gRectangle{D::Preview("RectangleControl").Tags<RectangleControlTags>()};
-ControlRegistration<ScrewControl> gScrew{D::Input("ScrewControl")};
+ControlRegistration<ScrewControl> gScrew{D::Input("ScrewControl").Tags<ScrewControlTags>()};
 ControlRegistration<ScriptValListControl> gScriptValList{D::Input("ScriptValListControl").Tags<ListControlTags>()};
 ControlRegistration<SliderControl> gSlider{
     D::Input("SliderControl", CLSID_InputControl_Slider).Tags<SliderControlTags>()};

@@ -32,7 +32,8 @@ QString ToQString(const OrbString &s)
 } // namespace
 
 ComboControl::ComboControl(const Registry *reg, const ScriptVal &args, const TagList &tags)
-    : LabelledInputControl(reg, args, tags), mCombo(new OrbComboBox(this))
+    : LabelledInputControl(reg, args, tags), mChoice(ItemChoice::IsIDVariant(reg, CLSID_InputControl_Combo)),
+      mCombo(new OrbComboBox(this))
 {
     mLabelPosition =
         tags.GetInt(CC_LabelPosition, Label_Horizontal) == Label_Vertical ? Label_Vertical : Label_Horizontal;
@@ -53,12 +54,6 @@ ComboControl::ComboControl(const Registry *reg, const ScriptVal &args, const Tag
 
 ComboControl::~ComboControl() = default;
 
-bool ComboControl::IsIDVariant() const
-{
-    const Registry *reg = GetRegistry();
-    return reg && reg->ClassID() != CLSID_InputControl_Combo;
-}
-
 bool ComboControl::SetAttrsTagList(Input *input, const TagList &tags)
 {
     if (tags.FindQuery(CC_AlphaSort) && tags.GetBool(CC_AlphaSort, mAlphaSort) != mAlphaSort) {
@@ -71,31 +66,22 @@ bool ComboControl::SetAttrsTagList(Input *input, const TagList &tags)
 bool ComboControl::AddInput(Input *input, const TagList *tags)
 {
     // The items belong to the first Input; further ones share them.
-    if (input && !GetCurrentInput()) {
-        mIsText = input->GetDataType() == CLSID_DataType_Text;
-        {
-            const LockableObject::ReadGuard guard(*input);
-            mItems.Read(input->GetAttrs());
-        }
+    if (IsFirstInput(input)) {
+        mChoice.Read(input);
         FillRows();
     }
-    // The host's AddInput, not the base's: the texts, too, are the first Input's.
-    if (!InputControl::AddInput(input, tags))
-        return false;
-    if (GetCurrentInput() == input)
-        ReadTexts(input);
-    return true;
+    return BindKeepingFirstTexts(input, tags);
 }
 
 void ComboControl::FillRows()
 {
     mCombo->clear();
-    for (int32 index : mItems.RowOrder(mAlphaSort)) {
+    for (int32 index : mChoice.Items().RowOrder(mAlphaSort)) {
         const std::size_t i = std::size_t(index);
-        if (mItems.IsSeparator(index))
+        if (mChoice.Items().IsSeparator(index))
             mCombo->AddSeparator(index);
         else
-            mCombo->AddItem(ToQString(mItems.Texts[i]), index, ToQString(mItems.SecondTexts[i]));
+            mCombo->AddItem(ToQString(mChoice.Items().Texts[i]), index, ToQString(mChoice.Items().SecondTexts[i]));
     }
     mCombo->ShowItem(mSelection);
 }
@@ -104,11 +90,7 @@ bool ComboControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
 {
     if (!LabelledInputControl::Open(host, rect, tags))
         return false;
-    if (Input *in = GetCurrentInput()) {
-        const AutoParameter now(in->GetValue(GetCurrentTime()));
-        if (now)
-            mSelection = SelectionFor(now);
-    }
+    mSelection = mChoice.SelectionAt(GetCurrentInput(), GetCurrentTime(), mSelection);
     mCombo->ShowItem(mSelection);
     ShowChild(Label());
     ShowChild(mCombo);
@@ -123,28 +105,10 @@ void ComboControl::ShowTexts()
     Label()->setToolTip(ToQString(GetLabelTexts().second));
 }
 
-int32 ComboControl::SelectionFor(const Parameter *value) const
-{
-    if (!IsIDVariant()) {
-        const auto *number = dynamic_cast<const Number *>(value);
-        return number ? mItems.Nearest(number->Value) : -1;
-    }
-    if (mIsText) {
-        const auto *text = dynamic_cast<const Text *>(value);
-        return text ? mItems.FindID(OrbID(text->Value.str())) : -1;
-    }
-    const auto *id = dynamic_cast<const OrbIDParam *>(value);
-    return id ? mItems.FindID(id->Value) : -1;
-}
-
 bool ComboControl::NotifyChanged(Input *input, Parameter *value, const TagList *tags)
 {
-    if (!value)
-        return LabelledInputControl::NotifyChanged(input, value, tags);
-    const int32 selection = SelectionFor(value);
-    if (selection == mSelection)
+    if (value && !mChoice.Follow(value, mSelection))
         return true;
-    mSelection = selection;
     return LabelledInputControl::NotifyChanged(input, value, tags);
 }
 
@@ -159,40 +123,17 @@ bool ComboControl::UpdateDisplay(Input *input, const TagList *tags)
     return LabelledInputControl::UpdateDisplay(input, tags);
 }
 
-AutoParameter ComboControl::ValueOf(int32 index) const
-{
-    const std::size_t i = std::size_t(index);
-    if (!IsIDVariant())
-        return AutoParameter(AutoNumber(index >= 0 && i < mItems.Values.size() ? mItems.Values[i] : 0.0));
-    const AutoOrbIDParam id(mItems.IsItem(index) ? mItems.IDs[i] : OrbID());
-    if (mIsText)
-        return AutoParameter(AutoText(OrbString(id->Value.str())));
-    return AutoParameter(id);
-}
-
-TagList ComboControl::ItemTags(int32 index) const
-{
-    TagList tags;
-    if (!mItems.IsItem(index))
-        return tags;
-    if (const int64 integer = mItems.Integers[std::size_t(index)])
-        tags.Set(CCA_ItemInteger, TagValue(static_cast<long long>(integer)));
-    if (void *pointer = mItems.Pointers[std::size_t(index)])
-        tags.Set(CCAP_ItemPointer, pointer);
-    return tags;
-}
-
 bool ComboControl::Write(int32 index, float64 time)
 {
-    const AutoParameter value = ValueOf(index);
-    const TagList tags = ItemTags(index);
+    const AutoParameter value = mChoice.ValueOf(index);
+    const TagList tags = mChoice.ItemTags(index);
     return SetInputs(value, time, 0, false, tags.IsEmpty() ? nullptr : &tags);
 }
 
 void ComboControl::Select(int row, bool final)
 {
     const int32 index = mCombo->ItemIndexOf(row);
-    if (mItems.IsItem(index) && !mItems.IsSeparator(index) && index != mSelection) {
+    if (mChoice.IsChoosable(index) && index != mSelection) {
         mSelection = index;
         mPreviewing = !final;
         Write(index, GetCurrentTime());
@@ -249,7 +190,7 @@ void ComboControl::EndPopup()
 bool ComboControl::OnDisconnect(Input *input, const TagList *tags)
 {
     // The identifier variant has no identifier to write without a choice.
-    if (!IsIDVariant() || mItems.IsItem(mSelection)) {
+    if (!IsIDVariant() || mChoice.Items().IsItem(mSelection)) {
         const bool gestureOpen = IsUndoOpen();
         Write(mSelection, TIME_DISCONNECT);
         if (!gestureOpen)

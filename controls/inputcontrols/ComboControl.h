@@ -1,7 +1,7 @@
 #pragma once
 
 #include "framework/LabelledInputControl.h"
-#include "inputcontrols/ComboItems.h"
+#include "inputcontrols/ItemChoice.h"
 
 #include "orbane/AutoParam.h"
 
@@ -26,8 +26,8 @@ public:
     // Sent with every write, in the tag list that reaches each control of
     // the Input: the chosen item's integer (0x18040000) where it is not 0,
     // and its pointer (0x68040000) where it is not null.
-    static constexpr Tag CCA_ItemInteger = 0x100003e8;
-    static constexpr Tag CCAP_ItemPointer = 0x600003e8;
+    static constexpr Tag CCA_ItemInteger = ItemChoice::ItemIntegerSent;
+    static constexpr Tag CCAP_ItemPointer = ItemChoice::ItemPointerSent;
 
     ComboControl(const Registry *reg, const ScriptVal &args, const TagList &tags);
     ~ComboControl() override;
@@ -42,7 +42,7 @@ public:
     bool UpdateDisplay(Input *input, const TagList *tags) override;
     bool OnDisconnect(Input *input, const TagList *tags) override;
 
-    bool IsIDVariant() const;
+    bool IsIDVariant() const { return mChoice.IsIDVariant(); }
 
 protected:
     // The label shows the label text, with the second text as its tip.
@@ -57,15 +57,11 @@ private slots:
 
 private:
     void FillRows();
-    int32 SelectionFor(const Parameter *value) const;
     void Select(int row, bool final);
-    AutoParameter ValueOf(int32 index) const;
-    TagList ItemTags(int32 index) const;
     bool Write(int32 index, float64 time);
 
-    ComboItems mItems;
+    ItemChoice mChoice;
     int32 mSelection = -1;
-    bool mIsText = false;
     bool mAlphaSort = false;
     int32 mLabelPosition = 0;
     // The list is open: highlighted items are written as previews.

@@ -1,8 +1,8 @@
 -- Viewer overlays: the tool's centre as an axis crosshair (drag its arms to
 -- move along one axis), and a path of points along the ridge of the demo
 -- image, each joined by a line to the point before it (PCID_PrevPoint).
--- The inspector shows each point's value read-only (the offset control that
--- will edit it there is not built yet) and follows every drag in the viewer.
+-- The inspector shows each point's X and Y in edit boxes that take typed
+-- values and drag sideways, and follows every drag in the viewer.
 return {
   type = "Points",
   inputs = {

@@ -6,6 +6,7 @@
 #include <QPointer>
 #include <QScrollArea>
 
+#include <map>
 #include <vector>
 
 namespace Orbane {
@@ -48,6 +49,16 @@ public:
     // How many controls the shown tool has, built or not.
     size_t ControlCount() const { return mSlots.size(); }
 
+    // Folding: a group header hides the rows of the Inputs under it, and
+    // the rows below move up at once. Each closed header that covers an
+    // Input counts once, so a row shows again only when no header hides it
+    // (an open inner group inside a closed outer one stays hidden). A row
+    // not built yet is built hidden. Calls must come in pairs per header.
+    void HideInputs(const std::vector<Input *> &inputs, bool hide);
+    bool IsInputHidden(const Input *input) const;
+    // The inspector that shows `control`, or null where it is in none.
+    static ParameterPanel *Of(const QWidget *control);
+
 signals:
     void toolShown(Orbane::Operator *tool);
 
@@ -75,6 +86,7 @@ private:
     void ResizePage();
     void Clear();
     void LayOut();
+    void Reflow();
 
     OrbaneDoc *mDoc;
     Operator *mTool = nullptr;
@@ -82,6 +94,8 @@ private:
     std::vector<InputControl *> mControls; // the built ones, one reference each
     int32 mLaidOutWidth = -1;
     int32 mBuiltBottom = 0; // where the next built control goes
+    bool mBuilding = false;
+    std::map<const Input *, int32> mHiddenBy; // closed headers hiding each Input
 };
 
 } // namespace Orbane

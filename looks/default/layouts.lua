@@ -168,4 +168,83 @@ return {
             { name = "span", height = 20 },
         },
     },
+
+    -- A text or a folding header, indented by its nest level; the
+    -- separator's line and the spacer's gap are hidden unless the variant
+    -- shows them.
+    ["Controls.Label.Layout"] = {
+        { kind = "vbox", spacing = 0,
+            { kind = "hbox", spacing = 0,
+                "indent",
+                { name = "header", stretch = 1 },
+                { name = "label", stretch = 1 },
+            },
+            "line",
+            "space",
+        },
+    },
+
+    -- The buttons fill a grid that the control builds by its column count.
+    ["Controls.MultiButton.Layout.Horizontal"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 6,
+                label({ align = "left|top" }),
+                { kind = "grid", name = "buttons", stretch = 1 },
+            },
+            expression(),
+        },
+    },
+
+    ["Controls.MultiButton.Layout.Vertical"] = {
+        { kind = "vbox", spacing = 2,
+            { name = "label" },
+            { kind = "grid", name = "buttons" },
+            expression(),
+        },
+    },
+
+    -- The name over the list; the control sets the list's height from its
+    -- row count.
+    ["Controls.List.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { name = "label" },
+            { name = "list", minheight = 20 },
+            expression(),
+        },
+    },
+
+    -- The name and the select buttons on one line, the boxes in a grid under
+    -- them that the control fills by its column count.
+    ["Controls.CheckList.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 4,
+                { name = "label", stretch = 1 },
+                { name = "all" },
+                { name = "none" },
+            },
+            { kind = "grid", name = "items", hspacing = 8, vspacing = 2, margins = { 8, 0, 0, 0 } },
+            expression(),
+        },
+    },
+
+    -- The name, then X and Y sharing the rest of the line.
+    ["Controls.Offset.Layout"] = {
+        { kind = "hbox", spacing = 4,
+            label({ stretch = 1 }),
+            { name = "x", stretch = 1, minwidth = 50 },
+            { name = "y", stretch = 1, minwidth = 50 },
+        },
+    },
+
+    -- The name and the value on one line, the wheel across the width under them.
+    ["Controls.Screw.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 6,
+                { name = "label", stretch = 1 },
+                { name = "edit", width = 84 },
+            },
+            { name = "wheel", height = 18 },
+            expression(),
+        },
+    },
 }

@@ -11,6 +11,7 @@
 
 #include <QApplication>
 #include <QResizeEvent>
+#include <QScopedValueRollback>
 #include <QScrollBar>
 
 namespace Orbane {
@@ -50,7 +51,9 @@ void ParameterPanel::ShowTool(Operator *tool)
                 mSlots.push_back({input, item->id});
         // The page is built hidden and shown once: adding widgets one by one
         // to a visible page costs a relayout each.
-        QWidget *page = new QWidget;
+        // A child of the view while it is built, so that a control can find
+        // its inspector from Open on (a group header hides its rows there).
+        QWidget *page = new QWidget(viewport());
         page->hide();
         mLaidOutWidth = viewport()->width();
         BuildUntil(page, 0, 1);
@@ -68,6 +71,7 @@ void ParameterPanel::ShowTool(Operator *tool)
 void ParameterPanel::BuildUntil(QWidget *page, int32 bottom, size_t count)
 {
     const int32 inner = InnerWidth();
+    const QScopedValueRollback<bool> building(mBuilding, true);
     while (mControls.size() < mSlots.size() && (mBuiltBottom < bottom || mControls.size() < count)) {
         const Slot &slot = mSlots[mControls.size()];
         InputControl *control = CreateControl(slot.input, slot.classID.c_str(), page);
@@ -153,6 +157,10 @@ int32 ParameterPanel::InnerWidth() const
 
 void ParameterPanel::Place(InputControl *control, int32 inner)
 {
+    if (IsInputHidden(control->GetCurrentInput())) {
+        control->hide();
+        return;
+    }
     int32 w = inner, h = 0;
     control->SetSize(w, h, nullptr);
     control->setGeometry(kSideMargin, mBuiltBottom, inner, h);
@@ -192,6 +200,46 @@ void ParameterPanel::OnScrolled(int value)
     }
 }
 
+void ParameterPanel::HideInputs(const std::vector<Input *> &inputs, bool hide)
+{
+    for (const Input *in : inputs) {
+        int32 &count = mHiddenBy[in];
+        count = qMax(0, count + (hide ? 1 : -1));
+        if (count == 0)
+            mHiddenBy.erase(in);
+    }
+    Reflow();
+}
+
+bool ParameterPanel::IsInputHidden(const Input *input) const
+{
+    return input && mHiddenBy.count(input) != 0;
+}
+
+ParameterPanel *ParameterPanel::Of(const QWidget *control)
+{
+    for (QWidget *w = control ? control->parentWidget() : nullptr; w; w = w->parentWidget())
+        if (auto *panel = qobject_cast<ParameterPanel *>(w))
+            return panel;
+    return nullptr;
+}
+
+// Places every built control again at the width they have, then builds on
+// where the rows that went hidden left room in the view.
+void ParameterPanel::Reflow()
+{
+    // A header hides only rows after its own, which a build places as it
+    // reaches them.
+    if (mBuilding || !widget() || mControls.empty())
+        return;
+    mBuiltBottom = kSideMargin;
+    const int32 inner = InnerWidth();
+    for (InputControl *c : mControls)
+        Place(c, inner);
+    ResizePage();
+    OnScrolled(verticalScrollBar()->value());
+}
+
 void ParameterPanel::resizeEvent(QResizeEvent *event)
 {
     QScrollArea::resizeEvent(event);
@@ -222,6 +270,7 @@ void ParameterPanel::Clear()
     mControls.clear();
     mSlots.clear();
     mBuiltBottom = kSideMargin;
+    mHiddenBy.clear();
     mTool = nullptr;
 }
 

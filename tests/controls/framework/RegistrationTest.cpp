@@ -264,15 +264,17 @@ TEST(TagMaps, PublishedMapsAreWellFormed)
         ExpectRowsWellFormed(map->Table());
     }
     const std::map<std::string, int> published = {
-        {"AngleControl", 16},    {"ButtonControl", 2},  {"CheckboxControl", 1},   {"ClipControl", 3},
-        {"ComboControl", 5},     {"ComboIDControl", 5}, {"CrosshairControl", 7},  {"FileControl", 4},
-        {"FontFileControl", 3},  {"ListControl", 4},    {"ListIDControl", 4},     {"PointControl", 4},
-        {"PolylineControl", 56}, {"RangeControl", 14},  {"RectangleControl", 35}, {"ScriptValListControl", 4},
-        {"SliderControl", 4}};
+        {"AngleControl", 16},        {"ButtonControl", 2},       {"CheckboxControl", 1},       {"CheckListControl", 7},
+        {"ClipControl", 3},          {"ComboControl", 5},        {"ComboIDControl", 5},        {"CrosshairControl", 7},
+        {"FileControl", 4},          {"FontFileControl", 3},     {"LabelControl", 10},         {"ListControl", 4},
+        {"ListIDControl", 4},        {"MultiButtonControl", 33}, {"MultiButtonIDControl", 33}, {"OffsetControl", 2},
+        {"PointControl", 4},         {"PolylineControl", 56},    {"RangeControl", 14},         {"RectangleControl", 35},
+        {"ScriptValListControl", 4}, {"ScrewControl", 1},        {"SliderControl", 4}};
     EXPECT_EQ(counts, published);
     const auto table = [](const char *type) { return FFITagMap::ForType(FFIType::FindScriptName(type))->Table(); };
     EXPECT_EQ(table("ComboIDControl"), table("ComboControl")) << "variants share their primary's table";
     EXPECT_EQ(table("ListIDControl"), table("ListControl"));
+    EXPECT_EQ(table("MultiButtonIDControl"), table("MultiButtonControl"));
     EXPECT_EQ(table("ScriptValListControl"), table("ListControl"));
 }
 

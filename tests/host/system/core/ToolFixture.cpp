@@ -7,6 +7,8 @@
 #include "orbane/RegistryList.h"
 #include "orbane/ScriptVal.h"
 
+#include <QApplication>
+#include <QMouseEvent>
 #include <QTest>
 
 #include <algorithm>
@@ -104,6 +106,18 @@ int32 ToolFixture::LayoutReadCount(const char *itemName)
     using Count = int32 (*)(const char *);
     const auto count = reinterpret_cast<Count>(dlsym(RTLD_DEFAULT, "orbanecontrols_LayoutReadCount"));
     return count ? count(itemName) : -1;
+}
+
+void ToolFixture::DragSideways(QWidget *w, const std::vector<int32> &steps, Qt::KeyboardModifiers mods)
+{
+    QPoint at(w->width() / 2, w->height() / 2);
+    QTest::mousePress(w, Qt::LeftButton, mods, at);
+    for (int32 dx : steps) {
+        at.rx() += dx;
+        QMouseEvent move(QEvent::MouseMove, at, w->mapToGlobal(at), Qt::NoButton, Qt::LeftButton, mods);
+        QApplication::sendEvent(w, &move);
+    }
+    QTest::mouseRelease(w, Qt::LeftButton, mods, at);
 }
 
 float64 ToolFixture::NumberOf(const Input *input) const

@@ -44,6 +44,9 @@ public:
     // How often the loaded control library read the class layout item
     // `itemName` from the look pack; -1 where the library is not loaded.
     static int32 LayoutReadCount(const char *itemName);
+    // A press on `w`, moves by `steps` pixels sideways with the left button
+    // held, and the release where the last move ended, all with `mods`.
+    static void DragSideways(QWidget *w, const std::vector<int32> &steps, Qt::KeyboardModifiers mods);
     // Current value of a Number Input at the document's time.
     float64 NumberOf(const Input *input) const;
 

@@ -126,7 +126,7 @@ private slots:
         QTest::addColumn<QString>("warning");
         QTest::newRow("unknown class") << "NoSuchControl"
                                        << "Input \"Blend Gain\" .*\"NoSuchControl\", which is unknown";
-        QTest::newRow("unwritten control") << "MultiButtonControl"
+        QTest::newRow("unwritten control") << "LogControl"
                                            << "";
     }
 
