@@ -247,6 +247,10 @@ bool AddInputFrom(Operator &tool, const ScriptVal &decl, ToolContext &ctx, std::
             return false;
         }
     }
+    // A shape Input without a default starts as an empty shape, so its
+    // overlay has something to append to.
+    if (!def && (type == CLSID_DataType_Polyline || type == CLSID_DataType_BSplinePolyline))
+        def = AutoRef<Parameter>(ParameterScript::FromScript(type, ScriptVal::NewTable(), &why));
     if (!tool.AddInput(OrbID(id), name, type, attrs, def.get())) {
         *error = TakeScriptError();
         return false;

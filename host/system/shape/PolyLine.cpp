@@ -1,0 +1,319 @@
+#include "orbane/PolyLine.h"
+
+#include "Bezier.h"
+#include "orbane/ClassIDs.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace Orbane {
+
+namespace {
+
+bool Finite(const PolyPoint &p)
+{
+    return std::isfinite(p.X) && std::isfinite(p.Y) && std::isfinite(p.InX) && std::isfinite(p.InY) &&
+           std::isfinite(p.OutX) && std::isfinite(p.OutY) && std::isfinite(p.Weight) && p.Weight > 0.0;
+}
+
+float64 Mix(float64 a, float64 b, float64 t)
+{
+    return a + (b - a) * t;
+}
+
+// Times that are unset stay unset: a blend with the sentinel means nothing.
+float64 MixTime(float64 a, float64 b, float64 t)
+{
+    return a == TIME_UNDEFINED || b == TIME_UNDEFINED ? a : Mix(a, b, t);
+}
+
+PolyPoint MixPoint(const PolyPoint &a, const PolyPoint &b, float64 t)
+{
+    PolyPoint p = a;
+    p.X = Mix(a.X, b.X, t), p.Y = Mix(a.Y, b.Y, t);
+    p.InX = Mix(a.InX, b.InX, t), p.InY = Mix(a.InY, b.InY, t);
+    p.OutX = Mix(a.OutX, b.OutX, t), p.OutY = Mix(a.OutY, b.OutY, t);
+    p.Weight = Mix(a.Weight, b.Weight, t), p.Pressure = Mix(a.Pressure, b.Pressure, t);
+    p.Time = MixTime(a.Time, b.Time, t);
+    p.Height = Mix(a.Height, b.Height, t), p.AngleXY = Mix(a.AngleXY, b.AngleXY, t);
+    p.AngleZ = Mix(a.AngleZ, b.AngleZ, t), p.Rotation = Mix(a.Rotation, b.Rotation, t);
+    p.DispX = Mix(a.DispX, b.DispX, t), p.DispY = Mix(a.DispY, b.DispY, t);
+    return p;
+}
+
+} // namespace
+
+PolyLine::PolyLine(const PolyLine &o) : Parameter(), mPoints(o.mPoints), mClosed(o.mClosed)
+{
+    Changed();
+}
+
+PolyLine &PolyLine::operator=(const PolyLine &o)
+{
+    if (this != &o)
+        Copy(o);
+    return *this;
+}
+
+PolyLine::~PolyLine() = default;
+
+const OrbID &PolyLine::DataType() const noexcept
+{
+    return CLSID_DataType_Polyline;
+}
+
+Parameter *PolyLine::Clone() const
+{
+    return new PolyLine(*this);
+}
+
+bool PolyLine::Equals(const Parameter &o) const
+{
+    const auto *p = dynamic_cast<const PolyLine *>(&o);
+    return p && p->DataType() == DataType() && *p == *this;
+}
+
+Parameter *PolyLine::Interpolate(const Parameter &to, float64 t) const
+{
+    const auto *p = dynamic_cast<const PolyLine *>(&to);
+    if (!p || p->DataType() != DataType())
+        return Parameter::Interpolate(to, t);
+    PolyLine *mixed = InterpolateWith(*p, t);
+    mixed->mFromSplineList = true;
+    return mixed;
+}
+
+PolyPoint *PolyLine::First(uint32) const
+{
+    return GetPoint(0);
+}
+
+PolyPoint *PolyLine::Last(uint32) const
+{
+    return GetPoint(GetCount() - 1);
+}
+
+PolyPoint *PolyLine::GetPoint(int32 index) const
+{
+    if (index < 0 || index >= GetCount())
+        return nullptr;
+    // The points are only handed out for walking and reading; a shape held
+    // by an Input is edited through a copy.
+    return const_cast<PolyPoint *>(&mPoints[std::size_t(index)]);
+}
+
+int32 PolyLine::GetIndex(const PolyPoint *p) const noexcept
+{
+    if (mPoints.empty() || p < mPoints.data() || p >= mPoints.data() + mPoints.size())
+        return -1;
+    return int32(p - mPoints.data());
+}
+
+int32 PolyLine::GetSegmentsCount() const noexcept
+{
+    const int32 n = GetCount();
+    if (n < 2)
+        return 0;
+    return mClosed ? n : n - 1;
+}
+
+void PolyLine::SegmentOf(float64 par, int32 &seg, float64 &t) const
+{
+    const int32 segs = GetSegmentsCount();
+    if (segs == 0 || !(par > 0.0)) {
+        seg = 0, t = 0.0;
+        return;
+    }
+    if (par >= segs) {
+        seg = segs - 1, t = 1.0;
+        return;
+    }
+    seg = int32(std::floor(par));
+    t = par - seg;
+}
+
+void PolyLine::SegmentHull(int32 seg, OrbPoint hull[4]) const
+{
+    const PolyPoint &a = mPoints[std::size_t(seg)];
+    const PolyPoint &b = mPoints[std::size_t((seg + 1) % GetCount())];
+    hull[0] = a.Pos(), hull[1] = a.Out(), hull[2] = b.In(), hull[3] = b.Pos();
+}
+
+bool PolyLine::CalcXYZ(float64 par, float64 &x, float64 &y, float64 &z) const
+{
+    if (mPoints.empty())
+        return false;
+    z = 0.0;
+    if (GetSegmentsCount() == 0) {
+        x = mPoints[0].X, y = mPoints[0].Y;
+        return true;
+    }
+    int32 seg;
+    float64 t;
+    SegmentOf(par, seg, t);
+    OrbPoint c[4];
+    SegmentHull(seg, c);
+    const OrbPoint p = Bezier::Eval(c, t);
+    x = p.x, y = p.y;
+    return true;
+}
+
+OrbPoint PolyLine::ValueAt(float64 par) const
+{
+    float64 x = 0.0, y = 0.0, z = 0.0;
+    CalcXYZ(par, x, y, z);
+    return {x, y};
+}
+
+OrbPoint PolyLine::TangentAt(float64 par) const
+{
+    if (GetSegmentsCount() == 0)
+        return {};
+    int32 seg;
+    float64 t;
+    SegmentOf(par, seg, t);
+    OrbPoint c[4];
+    SegmentHull(seg, c);
+    return Bezier::Deriv(c, t);
+}
+
+std::vector<OrbPoint> PolyLine::GetSamplePoints(int32 perSegment) const
+{
+    std::vector<OrbPoint> out;
+    const int32 segs = GetSegmentsCount();
+    if (segs == 0) {
+        if (!mPoints.empty())
+            out.push_back(mPoints[0].Pos());
+        return out;
+    }
+    perSegment = std::max(1, perSegment);
+    out.reserve(std::size_t(segs * perSegment + 1));
+    for (int32 s = 0; s < segs; ++s)
+        for (int32 i = 0; i < perSegment; ++i)
+            out.push_back(ValueAt(s + float64(i) / perSegment));
+    if (!mClosed)
+        out.push_back(ValueAt(segs));
+    return out;
+}
+
+bool PolyLine::AddPoint(const PolyPoint &p)
+{
+    return InsertPoint(GetCount(), p);
+}
+
+bool PolyLine::InsertPoint(int32 index, const PolyPoint &p)
+{
+    if (index < 0 || index > GetCount() || !Finite(p))
+        return false;
+    mPoints.insert(mPoints.begin() + index, p);
+    Changed();
+    return true;
+}
+
+int32 PolyLine::InsertPointAt(float64 par)
+{
+    if (GetSegmentsCount() == 0 || !std::isfinite(par))
+        return -1;
+    int32 seg;
+    float64 t;
+    SegmentOf(par, seg, t);
+    OrbPoint c[4], left[4], right[4];
+    SegmentHull(seg, c);
+    Bezier::Split(c, t, left, right);
+    PolyPoint mid(left[3].x, left[3].y);
+    mid.InX = left[2].x, mid.InY = left[2].y, mid.OutX = right[1].x, mid.OutY = right[1].y;
+    PolyPoint &a = mPoints[std::size_t(seg)];
+    a.OutX = left[1].x, a.OutY = left[1].y;
+    PolyPoint &b = mPoints[std::size_t((seg + 1) % GetCount())];
+    b.InX = right[2].x, b.InY = right[2].y;
+    mid.Time = MixTime(a.Time, b.Time, t), mid.Pressure = Mix(a.Pressure, b.Pressure, t);
+    mPoints.insert(mPoints.begin() + seg + 1, mid);
+    Changed();
+    return seg + 1;
+}
+
+bool PolyLine::MovePoints(const uint8 *selected, float64 dx, float64 dy)
+{
+    if (!std::isfinite(dx) || !std::isfinite(dy) || (dx == 0.0 && dy == 0.0))
+        return false;
+    bool moved = false;
+    for (std::size_t i = 0; i < mPoints.size(); ++i)
+        if (!selected || selected[i]) {
+            mPoints[i].Offset(dx, dy);
+            moved = true;
+        }
+    if (moved)
+        Changed();
+    return moved;
+}
+
+bool PolyLine::DeletePoints(const uint8 *selected)
+{
+    std::size_t kept = 0;
+    for (std::size_t i = 0; i < mPoints.size(); ++i)
+        if (selected && !selected[i])
+            mPoints[kept++] = mPoints[i];
+    if (kept == mPoints.size())
+        return false;
+    mPoints.resize(kept);
+    Changed();
+    return true;
+}
+
+bool PolyLine::DeleteAllPoints()
+{
+    if (mPoints.empty())
+        return false;
+    mPoints.clear();
+    Changed();
+    return true;
+}
+
+bool PolyLine::Close()
+{
+    if (mClosed)
+        return false;
+    mClosed = true;
+    Changed();
+    return true;
+}
+
+bool PolyLine::Open()
+{
+    if (!mClosed)
+        return false;
+    mClosed = false;
+    Changed();
+    return true;
+}
+
+void PolyLine::Copy(const PolyLine &from)
+{
+    mPoints = from.mPoints;
+    mClosed = from.mClosed;
+    Changed();
+}
+
+PolyLine *PolyLine::InterpolateWith(const PolyLine &to, float64 t) const
+{
+    auto *out = static_cast<PolyLine *>((t >= 1.0 ? to : *this).Clone());
+    if (to.GetCount() != GetCount() || t <= 0.0 || t >= 1.0)
+        return out;
+    for (std::size_t i = 0; i < mPoints.size(); ++i)
+        out->mPoints[i] = MixPoint(mPoints[i], to.mPoints[i], t);
+    out->Changed();
+    return out;
+}
+
+bool PolyLine::operator==(const PolyLine &o) const
+{
+    return mClosed == o.mClosed && mPoints == o.mPoints;
+}
+
+void PolyLine::Changed()
+{
+    for (PolyPoint &p : mPoints)
+        p.mOwner = this;
+}
+
+} // namespace Orbane
