@@ -18,6 +18,9 @@ const std::vector<Goal> &Goals()
         {"P5", "load the control library and register every class", "BM_ControlLibrary_Load", nullptr, 2.0, ""},
         {"V1", "hover over 100 rectangles and 100 angle dials, one mouse event", "BM_Viewer_HoverShapes/100/100",
          nullptr, 0.5, ""},
+        {"S1", "freehand reduction, 5,000-sample stroke", "BM_PolyLine_Reduce/5000", nullptr, 10.0, ""},
+        {"S2", "closest point among 100,000 points", "BM_PolyLine_Closest/100000", "BM_NaiveScan_Closest/100000", 0.05,
+         "a scan of every point"},
     };
     return goals;
 }
