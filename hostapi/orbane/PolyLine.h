@@ -202,6 +202,11 @@ private:
     const SegmentIndex &Index() const;
     float64 SegmentDist2(int32 seg, const OrbPoint &p, float64 &t) const;
     void SmoothHandles(int32 i, OrbPoint &in, OrbPoint &out) const;
+    // Calls `edit(point, index)` on each selected point; true (and the
+    // caches dropped) where any call changed its point.
+    template <class F> bool EditSelected(const uint8 *selected, F edit);
+    // Replaces the points with a made shape; false (no change) for none.
+    bool SetMade(std::vector<PolyPoint> made, bool closed);
 
     mutable std::shared_ptr<const SegmentIndex> mIndex;
     bool mClosed = false;

@@ -41,7 +41,29 @@ bool SetHandles(PolyPoint &p, const OrbPoint &in, const OrbPoint &out)
     return true;
 }
 
+// Calls `f(point, its master point)` for every following point whose master
+// point exists; true where any call changed its point.
+template <class F> bool EachFollower(std::vector<PolyPoint> &points, const PolyLine &master, F f)
+{
+    bool changed = false;
+    for (PolyPoint &p : points)
+        if (const PolyPoint *m = (p.Flags & PPF_Following) ? master.GetPoint(p.FollowIndex) : nullptr)
+            changed = f(p, *m) || changed;
+    return changed;
+}
+
 } // namespace
+
+template <class F> bool PolyLine::EditSelected(const uint8 *selected, F edit)
+{
+    bool changed = false;
+    for (std::size_t i = 0; i < mPoints.size(); ++i)
+        if (IsSelected(selected, i))
+            changed = edit(mPoints[i], i) || changed;
+    if (changed)
+        Changed();
+    return changed;
+}
 
 void PolyLine::SmoothHandles(int32 i, OrbPoint &in, OrbPoint &out) const
 {
@@ -63,16 +85,11 @@ void PolyLine::SmoothHandles(int32 i, OrbPoint &in, OrbPoint &out) const
 
 bool PolyLine::Linear(const uint8 *selected)
 {
-    bool changed = false;
-    for (std::size_t i = 0; i < mPoints.size(); ++i)
-        if (IsSelected(selected, i)) {
-            PolyPoint &p = mPoints[i];
-            changed = SetHandles(p, p.Pos(), p.Pos()) || !(p.Flags & PPF_Linear) || changed;
-            p.Flags |= PPF_Linear;
-        }
-    if (changed)
-        Changed();
-    return changed;
+    return EditSelected(selected, [](PolyPoint &p, std::size_t) {
+        const bool changed = SetHandles(p, p.Pos(), p.Pos()) || !(p.Flags & PPF_Linear);
+        p.Flags |= PPF_Linear;
+        return changed;
+    });
 }
 
 bool PolyLine::Smooth(const uint8 *selected)
@@ -84,16 +101,9 @@ bool PolyLine::Tensioning(const uint8 *selected, float64 factor)
 {
     if (!std::isfinite(factor) || factor < 0.0)
         return false;
-    bool changed = false;
-    for (std::size_t i = 0; i < mPoints.size(); ++i)
-        if (IsSelected(selected, i)) {
-            PolyPoint &p = mPoints[i];
-            changed =
-                SetHandles(p, p.Pos() + (p.In() - p.Pos()) * factor, p.Pos() + (p.Out() - p.Pos()) * factor) || changed;
-        }
-    if (changed)
-        Changed();
-    return changed;
+    return EditSelected(selected, [factor](PolyPoint &p, std::size_t) {
+        return SetHandles(p, p.Pos() + (p.In() - p.Pos()) * factor, p.Pos() + (p.Out() - p.Pos()) * factor);
+    });
 }
 
 bool PolyLine::Shaping(const uint8 *selected, float64 amount)
@@ -106,36 +116,25 @@ bool PolyLine::Shaping(const uint8 *selected, float64 amount)
     for (std::size_t i = 0; i < mPoints.size(); ++i)
         if (IsSelected(selected, i))
             SmoothHandles(int32(i), target[i].first, target[i].second);
-    bool changed = false;
-    for (std::size_t i = 0; i < mPoints.size(); ++i)
-        if (IsSelected(selected, i)) {
-            PolyPoint &p = mPoints[i];
-            const OrbPoint in = p.In() + (target[i].first - p.In()) * amount;
-            const OrbPoint out = p.Out() + (target[i].second - p.Out()) * amount;
-            changed = SetHandles(p, in, out) || changed;
-            if (amount > 0.0)
-                p.Flags &= ~uint32(PPF_Linear);
-        }
-    if (changed)
-        Changed();
-    return changed;
+    return EditSelected(selected, [&](PolyPoint &p, std::size_t i) {
+        const OrbPoint in = p.In() + (target[i].first - p.In()) * amount;
+        const OrbPoint out = p.Out() + (target[i].second - p.Out()) * amount;
+        if (amount > 0.0)
+            p.Flags &= ~uint32(PPF_Linear);
+        return SetHandles(p, in, out);
+    });
 }
 
 bool PolyLine::ResetAttrib(const uint8 *selected)
 {
-    bool changed = false;
-    for (std::size_t i = 0; i < mPoints.size(); ++i)
-        if (IsSelected(selected, i)) {
-            PolyPoint &p = mPoints[i];
-            PolyPoint reset = p;
-            reset.Weight = 1.0, reset.Time = TIME_UNDEFINED, reset.Pressure = 1.0;
-            reset.Height = reset.AngleXY = reset.AngleZ = reset.Rotation = 0.0;
-            changed = changed || reset != p;
-            p = reset;
-        }
-    if (changed)
-        Changed();
-    return changed;
+    return EditSelected(selected, [](PolyPoint &p, std::size_t) {
+        PolyPoint reset = p;
+        reset.Weight = 1.0, reset.Time = TIME_UNDEFINED, reset.Pressure = 1.0;
+        reset.Height = reset.AngleXY = reset.AngleZ = reset.Rotation = 0.0;
+        const bool changed = reset != p;
+        p = reset;
+        return changed;
+    });
 }
 
 bool PolyLine::SetDiscontinualSegementMask(const uint8 *selected)
@@ -178,16 +177,12 @@ int32 PolyLine::PublishPoints(const uint8 *selected, int32 firstID)
 
 bool PolyLine::UnpublishPoints(const uint8 *selected)
 {
-    bool changed = false;
-    for (std::size_t i = 0; i < mPoints.size(); ++i)
-        if (IsSelected(selected, i) && (mPoints[i].Flags & PPF_Published)) {
-            mPoints[i].Flags &= ~uint32(PPF_Published);
-            mPoints[i].TagID = 0;
-            changed = true;
-        }
-    if (changed)
-        Changed();
-    return changed;
+    return EditSelected(selected, [](PolyPoint &p, std::size_t) {
+        const bool published = p.Flags & PPF_Published;
+        p.Flags &= ~uint32(PPF_Published);
+        p.TagID = published ? 0 : p.TagID;
+        return published;
+    });
 }
 
 int32 PolyLine::GetPublishedPoint(int32 id) const
@@ -284,15 +279,12 @@ bool PolyLine::SetFollowingPointsOrg(const PolyLine &master)
 
 bool PolyLine::RecalcDisplacements(const PolyLine &master)
 {
-    bool changed = false;
-    for (PolyPoint &p : mPoints) {
-        const PolyPoint *m = (p.Flags & PPF_Following) ? master.GetPoint(p.FollowIndex) : nullptr;
-        if (!m)
-            continue;
-        const float64 dx = p.X - m->X, dy = p.Y - m->Y;
-        changed = changed || dx != p.DispX || dy != p.DispY;
+    const bool changed = EachFollower(mPoints, master, [](PolyPoint &p, const PolyPoint &m) {
+        const float64 dx = p.X - m.X, dy = p.Y - m.Y;
+        const bool moved = dx != p.DispX || dy != p.DispY;
         p.DispX = dx, p.DispY = dy;
-    }
+        return moved;
+    });
     if (changed)
         Changed();
     return changed;
@@ -300,17 +292,11 @@ bool PolyLine::RecalcDisplacements(const PolyLine &master)
 
 bool PolyLine::UpdateShape(const PolyLine &master)
 {
-    bool changed = false;
-    for (PolyPoint &p : mPoints) {
-        const PolyPoint *m = (p.Flags & PPF_Following) ? master.GetPoint(p.FollowIndex) : nullptr;
-        if (!m)
-            continue;
-        const float64 dx = m->X + p.DispX - p.X, dy = m->Y + p.DispY - p.Y;
-        if (dx != 0.0 || dy != 0.0) {
-            p.Offset(dx, dy);
-            changed = true;
-        }
-    }
+    const bool changed = EachFollower(mPoints, master, [](PolyPoint &p, const PolyPoint &m) {
+        const float64 dx = m.X + p.DispX - p.X, dy = m.Y + p.DispY - p.Y;
+        p.Offset(dx, dy);
+        return dx != 0.0 || dy != 0.0;
+    });
     if (changed)
         Changed();
     return changed;
@@ -348,10 +334,8 @@ bool PolyLine::SetReducedPoints(const std::vector<PolyPoint> &samples, float64 t
         pts[i].InX = fitted.InX * pixelW, pts[i].InY = fitted.InY * pixelH;
         pts[i].OutX = fitted.OutX * pixelW, pts[i].OutY = fitted.OutY * pixelH;
     }
-    mPoints = std::move(pts);
-    mClosed = closed && mPoints.size() > 2;
-    Changed();
-    return true;
+    const bool close = closed && pts.size() > 2;
+    return SetMade(std::move(pts), close);
 }
 
 bool PolyLine::ReducePoints(float64 tolerancePx, float64 pixelW, float64 pixelH)
@@ -365,55 +349,37 @@ bool PolyLine::ReducePoints(float64 tolerancePx, float64 pixelW, float64 pixelH)
     return SetReducedPoints(samples, tolerancePx, pixelW, pixelH, mClosed);
 }
 
-namespace {
-
-bool Replace(std::vector<PolyPoint> &points, std::vector<PolyPoint> made)
+bool PolyLine::SetMade(std::vector<PolyPoint> made, bool closed)
 {
     if (made.empty())
         return false;
-    points = std::move(made);
+    mPoints = std::move(made);
+    mClosed = closed;
+    Changed();
     return true;
 }
 
-} // namespace
-
 bool PolyLine::MakeEllipse(float64 cx, float64 cy, float64 rx, float64 ry, int32 points)
 {
-    if (!AllFinite({cx, cy, rx, ry}) || !Replace(mPoints, ShapeMaker::Ellipse(cx, cy, rx, ry, points)))
-        return false;
-    mClosed = true;
-    Changed();
-    return true;
+    return AllFinite({cx, cy, rx, ry}) && SetMade(ShapeMaker::Ellipse(cx, cy, rx, ry, points), true);
 }
 
 bool PolyLine::MakeRectangle(float64 cx, float64 cy, float64 w, float64 h)
 {
-    if (!AllFinite({cx, cy, w, h}) || !Replace(mPoints, ShapeMaker::Rectangle(cx, cy, w, h)))
-        return false;
-    mClosed = true;
-    Changed();
-    return true;
+    return AllFinite({cx, cy, w, h}) && SetMade(ShapeMaker::Rectangle(cx, cy, w, h), true);
 }
 
 bool PolyLine::MakeArrow(float64 x0, float64 y0, float64 x1, float64 y1, float64 shaftWidth, float64 headWidth,
                          float64 headLength)
 {
-    if (!AllFinite({x0, y0, x1, y1, shaftWidth, headWidth, headLength}) ||
-        !Replace(mPoints, ShapeMaker::Arrow({x0, y0}, {x1, y1}, shaftWidth, headWidth, headLength)))
-        return false;
-    mClosed = true;
-    Changed();
-    return true;
+    return AllFinite({x0, y0, x1, y1, shaftWidth, headWidth, headLength}) &&
+           SetMade(ShapeMaker::Arrow({x0, y0}, {x1, y1}, shaftWidth, headWidth, headLength), true);
 }
 
 bool PolyLine::MakeSpiral(float64 cx, float64 cy, float64 r0, float64 r1, float64 turns, int32 pointsPerTurn)
 {
-    if (!AllFinite({cx, cy, r0, r1, turns}) || !(turns > 0.0) ||
-        !Replace(mPoints, ShapeMaker::Spiral(cx, cy, r0, r1, turns, pointsPerTurn)))
-        return false;
-    mClosed = false;
-    Changed();
-    return true;
+    return AllFinite({cx, cy, r0, r1, turns}) && turns > 0.0 &&
+           SetMade(ShapeMaker::Spiral(cx, cy, r0, r1, turns, pointsPerTurn), false);
 }
 
 PolyLine *PolyLine::Convert(const OrbID &dataType) const

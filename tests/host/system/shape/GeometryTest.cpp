@@ -23,9 +23,7 @@ struct ClosestCase
     float64 par;
 };
 
-class Closest : public ::testing::TestWithParam<ClosestCase>
-{
-};
+using Closest = ::testing::TestWithParam<ClosestCase>;
 
 TEST_P(Closest, FindsTheNearestPlaceOnASquare)
 {
@@ -137,9 +135,7 @@ struct ReduceCase
     int maxKeys;
 };
 
-class Reduce : public ::testing::TestWithParam<ReduceCase>
-{
-};
+using Reduce = ::testing::TestWithParam<ReduceCase>;
 
 TEST_P(Reduce, FewKeysWithinTolerance)
 {

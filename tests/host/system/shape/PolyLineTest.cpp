@@ -44,9 +44,7 @@ AutoRef<PolyLine> Build(const EvalCase &c)
     return s;
 }
 
-class Evaluation : public ::testing::TestWithParam<EvalCase>
-{
-};
+using Evaluation = ::testing::TestWithParam<EvalCase>;
 
 TEST_P(Evaluation, MeetsKnownPoint)
 {
@@ -144,9 +142,7 @@ struct MixCase
     OrbPoint handle;
 };
 
-class Interpolation : public ::testing::TestWithParam<MixCase>
-{
-};
+using Interpolation = ::testing::TestWithParam<MixCase>;
 
 // An animated shape Input blends its keys point by point, handles included.
 TEST_P(Interpolation, BetweenKeysOfAnInput)
