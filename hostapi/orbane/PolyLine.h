@@ -200,7 +200,7 @@ private:
     // Segment index for closest-point queries; shared by copies, dropped by
     // any change.
     const SegmentIndex &Index() const;
-    float64 SegmentDist2(int32 seg, const OrbPoint &p, float64 &t) const;
+    float64 SegmentDist2(int32 seg, const OrbPoint &p, float64 &t, float64 bound) const;
     void SmoothHandles(int32 i, OrbPoint &in, OrbPoint &out) const;
     // Calls `edit(point, index)` on each selected point; true (and the
     // caches dropped) where any call changed its point.

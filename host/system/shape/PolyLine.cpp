@@ -7,6 +7,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <limits>
 
 namespace Orbane {
 
@@ -24,6 +25,39 @@ float64 Mix(float64 a, float64 b, float64 t)
 }
 
 // Times that are unset stay unset: a blend with the sentinel means nothing.
+float64 SegmentDist2To(const OrbPoint &a, const OrbPoint &b, const OrbPoint &p)
+{
+    const OrbPoint ab = b - a;
+    const float64 len2 = ab.LengthSquared();
+    const float64 t = len2 > 0.0 ? std::clamp((p - a).Dot(ab) / len2, 0.0, 1.0) : 0.0;
+    return (a + ab * t - p).LengthSquared();
+}
+
+bool InTriangle(const OrbPoint &a, const OrbPoint &b, const OrbPoint &c, const OrbPoint &p)
+{
+    auto side = [&p](const OrbPoint &u, const OrbPoint &v) {
+        return (v.x - u.x) * (p.y - u.y) - (v.y - u.y) * (p.x - u.x);
+    };
+    const float64 s1 = side(a, b), s2 = side(b, c), s3 = side(c, a);
+    return (s1 >= 0 && s2 >= 0 && s3 >= 0) || (s1 <= 0 && s2 <= 0 && s3 <= 0);
+}
+
+// The squared distance from `p` to the convex hull of four points: zero
+// inside (inside one of the triangles of three of them), else the distance
+// to the nearest of the six segments between them, whose outer ones are the
+// hull's edges.
+float64 HullDist2(const OrbPoint h[4], const OrbPoint &p)
+{
+    if (InTriangle(h[0], h[1], h[2], p) || InTriangle(h[0], h[1], h[3], p) || InTriangle(h[0], h[2], h[3], p) ||
+        InTriangle(h[1], h[2], h[3], p))
+        return 0.0;
+    float64 d = std::numeric_limits<float64>::infinity();
+    for (int i = 0; i < 4; ++i)
+        for (int j = i + 1; j < 4; ++j)
+            d = std::min(d, SegmentDist2To(h[i], h[j], p));
+    return d;
+}
+
 float64 MixTime(float64 a, float64 b, float64 t)
 {
     return a == TIME_UNDEFINED || b == TIME_UNDEFINED ? a : Mix(a, b, t);
@@ -240,29 +274,34 @@ const SegmentIndex &PolyLine::Index() const
     return *mIndex;
 }
 
-// Samples the segment, then narrows the best sample's neighbourhood by
-// golden-section search; the samples are dense enough that a cubic piece
-// has one minimum between two of them.
-float64 PolyLine::SegmentDist2(int32 seg, const OrbPoint &p, float64 &t) const
+// Samples the segment, then solves (C(t) - p) . C'(t) = 0 near the best
+// sample by secant steps kept inside the samples on either side; the
+// samples are dense enough that a cubic piece has one minimum between two.
+float64 PolyLine::SegmentDist2(int32 seg, const OrbPoint &p, float64 &t, float64 bound) const
 {
+    // The curve lies in its hull: a hull no nearer than `bound` needs no
+    // closer look.
+    OrbPoint hull[4];
+    SegmentHull(seg, hull);
+    if (const float64 lower = HullDist2(hull, p); lower >= bound)
+        return lower;
     constexpr int32 kSamples = 16;
-    constexpr int32 kRefineSteps = 40;
+    constexpr int32 kSteps = 8;
     auto d2 = [&](float64 u) { return (ValueAt(seg + u) - p).LengthSquared(); };
+    // On the segment's own piece: at u = 1 the parameter names the next one.
+    auto slope = [&](float64 u) { return (ValueAt(seg + u) - p).Dot(TangentAt(seg + std::min(u, 1.0 - 1e-9))); };
     int32 best = 0;
     float64 bestD = d2(0.0);
     for (int32 i = 1; i <= kSamples; ++i)
         if (const float64 d = d2(float64(i) / kSamples); d < bestD)
             bestD = d, best = i;
-    float64 lo = std::max(0.0, (best - 1.0) / kSamples), hi = std::min(1.0, (best + 1.0) / kSamples);
-    const float64 g = 0.5 * (std::sqrt(5.0) - 1.0);
-    for (int32 i = 0; i < kRefineSteps; ++i) {
-        const float64 m1 = hi - g * (hi - lo), m2 = lo + g * (hi - lo);
-        if (d2(m1) < d2(m2))
-            hi = m2;
-        else
-            lo = m1;
+    const float64 lo = std::max(0.0, (best - 1.0) / kSamples), hi = std::min(1.0, (best + 1.0) / kSamples);
+    float64 a = lo, b = hi, fa = slope(a), fb = slope(b);
+    for (int32 i = 0; i < kSteps && fa != fb; ++i) {
+        const float64 c = std::clamp(b - fb * (b - a) / (fb - fa), lo, hi);
+        a = b, fa = fb, b = c, fb = slope(c);
     }
-    t = 0.5 * (lo + hi);
+    t = b;
     const float64 refined = d2(t);
     if (bestD <= refined) {
         t = float64(best) / kSamples;
@@ -289,10 +328,10 @@ float64 PolyLine::CalcClosestPoint(float64 x, float64 y, float64 &px, float64 &p
     int32 seg = 0;
     if (GetSegmentsCount() > 0)
         seg = Index().Nearest(
-            p, [&](int32 s) { return SegmentDist2(s, p, t); }, d2);
+            p, [&](int32 s, float64 bound) { return SegmentDist2(s, p, t, bound); }, d2);
     // The search leaves t at the last segment tried: find it again.
     if (GetSegmentsCount() > 0)
-        d2 = SegmentDist2(seg, p, t);
+        d2 = SegmentDist2(seg, p, t, std::numeric_limits<float64>::infinity());
     const OrbPoint at = ValueAt(seg + t);
     px = at.x, py = at.y;
     if (par)
@@ -352,8 +391,15 @@ bool PolyLine::InsertPoint(int32 index, const PolyPoint &p)
 {
     if (index < 0 || index > GetCount() || !Finite(p))
         return false;
+    const PolyPoint *before = mPoints.data();
     mPoints.insert(mPoints.begin() + index, p);
-    Changed();
+    mIndex.reset();
+    // Appending without moving the others tells only the new point its
+    // shape, so building a shape point by point stays linear.
+    if (mPoints.data() == before && index == GetCount() - 1)
+        mPoints.back().mOwner = this;
+    else
+        Adopt();
     return true;
 }
 

@@ -1,7 +1,9 @@
 #include "SegmentIndex.h"
 
 #include <algorithm>
+#include <functional>
 #include <limits>
+#include <queue>
 
 namespace Orbane {
 
@@ -59,35 +61,33 @@ int32 SegmentIndex::Build(int32 first, int32 count)
     return self;
 }
 
+// Best first: boxes are opened nearest first, so the search ends as soon as
+// the nearest unopened box is no nearer than the best segment found.
 int32 SegmentIndex::Nearest(const OrbPoint &p, const SegmentDist2 &exact, float64 &dist2) const
 {
     dist2 = std::numeric_limits<float64>::infinity();
     int32 best = -1;
     if (mNodes.empty())
         return best;
-    std::vector<int32> stack{0};
-    while (!stack.empty()) {
-        const Node &n = mNodes[std::size_t(stack.back())];
-        stack.pop_back();
-        if (n.box.Dist2(p) >= dist2)
-            continue;
-        if (n.left < 0) {
-            for (int32 i = n.first; i < n.first + n.count; ++i) {
-                const int32 seg = mOrder[std::size_t(i)];
-                if (mBoxes[std::size_t(seg)].Dist2(p) >= dist2)
-                    continue;
-                const float64 d = exact(seg);
-                if (d < dist2)
-                    dist2 = d, best = seg;
-            }
+    using Entry = std::pair<float64, int32>; // box distance, node
+    std::priority_queue<Entry, std::vector<Entry>, std::greater<Entry>> open;
+    open.emplace(mNodes[0].box.Dist2(p), 0);
+    while (!open.empty() && open.top().first < dist2) {
+        const Node &n = mNodes[std::size_t(open.top().second)];
+        open.pop();
+        if (n.left >= 0) {
+            open.emplace(mNodes[std::size_t(n.left)].box.Dist2(p), n.left);
+            open.emplace(mNodes[std::size_t(n.right)].box.Dist2(p), n.right);
             continue;
         }
-        // The nearer child goes on top, so it is searched first and its
-        // result prunes the other.
-        const Node &l = mNodes[std::size_t(n.left)], &r = mNodes[std::size_t(n.right)];
-        const bool leftFirst = l.box.Dist2(p) <= r.box.Dist2(p);
-        stack.push_back(leftFirst ? n.right : n.left);
-        stack.push_back(leftFirst ? n.left : n.right);
+        for (int32 i = n.first; i < n.first + n.count; ++i) {
+            const int32 seg = mOrder[std::size_t(i)];
+            if (mBoxes[std::size_t(seg)].Dist2(p) >= dist2)
+                continue;
+            const float64 d = exact(seg, dist2);
+            if (d < dist2)
+                dist2 = d, best = seg;
+        }
     }
     return best;
 }

@@ -19,8 +19,9 @@ public:
         float64 x0, y0, x1, y1;
         float64 Dist2(const OrbPoint &p) const noexcept;
     };
-    // The exact squared distance from the query point to one segment.
-    using SegmentDist2 = std::function<float64(int32 seg)>;
+    // The exact squared distance from the query point to one segment, or
+    // any value at least `bound` where the segment is surely no nearer.
+    using SegmentDist2 = std::function<float64(int32 seg, float64 bound)>;
 
     explicit SegmentIndex(std::vector<Box> segments);
 
