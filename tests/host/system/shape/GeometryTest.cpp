@@ -164,6 +164,26 @@ INSTANTIATE_TEST_SUITE_P(Stroke, Reduce,
                                            ReduceCase{"Smooth", 8.0, 60}),
                          [](const auto &info) { return std::string(info.param.name); });
 
+// A shape of many corners along a circle becomes a few smooth points that
+// stay on it, with the pen values of the points they replace.
+TEST(Reduce, OwnPointsKeepTheShapeAndThePenValues)
+{
+    AutoRef<PolyLine> s(new PolyLine);
+    for (int i = 0; i < 360; ++i) {
+        PolyPoint p(0.5 + 0.25 * std::cos(i * kPi / 180), 0.5 + 0.25 * std::sin(i * kPi / 180));
+        p.Pressure = 0.5;
+        s->AddPoint(p);
+    }
+    s->Close();
+    // One pixel is a thousandth of the image; within half a pixel.
+    ASSERT_TRUE(s->ReducePoints(0.5, 1e-3, 1e-3));
+    EXPECT_TRUE(s->IsClosed());
+    EXPECT_LE(s->GetCount(), 24);
+    for (const OrbPoint &p : s->GetSamplePoints(8))
+        EXPECT_NEAR((p - OrbPoint(0.5, 0.5)).Length(), 0.25, 0.6e-3);
+    EXPECT_EQ(s->First()->Pressure, 0.5);
+}
+
 TEST(Expand, GrowsACircleByTheAmountAndShrinksItAway)
 {
     AutoRef<PolyLine> circle(new PolyLine);
