@@ -22,7 +22,8 @@ const OrbID CLSID_DataType_Point("Point");
 const OrbID CLSID_DataType_Text("Text");
 const OrbID CLSID_DataType_Image("Image");
 const OrbID CLSID_DataType_ID("ID");
-const OrbID CLSID_DataType_PolyLine("PolyLine");
+const OrbID CLSID_DataType_Polyline("PolyLine");
+const OrbID CLSID_DataType_BSplinePolyline("BSplinePolyLine");
 const OrbID CLSID_DataType_ScriptVal("ScriptVal");
 
 } // namespace Orbane

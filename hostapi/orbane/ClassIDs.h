@@ -25,7 +25,8 @@ extern const OrbID CLSID_DataType_Point;
 extern const OrbID CLSID_DataType_Text;
 extern const OrbID CLSID_DataType_Image;
 extern const OrbID CLSID_DataType_ID;
-extern const OrbID CLSID_DataType_PolyLine;
+extern const OrbID CLSID_DataType_Polyline;
+extern const OrbID CLSID_DataType_BSplinePolyline;
 extern const OrbID CLSID_DataType_ScriptVal;
 
 } // namespace Orbane

@@ -11,7 +11,7 @@ class ScriptVal;
 
 // Script values of Input data types, both ways: a Number is a number, a
 // Point a table {x, y[, z]} (also {X=, Y=, Z=}), Text a string, an ID a
-// string, a ScriptVal a table.
+// string, a ScriptVal a table, a shape the table of PolyLineScript.
 class ParameterScript
 {
 public:

@@ -5,6 +5,8 @@
 #include "orbane/Number.h"
 #include "orbane/OrbIDParam.h"
 #include "orbane/Point.h"
+#include "orbane/PolyLine.h"
+#include "orbane/PolyLineScript.h"
 #include "orbane/ScriptVal.h"
 #include "orbane/ScriptValParam.h"
 #include "orbane/Text.h"
@@ -52,10 +54,18 @@ Parameter *Make(const OrbID &type, const ScriptVal &v)
     return nullptr;
 }
 
+bool IsShape(const OrbID &type)
+{
+    return type == CLSID_DataType_Polyline || type == CLSID_DataType_BSplinePolyline;
+}
+
 } // namespace
 
 Parameter *ParameterScript::FromScript(const OrbID &dataType, const ScriptVal &value, std::string *error)
 {
+    // A shape says itself what is wrong with it (which point, which field).
+    if (IsShape(dataType))
+        return PolyLineScript::FromScript(dataType, value, error);
     if (Parameter *p = Make(dataType, value))
         return p;
     if (error)
@@ -80,6 +90,8 @@ ScriptVal ParameterScript::ToScript(const Parameter *value)
         return ScriptVal(id->Value.c_str());
     if (auto s = dynamic_cast<const ScriptValParam *>(value))
         return ScriptValParam::DeepCopy(s->Value);
+    if (auto shape = dynamic_cast<const PolyLine *>(value))
+        return PolyLineScript::ToScript(*shape);
     if (auto i = dynamic_cast<const ImageParam *>(value))
         return ScriptVal(i->Path.c_str());
     return ScriptVal();

@@ -191,6 +191,8 @@ bool BuildAttrs(const ScriptVal &decl, const char *name, TagList &tags, ToolCont
         tags.Add(INPA_PreviewControl, OrbID(c));
         classes.push_back(c);
     }
+    if (const ScriptVal *ro = decl.FindKeyConst(ScriptVal("readOnly")); ro && ro->GetBool())
+        tags.Add(INPA_ReadOnly, int64(1));
     for (const std::string &id : Names(decl, "overlayInputs"))
         tags.Add(INPA_OverlayInput, OrbID(id));
     if (const ScriptVal *attrs = decl.FindKeyConst(ScriptVal("attrs")); attrs && !AddNumberedAttrs(*attrs, tags, error))
@@ -247,6 +249,10 @@ bool AddInputFrom(Operator &tool, const ScriptVal &decl, ToolContext &ctx, std::
             return false;
         }
     }
+    // A shape Input without a default starts as an empty shape, so its
+    // overlay has something to append to.
+    if (!def && (type == CLSID_DataType_Polyline || type == CLSID_DataType_BSplinePolyline))
+        def = AutoRef<Parameter>(ParameterScript::FromScript(type, ScriptVal::NewTable(), &why));
     if (!tool.AddInput(OrbID(id), name, type, attrs, def.get())) {
         *error = TakeScriptError();
         return false;
