@@ -12,6 +12,7 @@
 #include "overlays/CrosshairControl.h"
 #include "overlays/PointControl.h"
 #include "overlays/RectangleControl.h"
+#include "polyline/PolyLineControl.h"
 
 #include "orbane/OverlayControl.h"
 
@@ -63,7 +64,6 @@ ORBANE_PENDING_INPUT(MultiButtonControl);
 ORBANE_PENDING_PREVIEW(ObloidControl);
 ORBANE_PENDING_INPUT(OffsetControl);
 ORBANE_PENDING_INPUT(PatternControl);
-ORBANE_PENDING_PREVIEW(PolyLineControl);
 ORBANE_PENDING_PREVIEW(PositionerControl);
 ORBANE_PENDING_INPUT(RangeControl);
 ORBANE_PENDING_INPUT(ScrewControl);
