@@ -9,5 +9,6 @@ return {
     { file = "tools/Sliders.lua", name = "Sliders1" },
     { file = "tools/Choices.lua", name = "Choices1" },
     { file = "tools/Transform.lua", name = "Transform1" },
+    { file = "tools/Roto.lua", name = "Roto1" },
   },
 }

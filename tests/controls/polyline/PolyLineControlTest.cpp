@@ -131,6 +131,7 @@ private slots:
     void drawing_data();
     void drawing();
     void onionSkinsOfTheOtherKeyframes();
+    void hoverLightsAPointAndADragMovesIt();
     void appendTakesAnyPress_data();
     void appendTakesAnyPress();
     void clickAppendAddsClosesAndUndoes();
@@ -317,6 +318,35 @@ void PolyLineControlTest::onionSkinsOfTheOtherKeyframes()
         skins += c.kind == RP::Arrays && c.stipple == 0x0F0F;
     QCOMPARE(skins, 2);
     QCOMPARE(drawn.Count(RP::Arrays, Overlay(f)), 1);
+}
+
+// In "Modify Only" the point under the mouse lights up yellow; dragging it
+// moves it and its handles, one step "Move Point".
+void PolyLineControlTest::hoverLightsAPointAndADragMovesIt()
+{
+    ViewerFixture f;
+    Input *shape = AddShape(f, {{0.2, 0.2}, {0.5, 0.5}, {0.8, 0.3}}, TagList{{PLC_DrawMode, 4}});
+    QVERIFY(f.Show());
+    PreviewControl *overlay = f.OverlayOf(shape);
+    const QPoint at = f.At({0.5, 0.5});
+    f.Hover(at + QPoint(3, 2));
+    QCOMPARE(Field(overlay, "hover"), 1.0);
+    QCOMPARE(Field(overlay, "hoverPart"), 1.0);
+    RecordingPainter drawn;
+    Record(f, overlay, drawn);
+    QCOMPARE(drawn.Count(RP::Filled, {1, 1, 0, 1}), 1);
+    f.Hover(at + QPoint(9, 0));
+    QCOMPARE(Field(overlay, "hover"), 0.0);
+
+    f.Drag(at + QPoint(3, 2), at + QPoint(43, -18));
+    const AutoParam<PolyLine> moved = ShapeOf(f, shape);
+    QVERIFY(NearPoint(moved->GetPoint(1)->Pos(), ImageAt(f, at + QPoint(40, -20)), 1e-3));
+    QVERIFY(NearPoint(moved->GetPoint(1)->Out(), moved->GetPoint(1)->Pos()));
+    QVERIFY(NearPoint(moved->GetPoint(0)->Pos(), {0.2, 0.2}));
+    QCOMPARE(f.doc.UndoNames(), QStringList({"Move Point"}));
+    QCOMPARE(StateOf(overlay).FindKeyConst(ScriptVal("selected"))->Length(), 1);
+    QVERIFY(f.doc.Undo());
+    QVERIFY(NearPoint(ShapeOf(f, shape)->GetPoint(1)->Pos(), {0.5, 0.5}));
 }
 
 void PolyLineControlTest::appendTakesAnyPress_data()
