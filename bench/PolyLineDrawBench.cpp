@@ -4,6 +4,7 @@
 // squares, each with its shadow. The goal: a whole repaint inside one frame
 // of a 120 Hz display, 8.3 ms.
 #include "BenchModule.h"
+#include "BenchViewer.h"
 
 #include "orbane/ClassIDs.h"
 #include "orbane/Input.h"
@@ -24,8 +25,8 @@ namespace {
 
 using namespace Orbane;
 
-constexpr int Width = 800, Height = 450;
-constexpr int ImageWidth = 1600, ImageHeight = 900;
+constexpr int Width = BenchViewer::Width, Height = BenchViewer::Height;
+constexpr int ImageWidth = BenchViewer::ImageWidth, ImageHeight = BenchViewer::ImageHeight;
 constexpr Tag PLC_DrawMode = 0x10058000;
 
 OrbPoint RingAt(double t)
@@ -50,31 +51,14 @@ AutoRef<PolyLine> Ring(int count)
     return shape;
 }
 
-QImage Backdrop()
+struct ShapeRig : BenchViewer
 {
-    QImage image(ImageWidth, ImageHeight, QImage::Format_ARGB32_Premultiplied);
-    image.fill(QColor(40, 60, 90));
-    return image;
-}
-
-struct ShapeRig
-{
-    explicit ShapeRig(int count) : viewer(&doc)
+    explicit ShapeRig(int count) : BenchViewer("Roto1", "Roto")
     {
-        auto *tool = new Operator("Roto1", "Roto");
-        doc.AddTool(tool);
-        tool->DecRef();
         const TagList attrs{{INPA_PreviewControl, OrbID("PolylineControl")}, {PLC_DrawMode, 4}};
         tool->AddInput(OrbID("Mask"), nullptr, CLSID_DataType_Polyline, attrs, Ring(count).get());
-        viewer.SetImage(Backdrop());
-        viewer.resize(Width, Height);
-        viewer.ShowTool(tool);
-        viewer.show();
-        QApplication::processEvents();
+        Show();
     }
-
-    OrbaneDoc doc;
-    ViewerPanel viewer;
 };
 
 void BM_Viewer_DrawPolyLine(benchmark::State &state)
@@ -95,7 +79,7 @@ void BM_Viewer_DrawPolyLine(benchmark::State &state)
 void BM_NaiveQPainter_DrawPolyLine(benchmark::State &state)
 {
     const AutoRef<PolyLine> ring = Ring(int(state.range(0)));
-    const QImage image = Backdrop();
+    const QImage image = BenchViewer::Backdrop();
     const double zoom = std::min(double(Width) / ImageWidth, double(Height) / ImageHeight);
     const QPointF origin((Width - ImageWidth * zoom) / 2, (Height - ImageHeight * zoom) / 2);
     auto widget = [&](OrbPoint p) {

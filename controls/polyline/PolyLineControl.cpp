@@ -36,23 +36,6 @@ constexpr float64 kCentreArm = 8.0;
 // gone this many viewer pixels from it; a wobble of the hand adds a corner.
 constexpr float64 kPullDistance = 3.0;
 
-bool ReadNumber(const Parameter *value, float64 &out)
-{
-    const auto *n = dynamic_cast<const Number *>(value);
-    if (!n || !std::isfinite(n->Value))
-        return false;
-    out = n->Value;
-    return true;
-}
-
-bool Take(float64 &copy, float64 to)
-{
-    if (!PreviewControl::Moved(copy, to))
-        return false;
-    copy = to;
-    return true;
-}
-
 // The colour with its alpha byte replaced by the fade.
 OrbColor WithFade(OrbColor c, float32 fade)
 {
@@ -113,13 +96,7 @@ bool PolyLineControl::SetAttrsTagList(Input *input, const TagList &tags)
     if (OrbaneDoc *doc = GetDoc())
         mExportSplineMode = uint16(doc->GetPrefs().GetLong(PREF_ExportSplineMode, mExportSplineMode));
     EmptySelectionWhenHidden();
-    // Linked Inputs show their values from the moment they are linked.
-    for (std::size_t i = 0; i < std::size(Links); ++i)
-        if (linked & (1u << i)) {
-            Input *in = this->*(Links[i].slot);
-            const AutoParameter value(in->GetValue(GetCurrentTime()));
-            NotifyChanged(in, value.get(), nullptr);
-        }
+    NotifyLinkedInputs(*this, Links, linked);
     UpdateDisplay(nullptr, nullptr);
     return HandleOverlay::SetAttrsTagList(input, tags);
 }
@@ -324,10 +301,10 @@ bool PolyLineControl::StoreShape(const Parameter *value)
 void PolyLineControl::StoreLinked(Input *input, const Parameter *value, bool &moved)
 {
     float64 n = 0.0;
-    const bool isNumber = ReadNumber(value, n);
+    const bool isNumber = ReadLinkedNumber(value, n);
     if (input == mCenterInput)
         if (const auto *p = dynamic_cast<const Point *>(value))
-            moved = (Take(mCenter.x, p->X) | Take(mCenter.y, p->Y)) || moved;
+            moved = (TakeMoved(mCenter.x, p->X) | TakeMoved(mCenter.y, p->Y)) || moved;
     for (auto [in, field] : {std::pair{mCenterXInput, &mCenter.x},
                              {mCenterYInput, &mCenter.y},
                              {mAngleInput, &mAngle},
@@ -337,7 +314,7 @@ void PolyLineControl::StoreLinked(Input *input, const Parameter *value, bool &mo
                              {mTrackerSizeInput, &mTrackerSize},
                              {mTrackerSearchSizeInput, &mTrackerSearchSize}})
         if (in == input && isNumber)
-            moved = Take(*field, n) || moved;
+            moved = TakeMoved(*field, n) || moved;
     // The shapes paired with this one redraw with it.
     if (input == mOuterInput || input == mInnerInput)
         moved = true;
