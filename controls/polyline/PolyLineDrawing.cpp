@@ -58,6 +58,16 @@ void SquareLines(GPainter &p, OrbPoint at, OrbPoint half)
     p.Vertex(x1, y2), p.Vertex(x1, y1);
 }
 
+// A square's outline as one line loop: the painter strokes it in one call,
+// where it strokes each line of a GP_Lines batch alone.
+void SquareLoop(GPainter &p, OrbPoint at, OrbPoint half)
+{
+    p.Begin(Graphics::GP_LineLoop);
+    p.Vertex(at.x - half.x, at.y - half.y), p.Vertex(at.x + half.x, at.y - half.y);
+    p.Vertex(at.x + half.x, at.y + half.y), p.Vertex(at.x - half.x, at.y + half.y);
+    p.End();
+}
+
 void FilledSquare(GPainter &p, OrbPoint at, OrbPoint half)
 {
     p.Rectangle(at.x - half.x, at.y - half.y, at.x + half.x, at.y + half.y);
@@ -229,11 +239,18 @@ void PolyLineDrawing::DrawMarkers(GPainter &p, const PolyLine &shape, const SelM
     const HandleHit hotPoint = style.hot.part == 1 ? style.hot : HandleHit{};
     if (!selectedOnly) {
         p.Color(style.keyPoint, style.shadow);
-        p.Begin(Graphics::GP_Lines);
-        for (int32 i = 0; i < count; ++i)
-            if (!selection.IsSet(i) && hotPoint.item != i)
-                SquareLines(p, shape.GetPoint(i)->Pos(), style.half);
-        p.End();
+        OrbPoint last(-1e300, -1e300);
+        for (int32 i = 0; i < count; ++i) {
+            const OrbPoint at = shape.GetPoint(i)->Pos();
+            // A marker within half a side of the last one drawn would hide
+            // under it and show no point apart: a dense shape seen from afar
+            // draws a marker each half side along it, as many as can show.
+            const bool hidden = std::fabs(at.x - last.x) < style.half.x && std::fabs(at.y - last.y) < style.half.y;
+            if (selection.IsSet(i) || hotPoint.item == i || hidden)
+                continue;
+            SquareLoop(p, at, style.half);
+            last = at;
+        }
     }
     p.Color(style.keyPoint, style.shadow);
     for (int32 i = 0; i < count; ++i)

@@ -40,11 +40,16 @@ AutoRef<PolyLine> MakeShape(const Points &points, bool closed = false)
     return shape;
 }
 
-Input *AddShape(ViewerFixture &f, const Points &points, const TagList &more = TagList(), const char *id = "Shape")
+Input *AddShapeValue(ViewerFixture &f, const PolyLine *shape, const TagList &more = TagList(), const char *id = "Shape")
 {
     TagList attrs{{INPA_PreviewControl, OrbID("PolylineControl")}};
     attrs.Append(more);
-    return f.tool->AddInput(OrbID(id), id, CLSID_DataType_Polyline, attrs, MakeShape(points).get());
+    return f.tool->AddInput(OrbID(id), id, CLSID_DataType_Polyline, attrs, shape);
+}
+
+Input *AddShape(ViewerFixture &f, const Points &points, const TagList &more = TagList(), const char *id = "Shape")
+{
+    return AddShapeValue(f, MakeShape(points).get(), more, id);
 }
 
 // A tool of its own in place of the fixture's, with tool attributes.
@@ -167,11 +172,8 @@ void PolyLineControlTest::setUp_data()
         << TagList{{PLC_DrawMode, 0x34}} << none << false << 0x87 << 4 << arrow << 0 << 1;
     QTest::newRow("points and handles hidden")
         << TagList{{PLC_ShowKeyPoints, 0}, {PLC_ShowHandles, 0}} << none << false << 0x84 << 0 << arrow << 0 << 1;
-    QTest::newRow("curve hidden") << TagList{{PLC_ShowPolyLine, 0}} << none << false << 0x83 << 0 << arrow << 0 << 1;
     QTest::newRow("selected shown when hidden")
         << TagList{{PLC_SelectedWhenHidden, 1}} << none << false << 0x8F << 0 << arrow << 0 << 1;
-    QTest::newRow("tagged ids off") << TagList{{PLC_ShowTaggedPointIDs, 0}} << none << false << 0x07 << 0 << arrow << 0
-                                    << 1;
     QTest::newRow("dash") << TagList{{PLC_DrawStyle, 1}} << none << false << 0x97 << 0 << arrow << 0 << 1;
     QTest::newRow("style 2") << TagList{{PLC_DrawStyle, 2}} << none << false << 0xA7 << 0 << arrow << 0 << 1;
     QTest::newRow("null is 5") << TagList{{PLC_DrawStyle, 5}} << none << false << 0xC7 << 0 << arrow << 0 << 1;
@@ -245,9 +247,10 @@ void PolyLineControlTest::drawing_data()
     QTest::addColumn<int>("curves");      // line strips drawn from the flattened curve
     QTest::addColumn<uint>("curveColor"); // OrbColor packed; none: the viewer's overlay colour
     QTest::addColumn<int>("stipple");     // of the curve
-    QTest::addColumn<int>("markers");     // key point outlines drawn in keyColor (one batch)
+    QTest::addColumn<int>("markers");     // key point outlines drawn in keyColor
     QTest::addColumn<uint>("keyColor");
     QTest::addColumn<int>("centre"); // the magenta centre marker
+    QTest::addColumn<int>("labels"); // tagged point ids (the second point is tagged 7)
     const TagList centre{{PLCID_Center, OrbID("Center")}, {PLC_DrawMode, 4}};
     const uint none = OrbColor::None, grey = OrbColor(192, 192, 192).Packed();
     const uint yellow = OrbColor(192, 192, 0).Packed();
@@ -256,24 +259,31 @@ void PolyLineControlTest::drawing_data()
         t.Append(more);
         return t;
     };
-    QTest::newRow("empty: nothing, not even the centre") << centre << 0 << false << 0 << none << 0 << 0 << yellow << 0;
-    QTest::newRow("one point: its marker and the centre") << centre << 1 << false << 0 << none << 0 << 1 << yellow << 1;
-    QTest::newRow("three points, modify only") << centre << 3 << false << 1 << none << 0 << 1 << yellow << 1;
-    QTest::newRow("done draws grey") << TagList{{PLCID_Center, OrbID("Center")}} << 3 << false << 1 << grey << 0 << 1
-                                     << yellow << 1;
-    QTest::newRow("a locked tool draws grey") << centre << 3 << true << 1 << grey << 0 << 1 << yellow << 1;
+    QTest::newRow("empty: nothing, not even the centre")
+        << centre << 0 << false << 0 << none << 0 << 0 << yellow << 0 << 0;
+    QTest::newRow("one point: its marker and the centre")
+        << centre << 1 << false << 0 << none << 0 << 1 << yellow << 1 << 0;
+    QTest::newRow("three points, modify only") << centre << 3 << false << 1 << none << 0 << 3 << yellow << 1 << 1;
+    QTest::newRow("done draws grey") << TagList{{PLCID_Center, OrbID("Center")}} << 3 << false << 1 << grey << 0 << 3
+                                     << yellow << 1 << 1;
+    QTest::newRow("a locked tool draws grey") << centre << 3 << true << 1 << grey << 0 << 3 << yellow << 1 << 1;
     QTest::newRow("points and handles hidden: the curve alone")
-        << with({{PLC_ShowKeyPoints, 0}, {PLC_ShowHandles, 0}}) << 3 << false << 1 << none << 0 << 0 << yellow << 1;
-    QTest::newRow("dash") << with({{PLC_DrawStyle, 1}}) << 3 << false << 1 << none << 0xF0F0 << 1 << yellow << 1;
-    QTest::newRow("null: no curve") << with({{PLC_DrawStyle, 5}}) << 3 << false << 0 << none << 0 << 1 << yellow << 1;
-    QTest::newRow("curve hidden") << with({{PLC_ShowPolyLine, 0}}) << 3 << false << 0 << none << 0 << 1 << yellow << 1;
+        << with({{PLC_ShowKeyPoints, 0}, {PLC_ShowHandles, 0}}) << 3 << false << 1 << none << 0 << 0 << yellow << 1
+        << 0;
+    QTest::newRow("dash") << with({{PLC_DrawStyle, 1}}) << 3 << false << 1 << none << 0xF0F0 << 3 << yellow << 1 << 1;
+    QTest::newRow("null: no curve") << with({{PLC_DrawStyle, 5}}) << 3 << false << 0 << none << 0 << 3 << yellow << 1
+                                    << 1;
+    QTest::newRow("curve hidden") << with({{PLC_ShowPolyLine, 0}}) << 3 << false << 0 << none << 0 << 3 << yellow << 1
+                                  << 1;
     QTest::newRow("handle colour") << with({{PLC_HandleColor, OrbColor(255, 0, 0).Packed()}}) << 3 << false << 1 << none
-                                   << 0 << 1 << OrbColor(255, 0, 0).Packed() << 1;
+                                   << 0 << 3 << OrbColor(255, 0, 0).Packed() << 1 << 1;
     QTest::newRow("key point colour before the handle colour")
         << with({{PLC_HandleColor, OrbColor(255, 0, 0).Packed()}, {PLC_KeyPointColor, OrbColor(0, 255, 0).Packed()}})
-        << 3 << false << 1 << none << 0 << 1 << OrbColor(0, 255, 0).Packed() << 1;
+        << 3 << false << 1 << none << 0 << 3 << OrbColor(0, 255, 0).Packed() << 1 << 1;
+    QTest::newRow("tagged ids off") << with({{PLC_ShowTaggedPointIDs, 0}}) << 3 << false << 1 << none << 0 << 3
+                                    << yellow << 1 << 0;
     QTest::newRow("spline colour") << with({{PCA_Color, OrbColor(0, 0, 255).Packed()}}) << 3 << false << 1
-                                   << OrbColor(0, 0, 255).Packed() << 0 << 1 << yellow << 1;
+                                   << OrbColor(0, 0, 255).Packed() << 0 << 3 << yellow << 1 << 1;
 }
 
 void PolyLineControlTest::drawing()
@@ -285,7 +295,16 @@ void PolyLineControlTest::drawing()
     QFETCH(uint, keyColor);
     ViewerFixture f;
     const Points all{{0.2, 0.2}, {0.8, 0.3}, {0.5, 0.8}};
-    Input *shape = AddShape(f, Points(all.begin(), all.begin() + points), attrs);
+    AutoRef<PolyLine> drawnShape(new PolyLine);
+    for (int i = 0; i < points; ++i) {
+        PolyPoint p(all[std::size_t(i)].x, all[std::size_t(i)].y);
+        if (i == 1) {
+            p.Flags |= PPF_Tagged;
+            p.TagID = 7;
+        }
+        drawnShape->AddPoint(p);
+    }
+    Input *shape = AddShapeValue(f, drawnShape.get(), attrs);
     f.AddPoint("Center", 0.5, 0.5);
     QVERIFY(f.Show());
     f.tool->SetLocked(locked);
@@ -296,8 +315,11 @@ void PolyLineControlTest::drawing()
     QCOMPARE(drawn.Count(RP::Arrays), drawn.Count(RP::Arrays, curve));
     if (const RP::Call *c = drawn.First(RP::Arrays))
         QTEST(int(c->stipple), "stipple");
-    QTEST(drawn.Count(RP::Primitive, Graphics::GColor::FromOrb(OrbColor(keyColor)), Graphics::GP_Lines), "markers");
+    QTEST(drawn.Count(RP::Primitive, Graphics::GColor::FromOrb(OrbColor(keyColor)), Graphics::GP_LineLoop), "markers");
     QTEST(drawn.Count(RP::Primitive, {1, 0, 1, 1}, Graphics::GP_Lines), "centre");
+    QTEST(drawn.Count(RP::Label), "labels");
+    if (const RP::Call *label = drawn.First(RP::Label))
+        QCOMPARE(label->text, std::string("7"));
     // Nothing is selected: no filled marker, no handle.
     QCOMPARE(drawn.Count(RP::Filled), 0);
 }
