@@ -6,7 +6,7 @@ set -euo pipefail
 packages=(
     build-essential cmake pkg-config git
     qtbase5-dev libqt5svg5-dev
-    libluajit-5.1-dev luajit libmuparser-dev
+    libluajit-5.1-dev luajit libmuparser-dev libpolyclipping-dev libpugixml-dev
     googletest libgtest-dev libbenchmark-dev
     fonts-dejavu-core
 )

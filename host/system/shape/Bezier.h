@@ -12,9 +12,6 @@ public:
     static OrbPoint Deriv(const OrbPoint c[4], float64 t) noexcept;
     // Splits at `t` into `left` and `right` (de Casteljau).
     static void Split(const OrbPoint c[4], float64 t, OrbPoint left[4], OrbPoint right[4]) noexcept;
-    // Arc length from 0 to `t`, by Gauss-Legendre quadrature on halves
-    // until they agree.
-    static float64 Length(const OrbPoint c[4], float64 t = 1.0) noexcept;
 };
 
 } // namespace Orbane

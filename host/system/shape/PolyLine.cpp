@@ -1,6 +1,8 @@
 #include "orbane/PolyLine.h"
 
 #include "Bezier.h"
+#include "CurveMeasure.h"
+#include "SegmentIndex.h"
 #include "orbane/ClassIDs.h"
 
 #include <algorithm>
@@ -43,9 +45,9 @@ PolyPoint MixPoint(const PolyPoint &a, const PolyPoint &b, float64 t)
 
 } // namespace
 
-PolyLine::PolyLine(const PolyLine &o) : Parameter(), mPoints(o.mPoints), mClosed(o.mClosed)
+PolyLine::PolyLine(const PolyLine &o) : Parameter(), mPoints(o.mPoints), mIndex(o.mIndex), mClosed(o.mClosed)
 {
-    Changed();
+    Adopt();
 }
 
 PolyLine &PolyLine::operator=(const PolyLine &o)
@@ -196,6 +198,151 @@ std::vector<OrbPoint> PolyLine::GetSamplePoints(int32 perSegment) const
     return out;
 }
 
+std::vector<PolyPoint> PolyLine::GetDigitalPoints(float64 spacing) const
+{
+    std::vector<PolyPoint> out;
+    const int32 segs = GetSegmentsCount();
+    if (segs == 0 || !(spacing > 0.0)) {
+        out.assign(mPoints.begin(), mPoints.end());
+        return out;
+    }
+    for (int32 s = 0; s < segs; ++s) {
+        const PolyPoint &a = mPoints[std::size_t(s)], &b = mPoints[std::size_t((s + 1) % GetCount())];
+        const int32 steps = std::max(1, int32(std::ceil(Distance(s, s + 1) / spacing)));
+        const bool last = s == segs - 1 && !mClosed;
+        for (int32 i = 0; i < steps + (last ? 1 : 0); ++i) {
+            const float64 t = float64(i) / steps;
+            const OrbPoint at = ValueAt(s + t);
+            PolyPoint p = MixPoint(a, b, t);
+            p.X = p.InX = p.OutX = at.x;
+            p.Y = p.InY = p.OutY = at.y;
+            p.Flags = 0, p.TagID = 0, p.FollowIndex = -1;
+            out.push_back(p);
+        }
+    }
+    return out;
+}
+
+const SegmentIndex &PolyLine::Index() const
+{
+    if (!mIndex) {
+        std::vector<SegmentIndex::Box> boxes(static_cast<std::size_t>(GetSegmentsCount()));
+        for (int32 s = 0; s < GetSegmentsCount(); ++s) {
+            OrbPoint h[4];
+            SegmentHull(s, h);
+            SegmentIndex::Box &b = boxes[std::size_t(s)];
+            b = {h[0].x, h[0].y, h[0].x, h[0].y};
+            for (const OrbPoint &q : h)
+                b = {std::min(b.x0, q.x), std::min(b.y0, q.y), std::max(b.x1, q.x), std::max(b.y1, q.y)};
+        }
+        mIndex = std::make_shared<const SegmentIndex>(std::move(boxes));
+    }
+    return *mIndex;
+}
+
+// Samples the segment, then narrows the best sample's neighbourhood by
+// golden-section search; the samples are dense enough that a cubic piece
+// has one minimum between two of them.
+float64 PolyLine::SegmentDist2(int32 seg, const OrbPoint &p, float64 &t) const
+{
+    constexpr int32 kSamples = 16;
+    constexpr int32 kRefineSteps = 40;
+    auto d2 = [&](float64 u) { return (ValueAt(seg + u) - p).LengthSquared(); };
+    int32 best = 0;
+    float64 bestD = d2(0.0);
+    for (int32 i = 1; i <= kSamples; ++i)
+        if (const float64 d = d2(float64(i) / kSamples); d < bestD)
+            bestD = d, best = i;
+    float64 lo = std::max(0.0, (best - 1.0) / kSamples), hi = std::min(1.0, (best + 1.0) / kSamples);
+    const float64 g = 0.5 * (std::sqrt(5.0) - 1.0);
+    for (int32 i = 0; i < kRefineSteps; ++i) {
+        const float64 m1 = hi - g * (hi - lo), m2 = lo + g * (hi - lo);
+        if (d2(m1) < d2(m2))
+            hi = m2;
+        else
+            lo = m1;
+    }
+    t = 0.5 * (lo + hi);
+    const float64 refined = d2(t);
+    if (bestD <= refined) {
+        t = float64(best) / kSamples;
+        return bestD;
+    }
+    return refined;
+}
+
+float64 PolyLine::CalcClosestPar(float64 x, float64 y, float64 *distance) const
+{
+    float64 px, py, par = -1.0;
+    const float64 d = CalcClosestPoint(x, y, px, py, &par);
+    if (distance)
+        *distance = d;
+    return par;
+}
+
+float64 PolyLine::CalcClosestPoint(float64 x, float64 y, float64 &px, float64 &py, float64 *par) const
+{
+    if (mPoints.empty())
+        return -1.0;
+    const OrbPoint p(x, y);
+    float64 t = 0.0, d2 = (mPoints[0].Pos() - p).LengthSquared();
+    int32 seg = 0;
+    if (GetSegmentsCount() > 0)
+        seg = Index().Nearest(
+            p, [&](int32 s) { return SegmentDist2(s, p, t); }, d2);
+    // The search leaves t at the last segment tried: find it again.
+    if (GetSegmentsCount() > 0)
+        d2 = SegmentDist2(seg, p, t);
+    const OrbPoint at = ValueAt(seg + t);
+    px = at.x, py = at.y;
+    if (par)
+        *par = seg + t;
+    return std::sqrt(d2);
+}
+
+float64 PolyLine::Distance(float64 par0, float64 par1) const
+{
+    if (par1 < par0)
+        return -Distance(par1, par0);
+    const int32 segs = GetSegmentsCount();
+    par0 = std::clamp(par0, 0.0, float64(segs)), par1 = std::clamp(par1, 0.0, float64(segs));
+    float64 sum = 0.0;
+    for (int32 s = int32(std::floor(par0)); s < segs && s < par1; ++s) {
+        const float64 from = std::max(par0, float64(s)) - s, to = std::min(par1, s + 1.0) - s;
+        sum += CurveMeasure::Length([&](float64 u) { return TangentAt(s + u); }, from, to);
+    }
+    return sum;
+}
+
+float64 PolyLine::CalcLength() const
+{
+    return Distance(0.0, GetSegmentsCount());
+}
+
+OrbPoint PolyLine::GetPointOnPath(float64 distance, float64 *par) const
+{
+    constexpr int32 kBisections = 50;
+    const int32 segs = GetSegmentsCount();
+    float64 at = 0.0, left = std::max(0.0, distance);
+    for (int32 s = 0; s < segs; ++s, at = s) {
+        const float64 len = Distance(s, s + 1);
+        if (left > len && s < segs - 1) {
+            left -= len;
+            continue;
+        }
+        float64 lo = 0.0, hi = 1.0;
+        for (int32 i = 0; i < kBisections && left < len; ++i) {
+            const float64 mid = 0.5 * (lo + hi);
+            (Distance(s, s + mid) < left ? lo : hi) = mid;
+        }
+        at = s + (left < len ? 0.5 * (lo + hi) : 1.0);
+        break;
+    }
+    if (par)
+        *par = at;
+    return ValueAt(at);
+}
+
 bool PolyLine::AddPoint(const PolyPoint &p)
 {
     return InsertPoint(GetCount(), p);
@@ -311,6 +458,12 @@ bool PolyLine::operator==(const PolyLine &o) const
 }
 
 void PolyLine::Changed()
+{
+    mIndex.reset();
+    Adopt();
+}
+
+void PolyLine::Adopt()
 {
     for (PolyPoint &p : mPoints)
         p.mOwner = this;
