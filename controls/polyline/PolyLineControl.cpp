@@ -632,37 +632,35 @@ void PolyLineControl::ControlUp(PreviewInfo *info, const OrbPointI &mouse, const
 
 // The stroke goes in as one step: fitted ("Freehand Add Points"), or every
 // sample a corner at tolerance 0 ("Add Points"), or a single point where
-// the hand did not move ("Add Point"). A stroke that ends on the shape's
-// first point closes it.
+// the hand did not move ("Add Point"). A stroke that went away and ends on
+// the shape's first point (its own, on an empty shape) closes the shape.
 void PolyLineControl::EndStroke(const PreviewInfo &info)
 {
     const AutoRef<PolyLine> shape = Shape();
-    const std::size_t samples = mCreation.Stroke().size();
+    const std::vector<PolyLineCreation::Sample> &stroke = mCreation.Stroke();
+    const bool empty = !shape || shape->GetCount() == 0;
+    const OrbPoint start = info.TransformOut(empty ? stroke.front().at : shape->First()->Pos());
+    auto near = [&](OrbPoint at, float64 reach) {
+        const OrbPoint d = info.TransformOut(at) - start;
+        return std::fabs(d.x) < reach && std::fabs(d.y) < reach;
+    };
+    bool away = false;
+    for (const PolyLineCreation::Sample &s : stroke)
+        away = away || !near(s.at, 2.0 * info.PickTolerance);
+    const bool closes = away && near(stroke.back().at, info.PickTolerance) && !(shape && shape->IsClosed());
+    // The closing tail on the start is left to the closing segment.
+    while (closes && mCreation.Stroke().size() > 3 && near(mCreation.Stroke().back().at, info.PickTolerance))
+        mCreation.DropLastSample();
     const uint32 record = (mRecordTime ? PLR_Time : 0u) | (mRecordPressure ? PLR_Pressure : 0u);
-    AutoRef<PolyLine> drawn = mCreation.WithStroke(shape.get(), info.Mapping(), mReduceTolerance, record);
+    AutoRef<PolyLine> drawn = mCreation.WithStroke(shape.get(), OnePixel(info), mReduceTolerance, record, closes);
     if (!drawn)
         return;
-    const PolyPoint &first = *drawn->First();
-    const OrbPoint end = info.TransformOut(mCreation.Stroke().back().at), start = info.TransformOut(first.Pos());
-    const bool closes = samples > 1 && drawn->GetCount() >= 3 && std::fabs(end.x - start.x) < info.PickTolerance &&
-                        std::fabs(end.y - start.y) < info.PickTolerance;
-    if (closes) {
-        drawn->DeletePoints(LastOnly(*drawn).data());
+    if (closes)
         drawn->Close();
-    }
-    OpenStep(samples < 2 ? "Add Point" : mReduceTolerance > 0.0 ? "Freehand Add Points" : "Add Points");
+    OpenStep(stroke.size() < 2 ? "Add Point" : mReduceTolerance > 0.0 ? "Freehand Add Points" : "Add Points");
     WriteShape(drawn);
     if (closes)
         SetMode(PLM_InsertModify);
-}
-
-// A selection of the last point alone: a closing stroke's end, which lies
-// on the first point.
-std::vector<uint8> PolyLineControl::LastOnly(const PolyLine &shape)
-{
-    std::vector<uint8> last(std::size_t(shape.GetCount()), 0);
-    last.back() = 1;
-    return last;
 }
 
 bool PolyLineControl::WriteShape(PolyLine *shape)

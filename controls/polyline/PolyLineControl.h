@@ -131,7 +131,6 @@ private:
     void MovePicked(const PreviewInfo &info);
     void EndStroke(const PreviewInfo &info);
     static OrbPoint OnePixel(const PreviewInfo &info);
-    static std::vector<uint8> LastOnly(const PolyLine &shape);
     void OpenStep(const char *name);
     void CloseStep();
 

@@ -1,7 +1,6 @@
 #include "polyline/PolyLineCreation.h"
 
 #include "orbane/PolyLine.h"
-#include "orbane/ViewMapping.h"
 
 #include <cmath>
 
@@ -19,30 +18,6 @@ AutoRef<PolyLine> Rebuilt(const PolyLine &shape, const std::vector<PolyPoint> &p
     if (shape.IsClosed())
         out->Close();
     return out;
-}
-
-// The stroke in viewer pixels fitted with Bezier key points (still in
-// pixels), or every sample a corner where the tolerance is 0.
-std::vector<PolyPoint> Fit(const std::vector<OrbPoint> &pixels, float64 tolerance)
-{
-    std::vector<PolyPoint> corners;
-    for (const OrbPoint &p : pixels)
-        corners.emplace_back(p.x, p.y);
-    return corners;
-}
-
-// The pen values of the sample nearest `at` (viewer pixels), as asked.
-void Record(PolyPoint &p, OrbPoint at, const std::vector<PolyLineCreation::Sample> &stroke,
-            const std::vector<OrbPoint> &pixels, uint32 record)
-{
-    std::size_t best = 0;
-    for (std::size_t i = 1; i < pixels.size(); ++i)
-        if ((pixels[i] - at).Length() < (pixels[best] - at).Length())
-            best = i;
-    if (record & PLR_Time)
-        p.Time = stroke[best].time;
-    if (record & PLR_Pressure)
-        p.Pressure = stroke[best].pressure;
 }
 
 bool Valid(const PolyLine &shape, int32 index)
@@ -123,21 +98,31 @@ std::vector<OrbPoint> PolyLineCreation::StrokePoints() const
     return points;
 }
 
-AutoRef<PolyLine> PolyLineCreation::WithStroke(const PolyLine *shape, const ViewMapping &view, float64 tolerance,
-                                               uint32 record) const
+AutoRef<PolyLine> PolyLineCreation::WithStroke(const PolyLine *shape, OrbPoint pixel, float64 tolerance, uint32 record,
+                                               bool closed) const
 {
     if (mStroke.empty())
         return {};
-    std::vector<OrbPoint> pixels;
-    for (const Sample &s : mStroke)
-        pixels.push_back(view.ToViewer(s.at));
-    AutoRef<PolyLine> out(shape ? static_cast<PolyLine *>(shape->Clone()) : new PolyLine);
-    for (PolyPoint p : Fit(pixels, tolerance)) {
-        Record(p, p.Pos(), mStroke, pixels, record);
-        const OrbPoint at = view.ToImage(p.Pos()), in = view.ToImage(p.In()), outHandle = view.ToImage(p.Out());
-        p.X = at.x, p.Y = at.y, p.InX = in.x, p.InY = in.y, p.OutX = outHandle.x, p.OutY = outHandle.y;
-        out->AddPoint(p);
+    std::vector<PolyPoint> samples;
+    samples.reserve(mStroke.size());
+    for (const Sample &s : mStroke) {
+        PolyPoint p(s.at.x, s.at.y);
+        if (record & PLR_Time)
+            p.Time = s.time;
+        if (record & PLR_Pressure)
+            p.Pressure = s.pressure;
+        samples.push_back(p);
     }
+    // A closed fit only where the stroke is the whole shape.
+    closed = closed && (!shape || shape->GetCount() == 0);
+    AutoRef<PolyLine> fit(new PolyLine);
+    const bool fitted =
+        tolerance > 0.0 && samples.size() > 2 && fit->SetReducedPoints(samples, tolerance, pixel.x, pixel.y, closed);
+    AutoRef<PolyLine> out(shape ? static_cast<PolyLine *>(shape->Clone()) : new PolyLine);
+    for (const PolyPoint &p : fitted ? fit->Points() : samples)
+        out->AddPoint(p);
+    if (fitted && fit->IsClosed())
+        out->Close();
     return out;
 }
 

@@ -9,7 +9,6 @@
 namespace Orbane {
 
 class PolyLine;
-class ViewMapping;
 
 // Pen values a freehand stroke keeps per key point (the record flags).
 enum PolyLineRecord : uint32
@@ -59,14 +58,15 @@ public:
     // Takes a sample `minStep` image units or more from the last; true where taken.
     bool AddSample(const Sample &s, OrbPoint minStep);
     const std::vector<Sample> &Stroke() const { return mStroke; }
+    void DropLastSample() { mStroke.pop_back(); }
     std::vector<OrbPoint> StrokePoints() const;
-    // `shape` with the stroke appended: fitted with Bezier key points within
-    // `tolerance` viewer pixels of every sample through `view` (so the fit
-    // is even on screen), or every sample a corner point at tolerance 0.
-    // `record` (PolyLineRecord bits) says which pen values the key points
-    // keep, from the sample nearest each.
-    AutoRef<PolyLine> WithStroke(const PolyLine *shape, const ViewMapping &view, float64 tolerance,
-                                 uint32 record) const;
+    // `shape` with the stroke appended: fitted by the host with Bezier key
+    // points within `tolerance` viewer pixels of every sample (`pixel`: one
+    // viewer pixel in image units, per axis), closed where `closed` and the
+    // stroke is the whole shape; or every sample a corner at tolerance 0.
+    // `record` (PolyLineRecord bits) says which pen values the points keep.
+    AutoRef<PolyLine> WithStroke(const PolyLine *shape, OrbPoint pixel, float64 tolerance, uint32 record,
+                                 bool closed) const;
 
     Gesture gesture = PCG_None;
     int32 index = -1; // the point the gesture works on
