@@ -1,5 +1,9 @@
 #include "ScriptHands.h"
 
+#include "orbane/Input.h"
+#include "orbane/Operator.h"
+#include "orbane/OrbaneDoc.h"
+
 #include <QApplication>
 #include <QKeySequence>
 #include <QMouseEvent>
@@ -30,6 +34,27 @@ int ScriptHands::KeyCode(lua_State *L, int idx)
     if (seq.isEmpty())
         return Raise(L, QString("unknown key \"%1\"").arg(lua_tostring(L, idx)));
     return seq[0] & ~Qt::KeyboardModifierMask;
+}
+
+Operator *ScriptHands::ToolOrRaise(lua_State *L, OrbaneDoc *doc, int idx)
+{
+    Operator *tool = doc->FindTool(luaL_checkstring(L, idx));
+    if (!tool)
+        Raise(L, QString("no tool \"%1\"").arg(lua_tostring(L, idx)));
+    return tool;
+}
+
+Input *ScriptHands::InputOrRaise(lua_State *L, OrbaneDoc *doc)
+{
+    Input *input = ToolOrRaise(L, doc)->FindInput(OrbID(luaL_checkstring(L, 2)));
+    if (!input)
+        Raise(L, QString("tool \"%1\" has no Input \"%2\"").arg(lua_tostring(L, 1), lua_tostring(L, 2)));
+    return input;
+}
+
+double ScriptHands::TimeArg(lua_State *L, OrbaneDoc *doc, int idx)
+{
+    return lua_isnumber(L, idx) ? lua_tonumber(L, idx) : doc->GetCurrentTime();
 }
 
 } // namespace Orbane

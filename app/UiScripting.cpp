@@ -3,6 +3,7 @@
 #include "MainWindow.h"
 #include "ScriptHands.h"
 #include "UiTarget.h"
+#include "ValueScripting.h"
 #include "ViewerScripting.h"
 
 #include "orbane/AutoParam.h"
@@ -48,18 +49,12 @@ QWidget *TargetOrRaise(lua_State *L, int idx, InputControl **control = nullptr)
 
 Input *InputOrRaise(lua_State *L)
 {
-    Operator *tool = gDoc->FindTool(luaL_checkstring(L, 1));
-    if (!tool)
-        Hands::Raise(L, QString("no tool \"%1\"").arg(lua_tostring(L, 1)));
-    Input *input = tool->FindInput(OrbID(luaL_checkstring(L, 2)));
-    if (!input)
-        Hands::Raise(L, QString("tool \"%1\" has no Input \"%2\"").arg(lua_tostring(L, 1), lua_tostring(L, 2)));
-    return input;
+    return Hands::InputOrRaise(L, gDoc);
 }
 
 float64 TimeArg(lua_State *L, int idx)
 {
-    return lua_isnumber(L, idx) ? lua_tonumber(L, idx) : gDoc->GetCurrentTime();
+    return Hands::TimeArg(L, gDoc, idx);
 }
 
 void PushNames(lua_State *L, const QStringList &names)
@@ -335,6 +330,7 @@ void UiScripting::Install(OrbaneDoc *doc, MainWindow *window)
     for (const auto &[name, fn] : functions)
         LuaRuntime::Instance().AddModuleFunction(name, fn);
     ViewerScripting::Install(window);
+    ValueScripting::Install(doc);
 }
 
 } // namespace Orbane

@@ -95,6 +95,8 @@ bool PolyLineControl::SetAttrsTagList(Input *input, const TagList &tags)
     }
     if (OrbaneDoc *doc = GetDoc())
         mExportSplineMode = uint16(doc->GetPrefs().GetLong(PREF_ExportSplineMode, mExportSplineMode));
+    if (main)
+        mShapeReadOnly = main->GetAttrs().GetBool(INPA_ReadOnly, mShapeReadOnly);
     EmptySelectionWhenHidden();
     NotifyLinkedInputs(*this, Links, linked);
     UpdateDisplay(nullptr, nullptr);

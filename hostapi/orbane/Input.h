@@ -90,6 +90,12 @@ public:
     void SetAnimated(bool animated);
     // The times of the keys, earliest first.
     std::vector<float64> KeyTimes() const;
+    // The value stored in the key at `time` (not blended), as a new
+    // reference; null where no key is at exactly that time.
+    Parameter *GetKey(float64 time) const;
+    // Removes the key at `time`, with undo unless `flags` has
+    // SETVALUE_NoUndo, and tells the watchers. False where there is none.
+    bool RemoveKey(float64 time, uint32 flags = 0);
 
     // Watchers are told in the order they were attached. Returns false for a
     // null watcher or one already attached (or, on detach, not attached).

@@ -13,7 +13,8 @@ class ScriptVal;
 //   { kind = "bezier" | "bspline", closed = bool,
 //     points = { { x =, y =, inX =, inY =, outX =, outY =, weight =, time =,
 //                  pressure =, height =, angleXY =, angleZ =, rotation =,
-//                  tag =, linear =, published = }, ... } }
+//                  dispX =, dispY =, id =, follows =, linear =, tagged =,
+//                  published =, following =, gap = }, ... } }
 // in image coordinates (0..1 across each axis, Y up), handles absolute.
 // Missing handles lie on their point; missing extras take their defaults.
 class PolyLineScript

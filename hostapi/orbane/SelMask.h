@@ -60,6 +60,14 @@ public:
     // end are dropped and the items left behind are deselected.
     bool ShiftSet(int32 offset, bool wrap);
 
+    // The state bytes in item order, as the shape operations take them
+    // (PolyLine::MovePoints and the like); null for an empty mask.
+    const uint8 *Bytes() const noexcept { return mStates.empty() ? nullptr : mStates.data(); }
+    // Keeps the selection attached to its items when the shape gains an
+    // item before `index` (GetCount() appends) or loses the selected ones.
+    bool InsertItem(int32 index, uint8 state = Clear);
+    bool RemoveSetItems();
+
     // One saved copy, for a gesture that may be cancelled.
     void BackupMask();
     // False when nothing was backed up; the backup is kept.

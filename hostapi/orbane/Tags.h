@@ -85,6 +85,8 @@ enum InputTag : Tag
     INPA_OverlayInput = 0x88020012,   // id of a further Input of the tool that the Input's overlays edit
                                       // (repeatable; the first is their Input index 1, and so on)
     INPA_LayoutHeight = 0x10020007,   // a layout object's height
+    INPA_ReadOnly = 0x10020032,       // 1: the tool file declared the Input readOnly; its controls
+                                      // show the value but do not edit it
     LINKS_Name = 0x30040000,          // label text
     LINKS_SecondName = 0x30040001,    // second label text
 };

@@ -108,6 +108,27 @@ std::vector<float64> Input::KeyTimes() const
     return times;
 }
 
+Parameter *Input::GetKey(float64 time) const
+{
+    const auto it = mKeys.find(time);
+    return it == mKeys.end() ? nullptr : it->second->Clone();
+}
+
+bool Input::RemoveKey(float64 time, uint32 flags)
+{
+    const Slot slot{true, time};
+    if (!mAnimated || !Peek(slot))
+        return false;
+    const AutoRef<Input> self = AutoRef<Input>::Share(this);
+    OrbaneDoc *doc = GetDoc();
+    if (doc && !(flags & SETVALUE_NoUndo))
+        doc->Recorder().Record(this, slot, nullptr);
+    else
+        Exchange(slot, nullptr);
+    Notify();
+    return true;
+}
+
 bool Input::AttachWatcher(InputWatcher *w)
 {
     WriteGuard guard(*this);

@@ -31,7 +31,21 @@ struct FlagField
     uint32 flag;
 };
 
-constexpr FlagField kFlags[] = {{"linear", PPF_Linear}, {"published", PPF_Published}};
+constexpr FlagField kFlags[] = {{"linear", PPF_Linear},
+                                {"tagged", PPF_Tagged},
+                                {"published", PPF_Published},
+                                {"following", PPF_Following},
+                                {"gap", PPF_Discontinual}};
+
+// Whole-number fields.
+struct IntField
+{
+    const char *name;
+    int32 PolyPoint::*member;
+    int32 def;
+};
+
+constexpr IntField kInts[] = {{"id", &PolyPoint::TagID, 0}, {"follows", &PolyPoint::FollowIndex, -1}};
 
 bool Fail(std::string *error, int32 index, const std::string &why)
 {
@@ -70,9 +84,11 @@ bool ReadPoint(const ScriptVal &t, int32 index, PolyPoint &p, std::string *error
     for (const FlagField &f : kFlags)
         if (const ScriptVal *v = t.FindKeyConst(ScriptVal(f.name)); v && v->GetBool())
             p.Flags |= f.flag;
-    if (const ScriptVal *tag = t.FindKeyConst(ScriptVal("tag")); tag && tag->IsNumber()) {
-        p.TagID = int32(tag->GetNumber());
-        p.Flags |= PPF_Tagged;
+    for (const IntField &f : kInts) {
+        float64 v = f.def;
+        if (!ReadNumber(t, f.name, v, index, error))
+            return false;
+        p.*f.member = int32(v);
     }
     return true;
 }
@@ -94,8 +110,9 @@ ScriptVal WritePoint(const PolyPoint &p)
     for (const FlagField &f : kFlags)
         if (p.Flags & f.flag)
             t.SetKey(f.name, true);
-    if (p.Flags & PPF_Tagged)
-        t.SetKey("tag", int64(p.TagID));
+    for (const IntField &f : kInts)
+        if (p.*f.member != f.def)
+            t.SetKey(f.name, int64(p.*f.member));
     return t;
 }
 

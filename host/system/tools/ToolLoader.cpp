@@ -191,6 +191,8 @@ bool BuildAttrs(const ScriptVal &decl, const char *name, TagList &tags, ToolCont
         tags.Add(INPA_PreviewControl, OrbID(c));
         classes.push_back(c);
     }
+    if (const ScriptVal *ro = decl.FindKeyConst(ScriptVal("readOnly")); ro && ro->GetBool())
+        tags.Add(INPA_ReadOnly, int64(1));
     for (const std::string &id : Names(decl, "overlayInputs"))
         tags.Add(INPA_OverlayInput, OrbID(id));
     if (const ScriptVal *attrs = decl.FindKeyConst(ScriptVal("attrs")); attrs && !AddNumberedAttrs(*attrs, tags, error))

@@ -107,6 +107,25 @@ bool SelMask::ShiftSet(int32 offset, bool wrap)
     return true;
 }
 
+bool SelMask::InsertItem(int32 index, uint8 state)
+{
+    if (index < 0 || index > GetCount())
+        return false;
+    mStates.insert(mStates.begin() + index, state);
+    mSetCount += state != Clear ? 1 : 0;
+    return true;
+}
+
+bool SelMask::RemoveSetItems()
+{
+    if (mSetCount == 0)
+        return false;
+    // What is left is exactly the items that were not selected.
+    mStates.assign(std::size_t(GetCount() - mSetCount), Clear);
+    mSetCount = 0;
+    return true;
+}
+
 void SelMask::BackupMask()
 {
     mBackup = mStates;

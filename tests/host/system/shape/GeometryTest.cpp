@@ -1,6 +1,9 @@
 #include "ShapeTestUtil.h"
 
+#include "orbane/AutoParam.h"
 #include "orbane/ClassIDs.h"
+#include "orbane/Input.h"
+#include "orbane/Operator.h"
 
 #include <gtest/gtest.h>
 
@@ -224,6 +227,23 @@ TEST(Publishing, NumbersPointsAndFindsThem)
     EXPECT_TRUE(s->UnpublishPoints(ends));
     EXPECT_EQ(s->GetPublishedPoint(1), -1);
     EXPECT_EQ(PolyLine::PublishedPointInputID(3), OrbID("Point3"));
+}
+
+// A published point and the tool's point Input of its number move each other.
+TEST(Publishing, PointInputsFollowAndLead)
+{
+    AutoRef<Operator> tool(new Operator("Roto1", "Roto"));
+    Input *in = tool->AddInput(OrbID("Point3"), "Point3", CLSID_DataType_Point, TagList(), AutoPoint(0, 0).get());
+    AutoRef<PolyLine> s = MakeShape({{0, 0}, {1, 0, 0.9, 0, 1.1, 0}, {1, 1}}, true);
+    const uint8 second[] = {0, 1, 0};
+    s->PublishPoints(second, 3);
+    EXPECT_EQ(s->UpdatePublishedPointInputs(*tool, 0.0), 1);
+    EXPECT_EQ(AutoPoint(in, 0.0)->X, 1.0);
+    in->SetValue(AutoPoint(0.5, 0.25).get(), 0.0);
+    ASSERT_TRUE(s->UpdatePublish(*tool, 0.0));
+    EXPECT_EQ(s->GetPoint(1)->Pos(), OrbPoint(0.5, 0.25));
+    EXPECT_NEAR((s->GetPoint(1)->Out() - OrbPoint(0.6, 0.25)).Length(), 0.0, 1e-12);
+    EXPECT_FALSE(s->UpdatePublish(*tool, 0.0));
 }
 
 TEST(Makers, SpiralRunsFromInnerToOuterRadius)

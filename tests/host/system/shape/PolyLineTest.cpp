@@ -4,6 +4,9 @@
 #include "orbane/ClassIDs.h"
 #include "orbane/Input.h"
 #include "orbane/Operator.h"
+#include "orbane/ScriptVal.h"
+#include "orbane/Tags.h"
+#include "orbane/ToolLoader.h"
 
 #include <gtest/gtest.h>
 
@@ -193,6 +196,34 @@ TEST(PolyLineValue, KindsAreDistinctValues)
     AutoRef<Parameter> copy(bspline->Clone());
     EXPECT_EQ(copy->DataType(), CLSID_DataType_BSplinePolyline);
     EXPECT_TRUE(copy->Equals(*bspline));
+}
+
+// A tool file's shape Input: an empty shape without a default, and the
+// readOnly mark as an attribute the overlay reads.
+TEST(PolyLineValue, ToolFileDeclaresShapeInputs)
+{
+    ScriptVal guide = ScriptVal::NewTable();
+    guide.SetKey("id", "Guide");
+    guide.SetKey("type", "BSplinePolyLine");
+    guide.SetKey("readOnly", true);
+    ScriptVal mask = ScriptVal::NewTable();
+    mask.SetKey("id", "Mask");
+    mask.SetKey("type", "PolyLine");
+    ScriptVal inputs = ScriptVal::NewTable();
+    inputs.Append(guide);
+    inputs.Append(mask);
+    ScriptVal desc = ScriptVal::NewTable();
+    desc.SetKey("inputs", inputs);
+    std::string why;
+    AutoRef<Operator> tool(ToolLoader::FromTable(desc, "Roto1", &why, "."));
+    ASSERT_TRUE(tool.IsValid()) << why;
+    Input *g = tool->FindInput(OrbID("Guide")), *m = tool->FindInput(OrbID("Mask"));
+    EXPECT_TRUE(g->GetAttrs().GetBool(INPA_ReadOnly, false));
+    EXPECT_FALSE(m->GetAttrs().GetBool(INPA_ReadOnly, false));
+    AutoParam<BSplinePolyLine> value(g, 0.0);
+    ASSERT_TRUE(value.IsValid());
+    EXPECT_EQ(value->GetCount(), 0);
+    EXPECT_EQ(AutoParam<PolyLine>(m, 0.0)->DataType(), CLSID_DataType_Polyline);
 }
 
 } // namespace

@@ -76,6 +76,11 @@ std::function<int32(SelMask &)> segment(int32 n, bool closed)
 const OpCase OpCases[] = {
     // Changes
     {"CreateClears", "1.2", [](SelMask &m) { return m.Create(5); }, ".....", 1},
+    {"InsertKeepsStatesOnTheirItems", "1.2", [](SelMask &m) { return m.InsertItem(1, 4); }, "14.2", 1},
+    {"InsertAppends", "1.", [](SelMask &m) { return m.InsertItem(2); }, "1..", 1},
+    {"InsertOutOfRange", "1.", [](SelMask &m) { return m.InsertItem(3); }, nullptr, 0},
+    {"RemoveSetItemsLeavesTheOthers", "1.2..", [](SelMask &m) { return m.RemoveSetItems(); }, "...", 1},
+    {"RemoveWithNothingSet", "...", [](SelMask &m) { return m.RemoveSetItems(); }, nullptr, 0},
     {"CreateRefusesANegativeCount", "1.2", [](SelMask &m) { return m.Create(-1); }, nullptr, 0},
     {"SetSelects", "....", [](SelMask &m) { return m.Set(1, true); }, ".2..", 1},
     {"DoSetAdds", "2...", doSet(2, SelMask::SEL_Set), "2.2.", 1},
