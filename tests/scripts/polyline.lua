@@ -82,5 +82,44 @@ check.eq(names[#names], "Freehand Add Points", "one step for the stroke")
 orbane.Undo()
 check.eq(#shape("Mask2").points, 0, "undo takes the stroke back")
 
+-- A locked tool takes no click, and neither does a shape declared readOnly.
+orbane.Overlay("Roto1", "Mask2"):SetAttrs({ PLC_DrawMode = 1 })
+orbane.SetToolLocked("Roto1", true)
+click(0.5, 0.5)
+check.eq(#shape("Mask2").points, 0, "a locked tool takes no click")
+orbane.SetToolLocked("Roto1", false)
+click(0.5, 0.5)
+check.eq(#shape("Mask2").points, 1, "unlocked, it does")
+
+local path = os.tmpname()
+local f = assert(io.open(path, "w"))
+f:write([[return { inputs = { { id = "Fixed", type = "PolyLine", readOnly = true,
+  overlay = "PolylineControl", tags = { PLC_DrawMode = 1 } } } }]])
+f:close()
+orbane.LoadTool(path, "Fixed1")
+orbane.ShowTool("Fixed1")
+check.eq(orbane.OverlayState("Fixed1", "Fixed").shapeReadOnly, true, "read-only from the tool file")
+orbane.ViewerPress({ ix = 0.5, iy = 0.5 })
+orbane.ViewerRelease({ ix = 0.5, iy = 0.5 })
+check.eq(#orbane.GetValue("Fixed1", "Fixed").points, 0, "a read-only shape takes no click")
+os.remove(path)
+
+-- The mask animated over two keyframes: a click at a time between them
+-- adds its point to the shape shown there, as a new key.
+orbane.ShowTool("Roto1")
+local later = shape("Mask")
+for _, p in ipairs(later.points) do
+  p.x, p.inX, p.outX = p.x + 0.04, p.inX + 0.04, p.outX + 0.04
+end
+orbane.SetKey("Roto1", "Mask", shape("Mask"), 0)
+orbane.SetKey("Roto1", "Mask", later, 24)
+orbane.SetTime(12)
 orbane.Process()
+check.near(shape("Mask").points[1].x, mask.points[1].x + 0.02, "half way at frame 12", 1e-9)
+-- The second shape, above, would take the press while it appends.
+orbane.Overlay("Roto1", "Mask2"):SetAttrs({ PLC_DrawMode = 0 })
+orbane.Overlay("Roto1", "Mask"):SetAttrs({ PLC_DrawMode = 1 })
+click(0.1, 0.1)
+check.eq(#shape("Mask").points, 5, "the point added at frame 12")
+check.eq(table.concat(orbane.Keys("Roto1", "Mask"), ","), "0,12,24", "as a key of its own")
 orbane.ViewerGrab(os.tmpname() .. ".png")
