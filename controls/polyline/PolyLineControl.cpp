@@ -4,6 +4,7 @@
 #include "polyline/ShapeBox.h"
 
 #include "orbane/AutoParam.h"
+#include "orbane/ClassIDs.h"
 #include "orbane/ControlCommands.h"
 #include "orbane/GPainter.h"
 #include "orbane/Input.h"
@@ -600,7 +601,8 @@ void PolyLineControl::ControlMove(PreviewInfo *info, const OrbPointI &mouse, con
 void PolyLineControl::PullHandles(const PreviewInfo &info, OrbPoint to)
 {
     const AutoRef<PolyLine> shape = Shape();
-    if (!shape || mCreation.index >= shape->GetCount())
+    // A B-spline's control points have no handles to pull.
+    if (!shape || mCreation.index >= shape->GetCount() || shape->DataType() == CLSID_DataType_BSplinePolyline)
         return;
     const OrbPoint point = shape->GetPoint(mCreation.index)->Pos();
     if ((info.TransformOut(to) - info.TransformOut(point)).Length() < kPullDistance)

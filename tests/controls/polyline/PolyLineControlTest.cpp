@@ -2,6 +2,7 @@
 #include "ViewerFixture.h"
 
 #include "orbane/AutoParam.h"
+#include "orbane/BSplinePolyLine.h"
 #include "orbane/ClassIDs.h"
 #include "orbane/Input.h"
 #include "orbane/PolyLine.h"
@@ -136,6 +137,7 @@ private slots:
     void drawing_data();
     void drawing();
     void onionSkinsOfTheOtherKeyframes();
+    void bsplineCurveAndClicks();
     void hoverLightsAPointAndADragMovesIt();
     void appendTakesAnyPress_data();
     void appendTakesAnyPress();
@@ -369,6 +371,35 @@ void PolyLineControlTest::hoverLightsAPointAndADragMovesIt()
     QCOMPARE(StateOf(overlay).FindKeyConst(ScriptVal("selected"))->Length(), 1);
     QVERIFY(f.doc.Undo());
     QVERIFY(NearPoint(ShapeOf(f, shape)->GetPoint(1)->Pos(), {0.5, 0.5}));
+}
+
+// A B-spline draws the curve its control points shape, and a click-drag
+// adds a control point without pulling handles it has none of.
+void PolyLineControlTest::bsplineCurveAndClicks()
+{
+    ViewerFixture f;
+    AutoRef<PolyLine> spline(new BSplinePolyLine);
+    for (const OrbPoint &p : Points{{0.2, 0.2}, {0.8, 0.2}, {0.8, 0.8}, {0.2, 0.8}})
+        spline->AddPoint(PolyPoint(p.x, p.y));
+    spline->Close();
+    const TagList attrs{{INPA_PreviewControl, OrbID("PolylineControl")}, {PLC_DrawMode, 1}};
+    Input *shape = f.tool->AddInput(OrbID("Spline"), "Spline", CLSID_DataType_BSplinePolyline, attrs, spline.get());
+    QVERIFY(f.Show());
+    RecordingPainter drawn;
+    Record(f, f.OverlayOf(shape), drawn);
+    const RP::Call *curve = drawn.First(RP::Arrays);
+    QVERIFY(curve && curve->count > 8);
+    // Along the bottom the curve runs a fortyeighth of the side's rise
+    // above the control polygon's edge (y = 0.225, five image pixels up),
+    // not on it.
+    const QImage image = f.Grab();
+    QVERIFY(qGray(image.pixel(f.At({0.5, 0.225}))) > 60);
+    QCOMPARE(qGray(image.pixel(f.At({0.5, 0.2}))), 0);
+    f.Drag(f.At({0.5, 0.5}), f.At({0.5, 0.5}, QPoint(30, 0)));
+    const AutoParam<PolyLine> after = ShapeOf(f, shape);
+    QCOMPARE(after->DataType(), CLSID_DataType_BSplinePolyline);
+    QCOMPARE(after->GetCount(), 5);
+    QVERIFY(NearPoint(after->GetPoint(4)->Out(), after->GetPoint(4)->Pos()));
 }
 
 void PolyLineControlTest::appendTakesAnyPress_data()
