@@ -2,6 +2,8 @@
 
 #include "orbane/Operator.h"
 
+#include <benchmark/benchmark.h>
+
 #include <QApplication>
 #include <QColor>
 
@@ -21,6 +23,16 @@ void BenchViewer::Show()
     viewer.ShowTool(tool);
     viewer.show();
     QApplication::processEvents();
+}
+
+void BenchViewer::Repaints(benchmark::State &state)
+{
+    QImage target(Width, Height, QImage::Format_ARGB32_Premultiplied);
+    for (auto _ : state) {
+        viewer.render(&target);
+        benchmark::DoNotOptimize(target.bits());
+    }
+    state.SetItemsProcessed(state.iterations() * state.range(0));
 }
 
 QImage BenchViewer::Backdrop()

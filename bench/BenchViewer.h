@@ -9,6 +9,10 @@ namespace Orbane {
 class Operator;
 } // namespace Orbane
 
+namespace benchmark {
+class State;
+} // namespace benchmark
+
 // The viewer the overlay benchmarks draw and hover in: a document with one
 // tool, shown over a plain image of 1600 x 900 in a viewer of 800 x 450.
 // The benchmark adds the tool's Inputs, then calls Show.
@@ -22,6 +26,9 @@ public:
 
     // Shows the tool in the viewer, on screen, with its overlays made.
     void Show();
+    // Repaints the whole viewer into an image once an iteration; items are
+    // the benchmark's first argument (the overlays or points drawn).
+    void Repaints(benchmark::State &state);
     // The image behind the overlays.
     static QImage Backdrop();
 

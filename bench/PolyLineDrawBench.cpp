@@ -66,12 +66,7 @@ void BM_Viewer_DrawPolyLine(benchmark::State &state)
     if (!LoadControlModule())
         return state.SkipWithError("the control library did not load");
     ShapeRig rig(int(state.range(0)));
-    QImage target(Width, Height, QImage::Format_ARGB32_Premultiplied);
-    for (auto _ : state) {
-        rig.viewer.render(&target);
-        benchmark::DoNotOptimize(target.bits());
-    }
-    state.SetItemsProcessed(state.iterations() * state.range(0));
+    rig.Repaints(state);
 }
 
 // The same picture drawn straight: the image, the shape as a QPainterPath

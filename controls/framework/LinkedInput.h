@@ -61,6 +61,17 @@ const LinkedInput<Owner> *FindLinkedInput(const Owner &owner, const LinkedInput<
     return nullptr;
 }
 
+// Lets go of `input` where a row holds it, for RemoveInput; the row that
+// held it, or null.
+template <class Owner, std::size_t N>
+const LinkedInput<Owner> *DetachLinkedInput(Owner &owner, const LinkedInput<Owner> (&rows)[N], const Input *input)
+{
+    const LinkedInput<Owner> *row = FindLinkedInput(owner, rows, input);
+    if (row)
+        owner.DetachFromInput(owner.*(row->slot));
+    return row;
+}
+
 // Writes the id of every attached Input under its row's id tag (rows taken
 // by pointer only have none), for GetAttrs.
 template <class Owner, std::size_t N>

@@ -185,11 +185,9 @@ bool RectangleControl::ReadAspectLock(const TagList &tags)
 
 bool RectangleControl::RemoveInput(Input *input, const TagList *tags)
 {
-    const LinkedInput<RectangleControl> *row = FindLinkedInput(*this, Links, input);
+    const LinkedInput<RectangleControl> *row = DetachLinkedInput(*this, Links, input);
     if (row && row->slot == &RectangleControl::mImageInput)
         mImage = QImage();
-    if (row)
-        DetachFromInput(this->*(row->slot));
     return HandleOverlay::RemoveInput(input, tags) || row;
 }
 

@@ -259,10 +259,8 @@ void PolyLineControl::GetState(ScriptVal &state) const
 
 bool PolyLineControl::RemoveInput(Input *input, const TagList *tags)
 {
-    const LinkedInput<PolyLineControl> *row = FindLinkedInput(*this, Links, input);
-    if (row)
-        DetachFromInput(this->*(row->slot));
-    return HandleOverlay::RemoveInput(input, tags) || row;
+    const bool linked = DetachLinkedInput(*this, Links, input) != nullptr;
+    return HandleOverlay::RemoveInput(input, tags) || linked;
 }
 
 void PolyLineControl::NotifyChanged(Input *input, Parameter *value, const TagList *tags)
