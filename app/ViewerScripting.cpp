@@ -128,11 +128,12 @@ int ViewerImage(lua_State *L)
     return 0;
 }
 
-// ViewerInfo() -> { zoom, pixelAspect, width, height, imageWidth, imageHeight, hot }.
+// ViewerInfo() -> { zoom, pixelAspect, width, height, imageWidth, imageHeight,
+// cursor, hot }; `cursor` is the Qt shape number of the viewer's cursor.
 int ViewerInfo(lua_State *L)
 {
     const ViewerPanel *viewer = gWindow->Viewer();
-    lua_createtable(L, 0, 7);
+    lua_createtable(L, 0, 8);
     lua_pushnumber(L, viewer->Mapping().Zoom());
     lua_setfield(L, -2, "zoom");
     lua_pushnumber(L, viewer->PixelAspect());
@@ -140,7 +141,8 @@ int ViewerInfo(lua_State *L)
     for (auto [key, v] : {std::pair{"width", viewer->width()},
                           {"height", viewer->height()},
                           {"imageWidth", viewer->ImageSize().width()},
-                          {"imageHeight", viewer->ImageSize().height()}}) {
+                          {"imageHeight", viewer->ImageSize().height()},
+                          {"cursor", int(viewer->cursor().shape())}}) {
         lua_pushinteger(L, v);
         lua_setfield(L, -2, key);
     }

@@ -22,6 +22,8 @@ const std::vector<Goal> &Goals()
          nullptr, 0.5, ""},
         {"P1e", "inspector build, 500 button rows, lists, check lists, offsets, screws and labels",
          "BM_Inspector_BuildChoices/500", "BM_StockChoiceRows_Build/500", 1.0, "stock Qt rows"},
+        {"S3", "repaint a viewer with a closed polyline of 10,000 points", "BM_Viewer_DrawPolyLine/10000", nullptr, 8.3,
+         ""},
         {"S1", "freehand reduction, 5,000-sample stroke", "BM_PolyLine_Reduce/5000", nullptr, 10.0, ""},
         {"S2", "closest point among 100,000 points", "BM_PolyLine_Closest/100000", "BM_NaiveScan_Closest/100000", 0.05,
          "a scan of every point"},

@@ -5,6 +5,7 @@
 // that tests the same rectangles' edges and the dials' rings with plain
 // arithmetic. The goal: under 0.5 ms per mouse event.
 #include "BenchModule.h"
+#include "BenchViewer.h"
 
 #include "orbane/AutoParam.h"
 #include "orbane/ClassIDs.h"
@@ -27,8 +28,8 @@ namespace {
 
 using namespace Orbane;
 
-constexpr int Width = 800, Height = 450;
-constexpr int ImageWidth = 1600, ImageHeight = 900;
+constexpr int Width = BenchViewer::Width, Height = BenchViewer::Height;
+constexpr int ImageWidth = BenchViewer::ImageWidth, ImageHeight = BenchViewer::ImageHeight;
 constexpr double Tolerance = 6;
 constexpr Tag RCD_SetX = 0x20058000, RCD_SetY = 0x20058001, RCD_SetAngle = 0x20058002;
 constexpr Tag ACID_Center = 0x80058000;
@@ -59,13 +60,10 @@ std::vector<OrbPoint> Dials(int count)
     return dials;
 }
 
-struct ShapeRig
+struct ShapeRig : BenchViewer
 {
-    ShapeRig(int rectangles, int dials) : viewer(&doc)
+    ShapeRig(int rectangles, int dials) : BenchViewer("Shapes1", "Shapes")
     {
-        auto *tool = new Operator("Shapes1", "Shapes");
-        doc.AddTool(tool);
-        tool->DecRef();
         int i = 0;
         for (const Rect &r : Rects(rectangles)) {
             const std::string w = "W" + std::to_string(i), h = "H" + std::to_string(i++);
@@ -84,17 +82,8 @@ struct ShapeRig
             const TagList attrs{{INPA_PreviewControl, OrbID("AngleControl")}, {ACID_Center, OrbID(centre.c_str())}};
             tool->AddInput(OrbID(a.c_str()), nullptr, CLSID_DataType_Number, attrs, AutoNumber(7.0 * i));
         }
-        QImage image(ImageWidth, ImageHeight, QImage::Format_ARGB32_Premultiplied);
-        image.fill(QColor(40, 60, 90));
-        viewer.SetImage(image);
-        viewer.resize(Width, Height);
-        viewer.ShowTool(tool);
-        viewer.show();
-        QApplication::processEvents();
+        Show();
     }
-
-    OrbaneDoc doc;
-    ViewerPanel viewer;
 };
 
 // The mouse walks a fixed path across the viewer, over edges and between

@@ -3,6 +3,7 @@
 // cost of a repaint, and of finding the handle under a press; and hovering
 // with the viewer's spatial index against the plain walk over every overlay.
 #include "BenchModule.h"
+#include "BenchViewer.h"
 
 #include "orbane/AutoParam.h"
 #include "orbane/ClassIDs.h"
@@ -26,8 +27,8 @@ namespace {
 
 using namespace Orbane;
 
-constexpr int Width = 800, Height = 450;
-constexpr int ImageWidth = 1600, ImageHeight = 900;
+constexpr int Width = BenchViewer::Width, Height = BenchViewer::Height;
+constexpr int ImageWidth = BenchViewer::ImageWidth, ImageHeight = BenchViewer::ImageHeight;
 constexpr int Tolerance = 6;
 
 // Points on a wavy line across the image, in image coordinates.
@@ -41,22 +42,12 @@ std::vector<OrbPoint> Points(int count)
     return points;
 }
 
-QImage Backdrop()
-{
-    QImage image(ImageWidth, ImageHeight, QImage::Format_ARGB32_Premultiplied);
-    image.fill(QColor(40, 60, 90));
-    return image;
-}
-
 // A document whose one tool has `count` point Inputs, each drawn joined to
 // the one before, shown in a viewer.
-struct ViewerRig
+struct ViewerRig : BenchViewer
 {
-    explicit ViewerRig(int count) : viewer(&doc)
+    explicit ViewerRig(int count) : BenchViewer("Points1", "Points")
     {
-        auto *tool = new Operator("Points1", "Points");
-        doc.AddTool(tool);
-        tool->DecRef();
         const std::vector<OrbPoint> points = Points(count);
         for (int i = 0; i < count; ++i) {
             TagList attrs{{INPA_PreviewControl, OrbID("PointControl")}};
@@ -65,15 +56,8 @@ struct ViewerRig
             const AutoPoint def(points[std::size_t(i)].x, points[std::size_t(i)].y);
             tool->AddInput(OrbID(("P" + std::to_string(i)).c_str()), nullptr, CLSID_DataType_Point, attrs, def);
         }
-        viewer.SetImage(Backdrop());
-        viewer.resize(Width, Height);
-        viewer.ShowTool(tool);
-        viewer.show();
-        QApplication::processEvents();
+        Show();
     }
-
-    OrbaneDoc doc;
-    ViewerPanel viewer;
 };
 
 void SendMouse(QWidget *w, QEvent::Type type, QPointF at, Qt::MouseButtons held)
@@ -90,12 +74,7 @@ void BM_Viewer_DrawPointOverlays(benchmark::State &state)
     if (!LoadControlModule())
         return state.SkipWithError("the control library did not load");
     ViewerRig rig(int(state.range(0)));
-    QImage target(Width, Height, QImage::Format_ARGB32_Premultiplied);
-    for (auto _ : state) {
-        rig.viewer.render(&target);
-        benchmark::DoNotOptimize(target.bits());
-    }
-    state.SetItemsProcessed(state.iterations() * state.range(0));
+    rig.Repaints(state);
 }
 
 // The same picture drawn straight: the image, then for each point a shadow
@@ -103,7 +82,7 @@ void BM_Viewer_DrawPointOverlays(benchmark::State &state)
 void BM_NaiveQPainter_DrawPoints(benchmark::State &state)
 {
     const int count = int(state.range(0));
-    const QImage image = Backdrop();
+    const QImage image = BenchViewer::Backdrop();
     std::vector<QPointF> points;
     const double zoom = std::min(double(Width) / ImageWidth, double(Height) / ImageHeight);
     const QPointF origin((Width - ImageWidth * zoom) / 2, (Height - ImageHeight * zoom) / 2);

@@ -11,5 +11,6 @@ return {
     { file = "tools/Transform.lua", name = "Transform1" },
     { file = "tools/Files.lua", name = "Files1" },
     { file = "tools/Groups.lua", name = "Groups1" },
+    { file = "tools/Roto.lua", name = "Roto1" },
   },
 }

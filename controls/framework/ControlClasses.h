@@ -22,6 +22,7 @@
 #include "overlays/CrosshairControl.h"
 #include "overlays/PointControl.h"
 #include "overlays/RectangleControl.h"
+#include "polyline/PolyLineControl.h"
 
 #include "orbane/OverlayControl.h"
 
@@ -65,7 +66,6 @@ ORBANE_PENDING_INPUT(LogControl);
 ORBANE_PENDING_PREVIEW(MeshControl);
 ORBANE_PENDING_PREVIEW(ObloidControl);
 ORBANE_PENDING_INPUT(PatternControl);
-ORBANE_PENDING_PREVIEW(PolyLineControl);
 ORBANE_PENDING_PREVIEW(PositionerControl);
 ORBANE_PENDING_DERIVED(SliderOverlay, OverlayControl);
 ORBANE_PENDING_INPUT(SplineControl);

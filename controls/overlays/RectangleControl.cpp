@@ -38,31 +38,12 @@ bool Finite(OrbPoint p)
     return std::isfinite(p.x) && std::isfinite(p.y);
 }
 
-// A Number Input's value, where it is a finite number.
-bool ReadNumber(const Parameter *value, float64 &out)
-{
-    const auto *n = dynamic_cast<const Number *>(value);
-    if (!n || !std::isfinite(n->Value))
-        return false;
-    out = n->Value;
-    return true;
-}
-
 bool ReadPoint(const Parameter *value, OrbPoint &out)
 {
     const auto *p = dynamic_cast<const Point *>(value);
     if (!p || !std::isfinite(p->X) || !std::isfinite(p->Y))
         return false;
     out = OrbPoint(p->X, p->Y);
-    return true;
-}
-
-// Takes `to` into `copy` where it moved by more than the threshold.
-bool Take(float64 &copy, float64 to)
-{
-    if (!PreviewControl::Moved(copy, to))
-        return false;
-    copy = to;
     return true;
 }
 
@@ -153,13 +134,7 @@ bool RectangleControl::SetAttrsTagList(Input *input, const TagList &tags)
         mShownBlendAmount = mBlendAmount;
         UpdateDisplay(nullptr, nullptr);
     }
-    // Linked Inputs show their values from the moment they are linked.
-    for (std::size_t i = 0; i < std::size(Links); ++i)
-        if (linked & (1u << i)) {
-            Input *in = this->*(Links[i].slot);
-            const AutoParameter value(in->GetValue(GetCurrentTime()));
-            NotifyChanged(in, value.get(), nullptr);
-        }
+    NotifyLinkedInputs(*this, Links, linked);
     return HandleOverlay::SetAttrsTagList(input, tags);
 }
 
@@ -210,11 +185,9 @@ bool RectangleControl::ReadAspectLock(const TagList &tags)
 
 bool RectangleControl::RemoveInput(Input *input, const TagList *tags)
 {
-    const LinkedInput<RectangleControl> *row = FindLinkedInput(*this, Links, input);
+    const LinkedInput<RectangleControl> *row = DetachLinkedInput(*this, Links, input);
     if (row && row->slot == &RectangleControl::mImageInput)
         mImage = QImage();
-    if (row)
-        DetachFromInput(this->*(row->slot));
     return HandleOverlay::RemoveInput(input, tags) || row;
 }
 
@@ -225,9 +198,9 @@ void RectangleControl::NotifyChanged(Input *input, Parameter *value, const TagLi
     bool moved = false;
     float64 number = 0.0;
     if (input && input == GetMainInput())
-        moved = ReadNumber(value, number) && Take(mWidth, number);
+        moved = ReadLinkedNumber(value, number) && TakeMoved(mWidth, number);
     else if (input && Inputs().size() > 1 && input == Inputs()[1])
-        moved = ReadNumber(value, number) && Take(mHeight, number);
+        moved = ReadLinkedNumber(value, number) && TakeMoved(mHeight, number);
     else if (FindLinkedInput(*this, Links, input))
         StoreLinked(input, value, moved);
     else
@@ -242,23 +215,23 @@ void RectangleControl::StoreLinked(Input *input, const Parameter *value, bool &m
 {
     OrbPoint point;
     float64 n = 0.0;
-    const bool isPoint = ReadPoint(value, point), isNumber = ReadNumber(value, n);
+    const bool isPoint = ReadPoint(value, point), isNumber = ReadLinkedNumber(value, n);
     if (input == mCenterInput && isPoint)
-        moved = (Take(mCenter.x, point.x) | Take(mCenter.y, point.y)) || moved;
+        moved = (TakeMoved(mCenter.x, point.x) | TakeMoved(mCenter.y, point.y)) || moved;
     if (input == mCenterXInput && isNumber)
-        moved = Take(mCenter.x, n) || moved;
+        moved = TakeMoved(mCenter.x, n) || moved;
     if (input == mCenterYInput && isNumber)
-        moved = Take(mCenter.y, n) || moved;
+        moved = TakeMoved(mCenter.y, n) || moved;
     if (input == mAngleInput && isNumber)
-        moved = Take(mAngle, n) || moved;
+        moved = TakeMoved(mAngle, n) || moved;
     if (input == mSizeInput && isNumber)
-        moved = Take(mSize, n) || moved;
+        moved = TakeMoved(mSize, n) || moved;
     if (input == mAxisInput && isPoint)
-        moved = (Take(mAxis.x, point.x) | Take(mAxis.y, point.y)) || moved;
+        moved = (TakeMoved(mAxis.x, point.x) | TakeMoved(mAxis.y, point.y)) || moved;
     if (input == mAxisXInput && isNumber)
-        moved = Take(mAxis.x, n) || moved;
+        moved = TakeMoved(mAxis.x, n) || moved;
     if (input == mAxisYInput && isNumber)
-        moved = Take(mAxis.y, n) || moved;
+        moved = TakeMoved(mAxis.y, n) || moved;
     if (input == mFlipXInput && isNumber && mFlipX != (n != 0.0)) {
         mFlipX = n != 0.0;
         moved = true;

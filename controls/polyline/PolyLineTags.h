@@ -26,6 +26,15 @@ constexpr Tag PLC_FollowExternMatchPoint = 0x1005800E; // read from the source t
 constexpr Tag PLC_ShowPolyLine = 0x1005800F;
 constexpr Tag PLC_DrawStyle = 0x10058010; // 0 solid, 1 dash, 2, 5 null
 constexpr Tag PLC_ShowTaggedPointIDs = 0x10058015;
+// Creation tags without a script name (so not in the tag map).
+constexpr Tag PLC_PairFromAttach = 0x10058011;     // the pairing state comes from the attach result
+constexpr Tag PLC_KeepFlag = 0x10058012;           // a bool the control keeps
+constexpr Tag PLC_ShowSelectedHidden = 0x10058013; // selected points drawn with points and handles hidden
+constexpr Tag PLC_KeyPointColor = 0x10058014;      // the custom key point colour
+// Host tags the control reads: the overlay colour of any preview control
+// (its custom spline colour) and the source tool's "follow inner" setting.
+constexpr Tag PCA_Color = 0x1003000F;
+constexpr Tag TOOL_FollowInner = 0x10030005;
 constexpr Tag PLCP_Center = 0x60058000;
 constexpr Tag PLCID_Center = 0x80058000;
 constexpr Tag PLCD_SetX = 0x20058000;

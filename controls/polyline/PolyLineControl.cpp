@@ -1,0 +1,691 @@
+#include "polyline/PolyLineControl.h"
+
+#include "polyline/PolyLineTags.h"
+#include "polyline/ShapeBox.h"
+
+#include "orbane/AutoParam.h"
+#include "orbane/ClassIDs.h"
+#include "orbane/ControlCommands.h"
+#include "orbane/GPainter.h"
+#include "orbane/Input.h"
+#include "orbane/Operator.h"
+#include "orbane/OrbaneDoc.h"
+#include "orbane/PolyLine.h"
+#include "orbane/Prefs.h"
+#include "orbane/PreviewInfo.h"
+#include "orbane/ScriptVal.h"
+
+#include <cmath>
+
+namespace Orbane {
+
+using Graphics::GColor;
+using Graphics::GPainter;
+
+namespace {
+
+constexpr OrbColor kGrey{192, 192, 192};
+constexpr GColor kCyan{0.0f, 1.0f, 1.0f}, kMagenta{1.0f, 0.0f, 1.0f}, kYellow{1.0f, 1.0f, 0.0f};
+// Dimmed handles are this much darker.
+constexpr float32 kDimming = 0.75f;
+// Onion skins: dotted, orange, half seen.
+constexpr uint16 kOnionStipple = 0x0F0F;
+constexpr GColor kOnionColor{1.0f, 0.55f, 0.1f, 0.6f};
+// The centre marker's arms, in handle pixels.
+constexpr float64 kCentreArm = 8.0;
+// A Click Append press pulls the new point's handles only once the mouse has
+// gone this many viewer pixels from it; a wobble of the hand adds a corner.
+constexpr float64 kPullDistance = 3.0;
+
+// The colour with its alpha byte replaced by the fade.
+OrbColor WithFade(OrbColor c, float32 fade)
+{
+    return OrbColor(c.R(), c.G(), c.B(), uint8(std::lround(255.0f * fade)));
+}
+
+} // namespace
+
+const LinkedInput<PolyLineControl> PolyLineControl::Links[] = {
+    {PLCP_Center, PLCID_Center, &PolyLineControl::mCenterInput},
+    {PLCP_Angle, PLCID_Angle, &PolyLineControl::mAngleInput},
+    {PLCP_Size, PLCID_Size, &PolyLineControl::mSizeInput},
+    {PLCP_Displacement, PLCID_Displacement, &PolyLineControl::mDisplacementInput},
+    {PLCP_CurrentTimePoint, PLCID_CurrentTimePoint, &PolyLineControl::mCurrentTimePointInput},
+    {PLCP_AngleX, PLCID_AngleX, &PolyLineControl::mAngleXInput},
+    {PLCP_AngleY, PLCID_AngleY, &PolyLineControl::mAngleYInput},
+    {PLCP_AngleZ, PLCID_AngleZ, &PolyLineControl::mAngleZInput},
+    {PLCP_InPolyLine2, PLCID_InPolyLine2, &PolyLineControl::mOuterInput},
+    {PLCP_CenterX, PLCID_CenterX, &PolyLineControl::mCenterXInput},
+    {PLCP_CenterY, PLCID_CenterY, &PolyLineControl::mCenterYInput},
+    {PLCP_CenterZ, PLCID_CenterZ, &PolyLineControl::mCenterZInput},
+    {PLCP_TrackerSize, PLCID_TrackerSize, &PolyLineControl::mTrackerSizeInput},
+    {PLCP_TrackerSearchSize, PLCID_TrackerSearchSize, &PolyLineControl::mTrackerSearchSizeInput},
+    {PLCP_InPolyLine, PLCID_InPolyLine, &PolyLineControl::mInnerInput},
+};
+
+PolyLineControl::PolyLineControl(const Registry *reg, const ScriptVal &args, const TagList &tags)
+    : HandleOverlay(reg, args, tags), mShapeBox(new ShapeBox(nullptr, args, TagList()))
+{
+    for (std::size_t i = 0; i < mCursors.size(); ++i)
+        mCursors[i] = QCursor(CursorShapes[i]);
+    mCurrentCursor = &mCursors[0];
+    PolyLineControl::SetAttrsTagList(nullptr, tags);
+}
+
+PolyLineControl::~PolyLineControl()
+{
+    CloseStep();
+    DetachLinkedInputs(*this, Links);
+    mShapeBox->DecRef();
+}
+
+// --- set-up ---
+
+bool PolyLineControl::SetAttrsTagList(Input *input, const TagList &tags)
+{
+    const Input *main = GetMainInput();
+    Operator *tool = main ? main->GetOperator() : nullptr;
+    const uint32 linked = AttachLinkedInputs(*this, Links, tool, tags);
+    ReadAttachResult(tags);
+    ReadFlags(tags);
+    ReadColors(tags);
+    ReadDefaults(tags);
+    if (tool) {
+        mFollowExternMatchPoint = tool->GetAttrs().GetBool(PLC_FollowExternMatchPoint, mFollowExternMatchPoint);
+        ReadPairing(tool->GetAttrs());
+    }
+    if (OrbaneDoc *doc = GetDoc())
+        mExportSplineMode = uint16(doc->GetPrefs().GetLong(PREF_ExportSplineMode, mExportSplineMode));
+    if (main)
+        mShapeReadOnly = main->GetAttrs().GetBool(INPA_ReadOnly, mShapeReadOnly);
+    EmptySelectionWhenHidden();
+    NotifyLinkedInputs(*this, Links, linked);
+    UpdateDisplay(nullptr, nullptr);
+    return HandleOverlay::SetAttrsTagList(input, tags);
+}
+
+// A tag that is absent leaves its field as it is.
+void PolyLineControl::ReadFlags(const TagList &tags)
+{
+    if (tags.FindQuery(PLC_DrawMode))
+        SetMode(uint8(tags.GetLong(PLC_DrawMode, 0)));
+    for (auto [tag, field] : {std::pair{PLC_RecordTime, &mRecordTime},
+                              {PLC_RecordPressure, &mRecordPressure},
+                              {PLC_RecordHeight, &mRecordHeight},
+                              {PLC_RecordAngleXY, &mRecordAngleXY},
+                              {PLC_RecordAngleZ, &mRecordAngleZ},
+                              {PLC_RecordRotation, &mRecordRotation},
+                              {PLC_CanPublishPoints, &mCanPublishPoints},
+                              {PLC_CurrentTimeOnly, &mCurrentTimeOnly},
+                              {PLC_Animated, &mAnimated},
+                              {PLC_PairFromAttach, &mPairFromAttach},
+                              {PLC_KeepFlag, &mKeptFlag}})
+        *field = tags.GetBool(tag, *field);
+    mStopRendering = tags.GetInt(PLC_StopRendering, mStopRendering);
+    for (auto [tag, bit] : {std::pair{PLC_ShowKeyPoints, PLD_KeyPoints},
+                            {PLC_ShowHandles, PLD_Handles},
+                            {PLC_ShowPolyLine, PLD_Curve},
+                            {PLC_ShowSelectedHidden, PLD_SelectedWhenHidden},
+                            {PLC_ShowTaggedPointIDs, PLD_TaggedIDs}}) {
+        const bool on = tags.GetLong(tag, (mDisplayFlags & bit) ? 1 : 0) != 0;
+        mDisplayFlags = uint16(on ? mDisplayFlags | bit : mDisplayFlags & ~bit);
+    }
+    if (tags.FindQuery(PLC_DrawStyle))
+        ReadDrawStyle(tags.GetLong(PLC_DrawStyle, 0));
+}
+
+// 0 is solid; 1, 2 and 5 (the menu's "Null") set their own bit alone; any
+// other value keeps the style there is.
+void PolyLineControl::ReadDrawStyle(int64 style)
+{
+    uint16 bit = 0;
+    if (style == 1)
+        bit = PLD_Dash;
+    else if (style == 2)
+        bit = PLD_Style2;
+    else if (style == 5)
+        bit = PLD_Null;
+    else if (style != 0)
+        return;
+    mDisplayFlags = uint16((mDisplayFlags & ~PLD_Styles) | bit);
+}
+
+void PolyLineControl::ReadColors(const TagList &tags)
+{
+    if (tags.FindQuery(PLC_HandleColor))
+        mHandleColor = mHandleColorAlt = OrbColor(uint32(tags.GetLong(PLC_HandleColor, 0)));
+    mCustomSplineColor = OrbColor(uint32(tags.GetLong(PCA_Color, mCustomSplineColor.Packed())));
+    mCustomKeyPointColor = OrbColor(uint32(tags.GetLong(PLC_KeyPointColor, mCustomKeyPointColor.Packed())));
+}
+
+// The values of the placing Inputs, where no Input is linked for them.
+void PolyLineControl::ReadDefaults(const TagList &tags)
+{
+    auto read = [&tags](const Input *linked, Tag tag, float64 &field) {
+        const float64 to = tags.GetDouble(tag, field);
+        if (!linked && std::isfinite(to))
+            field = to;
+    };
+    read(mCenterInput ? mCenterInput : mCenterXInput, PLCD_SetX, mCenter.x);
+    read(mCenterInput ? mCenterInput : mCenterYInput, PLCD_SetY, mCenter.y);
+    read(mAngleInput, PLCD_SetAngle, mAngle);
+    read(mSizeInput, PLCD_SetSize, mSize);
+    read(mAngleXInput, PLCD_SetAngleX, mAngleX);
+    read(mAngleYInput, PLCD_SetAngleY, mAngleY);
+    read(mTrackerSizeInput, PLCD_SetTrackerSize, mTrackerSize);
+    read(mTrackerSearchSizeInput, PLCD_SetTrackerSearchSize, mTrackerSearchSize);
+}
+
+// Displacement, inner and outer polyline named by id and found add 1, 2 and 4.
+void PolyLineControl::ReadAttachResult(const TagList &tags)
+{
+    for (auto [tag, slot, bit] : {std::tuple{PLCID_Displacement, mDisplacementInput, 1u},
+                                  {PLCID_InPolyLine, mInnerInput, 2u},
+                                  {PLCID_InPolyLine2, mOuterInput, 4u}})
+        if (tags.FindQuery(tag) && slot)
+            mAttachResult |= bit;
+}
+
+// With an outer polyline the source tool's "follow inner" setting decides:
+// following is state 1, free state 2. Where the tags ask for the state from
+// the attach result, a shape that is itself the outer of another (result 2)
+// is state 0 and one with neither is state 3, an outer that may be enabled.
+void PolyLineControl::ReadPairing(const TagList &toolAttrs)
+{
+    if (mOuterInput)
+        mPairing = toolAttrs.GetBool(TOOL_FollowInner, false) ? 1 : 2;
+    else if (mPairFromAttach)
+        mPairing = (mAttachResult & 2) ? 0 : 3;
+}
+
+// Nothing of the points shows: nothing stays selected, except on a dimmed
+// shape (one edited among several) that keeps its selection for the others.
+void PolyLineControl::EmptySelectionWhenHidden()
+{
+    if ((mDisplayFlags & (PLD_KeyPoints | PLD_Handles)) || (mDimmed && !mKeptFlag))
+        return;
+    mSelection.Reset();
+}
+
+void PolyLineControl::SetMode(uint8 mode)
+{
+    mDrawMode = uint8((mDrawMode & 0xF0) | (mode & 0x0F));
+    const uint8 now = ModeOf();
+    mCurrentCursor = &mCursors[now == PLM_ClickAppend ? 2 : now == PLM_DrawAppend ? 1 : 0];
+}
+
+bool PolyLineControl::GetAttrsTagList(TagList &tags) const
+{
+    WriteLinkedInputIds(*this, Links, tags);
+    tags.Set(PLC_DrawMode, int32(mDrawMode));
+    tags.Set(PLC_ShowKeyPoints, bool(mDisplayFlags & PLD_KeyPoints));
+    tags.Set(PLC_ShowHandles, bool(mDisplayFlags & PLD_Handles));
+    tags.Set(PLC_ShowPolyLine, (mDisplayFlags & PLD_Curve) ? 1 : 0);
+    tags.Set(PLC_ShowTaggedPointIDs, (mDisplayFlags & PLD_TaggedIDs) ? 1 : 0);
+    const uint16 style = mDisplayFlags & PLD_Styles;
+    tags.Set(PLC_DrawStyle, style == PLD_Dash ? 1 : style == PLD_Style2 ? 2 : style == PLD_Null ? 5 : 0);
+    tags.Set(PLC_HandleColor, mHandleColor.Packed());
+    for (auto [tag, on] : {std::pair{PLC_RecordTime, mRecordTime},
+                           {PLC_RecordPressure, mRecordPressure},
+                           {PLC_CurrentTimeOnly, mCurrentTimeOnly},
+                           {PLC_Animated, mAnimated}})
+        tags.Set(tag, on);
+    tags.Set(PLCD_SetX, mCenter.x);
+    tags.Set(PLCD_SetY, mCenter.y);
+    tags.Set(PLCD_SetAngle, mAngle);
+    tags.Set(PLCD_SetSize, mSize);
+    return true;
+}
+
+void PolyLineControl::GetState(ScriptVal &state) const
+{
+    HandleOverlay::GetState(state);
+    state.SetKey(ScriptVal("mode"), ScriptVal(int(ModeOf())));
+    state.SetKey(ScriptVal("displayFlags"), ScriptVal(int(mDisplayFlags)));
+    state.SetKey(ScriptVal("dimmed"), ScriptVal(mDimmed));
+    state.SetKey(ScriptVal("shapeReadOnly"), ScriptVal(mShapeReadOnly));
+    state.SetKey(ScriptVal("attachResult"), ScriptVal(int64(mAttachResult)));
+    state.SetKey(ScriptVal("pairing"), ScriptVal(mPairing));
+    state.SetKey(ScriptVal("cursor"), ScriptVal(int(mCurrentCursor->shape())));
+    ScriptVal selected = ScriptVal::NewTable();
+    for (int32 n = 0; n < mSelection.GetSetCount(); ++n)
+        selected.SetKey(ScriptVal(n + 1), ScriptVal(mSelection.GetSetItem(n)));
+    state.SetKey(ScriptVal("selected"), selected);
+    const AutoRef<PolyLine> shape = Shape();
+    state.SetKey(ScriptVal("points"), ScriptVal(shape ? shape->GetCount() : 0));
+}
+
+// --- values ---
+
+bool PolyLineControl::RemoveInput(Input *input, const TagList *tags)
+{
+    const bool linked = DetachLinkedInput(*this, Links, input) != nullptr;
+    return HandleOverlay::RemoveInput(input, tags) || linked;
+}
+
+void PolyLineControl::NotifyChanged(Input *input, Parameter *value, const TagList *tags)
+{
+    if (!value)
+        return;
+    bool moved = false;
+    if (input && input == GetMainInput())
+        moved = StoreShape(value);
+    else if (FindLinkedInput(*this, Links, input))
+        StoreLinked(input, value, moved);
+    else
+        moved = true;
+    if (moved)
+        HandleOverlay::NotifyChanged(input, value, tags);
+}
+
+// Replaces the drawn copy under the lock; the selection follows the count.
+bool PolyLineControl::StoreShape(const Parameter *value)
+{
+    auto *shape = dynamic_cast<PolyLine *>(const_cast<Parameter *>(value));
+    if (!shape)
+        return false;
+    {
+        const WriteGuard guard(*this);
+        if (mShape && mShape->Equals(*shape))
+            return false;
+        mShape = AutoRef<PolyLine>::Share(shape);
+    }
+    if (mSelection.GetCount() != shape->GetCount()) {
+        SelMask resized(shape->GetCount());
+        for (int32 i = 0; i < std::min(resized.GetCount(), mSelection.GetCount()); ++i)
+            resized.SetState(i, mSelection[i]);
+        mSelection = resized;
+    }
+    return true;
+}
+
+void PolyLineControl::StoreLinked(Input *input, const Parameter *value, bool &moved)
+{
+    float64 n = 0.0;
+    const bool isNumber = ReadLinkedNumber(value, n);
+    if (input == mCenterInput)
+        if (const auto *p = dynamic_cast<const Point *>(value))
+            moved = (TakeMoved(mCenter.x, p->X) | TakeMoved(mCenter.y, p->Y)) || moved;
+    for (auto [in, field] : {std::pair{mCenterXInput, &mCenter.x},
+                             {mCenterYInput, &mCenter.y},
+                             {mAngleInput, &mAngle},
+                             {mSizeInput, &mSize},
+                             {mAngleXInput, &mAngleX},
+                             {mAngleYInput, &mAngleY},
+                             {mTrackerSizeInput, &mTrackerSize},
+                             {mTrackerSearchSizeInput, &mTrackerSearchSize}})
+        if (in == input && isNumber)
+            moved = TakeMoved(*field, n) || moved;
+    // The shapes paired with this one redraw with it.
+    if (input == mOuterInput || input == mInnerInput)
+        moved = true;
+}
+
+AutoRef<PolyLine> PolyLineControl::Shape() const
+{
+    const ReadGuard guard(*this);
+    return mShape;
+}
+
+bool PolyLineControl::IsToolLocked() const
+{
+    const Input *main = GetMainInput();
+    return main && main->GetOperator() && main->GetOperator()->IsLocked();
+}
+
+bool PolyLineControl::IsAppending() const
+{
+    return ModeOf() == PLM_ClickAppend || ModeOf() == PLM_DrawAppend;
+}
+
+void PolyLineControl::SetInactive(const TagList *tags)
+{
+    CloseStep();
+    mCreation.gesture = PolyLineCreation::PCG_None;
+    HandleOverlay::SetInactive(tags);
+}
+
+// --- drawing ---
+
+// The viewer's control size: twice its handle scale, so markers grow with
+// the handles on a viewer that draws them larger.
+PolyLineStyle PolyLineControl::Style(const PreviewInfo &info) const
+{
+    PolyLineStyle s;
+    s.flags = mDisplayFlags;
+    const bool grey = mShapeReadOnly || IsToolLocked() || ModeOf() == PLM_Done;
+    const OrbColor base = grey ? kGrey : OrbColor();
+    const float32 fade = Fade();
+    s.curve = mCustomSplineColor.IsNone() ? info.GetColor(base).Faded(fade)
+                                          : GColor::FromOrb(WithFade(mCustomSplineColor, fade));
+    s.shadow = info.GetShadow(base).Faded(fade);
+    const OrbColor keyPoint = mCustomKeyPointColor.IsNone() ? mHandleColor : mCustomKeyPointColor;
+    s.keyPoint = GColor::FromOrb(WithFade(keyPoint, fade));
+    s.handle = GColor::FromOrb(WithFade(mHandleColorAlt, fade));
+    if (mDimmed) {
+        s.keyPoint = s.keyPoint.Darker(kDimming);
+        s.handle = s.handle.Darker(kDimming);
+    }
+    s.active = (IsActive() ? kCyan : kMagenta).Faded(fade);
+    s.hover = kYellow.Faded(fade);
+    s.stipple = PolyLineDrawing::StippleFor(mDisplayFlags);
+    const ViewMapping &m = info.Mapping();
+    s.span = OrbPoint(m.SpanX(), m.SpanY());
+    const float64 half = PolyLineDrawing::MarkerSide(2.0 * info.HandleScale) / 2.0;
+    s.half = OrbPoint(half / s.span.x, half / s.span.y);
+    s.hot = Handles().PickedHit() ? Handles().PickedHit() : Handles().PoisedHit();
+    s.pending = mCreation.gesture == PolyLineCreation::PCG_Click ||
+                (mCreation.gesture == PolyLineCreation::PCG_Move && !mSelection.IsMultiSet());
+    return s;
+}
+
+void PolyLineControl::DrawControls(PreviewInfo *info, const TagList *tags)
+{
+    GPainter *p = info->GetPainter();
+    if (!p || info->DrawPass == 3)
+        return HandleOverlay::DrawControls(info, tags);
+    const ReadGuard guard(*this);
+    p->PushAttrib();
+    p->PushMatrix();
+    if ((mCenterInput || mCenterXInput || mCenterYInput) && mShape && mShape->GetCount() > 0)
+        DrawCentre(*p, *info);
+    // From here on the painter takes image coordinates.
+    const ViewMapping &m = info->Mapping();
+    p->Translate(m.Origin().x, m.Origin().y);
+    p->Scale(m.SpanX(), m.SpanY());
+    const PolyLineStyle style = Style(*info);
+    if (mShape)
+        mDrawing.Draw(*p, *mShape, mSelection, style);
+    if (mCreation.gesture == PolyLineCreation::PCG_Stroke) {
+        p->Color(style.curve, style.shadow);
+        PolyLineDrawing::DrawStrip(*p, mCreation.StrokePoints());
+    }
+    DrawOnionSkins(*p, *info, style);
+    p->PopMatrix();
+    p->PopAttrib();
+    HandleOverlay::DrawControls(info, tags);
+}
+
+// A magenta cross on the centre, sized, turned about Z and then tilted
+// about X and Y as the linked Inputs say.
+void PolyLineControl::DrawCentre(GPainter &p, const PreviewInfo &info) const
+{
+    p.PushMatrix();
+    p.Color(GColor::FromOrb(OrbColor(255, 0, 255)), info.GetShadow(OrbColor()));
+    p.Translate(info.TransformXOut(mCenter.x), info.TransformYOut(mCenter.y));
+    p.Scale(mSize, mSize, 1.0);
+    p.Rotate(mAngle, 0.0, 0.0, 1.0);
+    p.Rotate(mAngleX, 1.0, 0.0, 0.0);
+    p.Rotate(mAngleY, 0.0, 1.0, 0.0);
+    const float64 arm = kCentreArm * info.HandleScale;
+    p.Begin(Graphics::GP_Lines);
+    p.Vertex(-arm, 0.0), p.Vertex(arm, 0.0);
+    p.Vertex(0.0, -arm), p.Vertex(0.0, arm);
+    p.End();
+    p.PopMatrix();
+}
+
+// The shapes of the other keyframes, dotted in their own colour.
+void PolyLineControl::DrawOnionSkins(GPainter &p, const PreviewInfo &info, const PolyLineStyle &style) const
+{
+    Input *main = GetMainInput();
+    if (!main || !main->IsAnimated())
+        return;
+    const float64 now = GetCurrentTime();
+    p.PushAttrib();
+    p.LineStipple(1, kOnionStipple);
+    p.Enable(Graphics::GC_LineStipple);
+    p.Color(kOnionColor, info.GetShadow(OrbColor()).Faded(0.5f));
+    for (const float64 time : main->KeyTimes()) {
+        if (std::fabs(time - now) < 1e-9)
+            continue;
+        const AutoParam<PolyLine> skin(main, time);
+        if (skin)
+            PolyLineDrawing::DrawCurve(p, *skin, style.span);
+    }
+    p.PopAttrib();
+}
+
+// --- handles ---
+
+// Key points where they show (or, hidden, the selected ones where flag 8
+// asks), and the handle ends of the selected points where handles show.
+void PolyLineControl::BuildHandles(const PreviewInfo &info, HandleSet &handles) const
+{
+    handles.Clear();
+    const AutoRef<PolyLine> shape = Shape();
+    if (!shape)
+        return;
+    const bool points = mDisplayFlags & PLD_KeyPoints;
+    const bool selected = !points && !(mDisplayFlags & PLD_Handles) && (mDisplayFlags & PLD_SelectedWhenHidden);
+    const bool ends = mDisplayFlags & PLD_Handles;
+    const int32 count = shape->GetCount();
+    for (int32 i = 0; i < count; ++i) {
+        const PolyPoint &pt = *shape->GetPoint(i);
+        if (points || (selected && mSelection.IsSet(i)))
+            handles.AddPixelSquare(info.TransformOut(pt.Pos()), PLP_Point).item = i;
+        if (ends && mSelection.IsSet(i)) {
+            handles.AddPixelSquare(info.TransformOut(pt.In()), PLP_InHandle, HP_Tangent).item = i;
+            handles.AddPixelSquare(info.TransformOut(pt.Out()), PLP_OutHandle, HP_Tangent).item = i;
+        }
+    }
+}
+
+// In the append modes the overlay hears every hover, to show its cursor
+// anywhere in the viewer.
+bool PolyLineControl::HoverBounds(const PreviewInfo &info, OrbRect &bounds) const
+{
+    if (IsAppending())
+        return false;
+    return HandleOverlay::HoverBounds(info, bounds);
+}
+
+uint64 PolyLineControl::ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags)
+{
+    const uint64 result = HandleOverlay::ControlCommand(info, command, data, tags);
+    if (command == CCMD_HitTest)
+        ShowCursor(*info, IsAppending() && !(data & 1));
+    return result;
+}
+
+// The control's cursor while it takes the viewer's presses; the viewer's
+// own again once it does not.
+void PolyLineControl::ShowCursor(const PreviewInfo &info, bool show)
+{
+    if (show)
+        info.SetCursor(mCurrentCursor);
+    else if (mCursorShown)
+        info.SetCursor(nullptr);
+    mCursorShown = show;
+}
+
+// --- the mouse ---
+
+bool PolyLineControl::CanCreate() const
+{
+    return IsAppending() && GetMainInput() && !mShapeReadOnly && !IsToolLocked();
+}
+
+// In the append modes any press is ours: it adds a point (or closes the
+// shape on its first point) or starts a stroke. In the others a press on a
+// key point or a handle end picks it for a drag.
+DragType PolyLineControl::ControlDown(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
+{
+    if (info->HotControl)
+        return HandleOverlay::ControlDown(info, mouse, tags);
+    const HandleHit hit = PressHit(*info);
+    const OrbPoint at(info->MouseX, info->MouseY);
+    if (CanCreate() && ModeOf() == PLM_ClickAppend)
+        BeginClick(hit, at);
+    else if (CanCreate())
+        BeginStroke(at);
+    else if (hit && GetMainInput() && !mShapeReadOnly && ModeOf() != PLM_Done)
+        BeginMove(*info, hit);
+    if (mCreation.gesture != PolyLineCreation::PCG_None) {
+        mDragType = DRAG_Handle;
+        ShowCursor(*info, IsAppending());
+    }
+    return HandleOverlay::ControlDown(info, mouse, tags);
+}
+
+// A press on the first point of an open shape of three or more closes it;
+// any other adds a corner point, selected alone.
+void PolyLineControl::BeginClick(HandleHit hit, OrbPoint at)
+{
+    const AutoRef<PolyLine> shape = Shape();
+    if (shape && !shape->IsClosed() && shape->GetCount() >= 3 && hit.part == PLP_Point && hit.item == 0) {
+        OpenStep("Close polygon");
+        WriteShape(PolyLineCreation::Closed(*shape));
+        mCreation.gesture = PolyLineCreation::PCG_Close;
+        SetMode(PLM_InsertModify);
+        return;
+    }
+    // Where the mouse is: the press, not the pick, places the point.
+    OpenStep("Add Point");
+    if (!WriteShape(PolyLineCreation::Appended(shape.get(), at))) {
+        CloseStep();
+        return;
+    }
+    mCreation.gesture = PolyLineCreation::PCG_Click;
+    mCreation.index = Shape()->GetCount() - 1;
+    mSelection.DoSet(mCreation.index, SelMask::SEL_Only);
+}
+
+void PolyLineControl::BeginStroke(OrbPoint at)
+{
+    mStrokeClock.start();
+    mCreation.BeginStroke({at, 0.0, 1.0});
+    mCreation.gesture = PolyLineCreation::PCG_Stroke;
+}
+
+void PolyLineControl::BeginMove(const PreviewInfo &info, HandleHit hit)
+{
+    const AutoRef<PolyLine> shape = Shape();
+    const PolyPoint &pt = *shape->GetPoint(hit.item);
+    const OrbPoint held = hit.part == PLP_InHandle ? pt.In() : hit.part == PLP_OutHandle ? pt.Out() : pt.Pos();
+    mGrabOffset = info.TransformOut(held) - info.MouseInViewer();
+    mCreation.gesture = PolyLineCreation::PCG_Move;
+    mCreation.index = hit.item;
+    mCreation.part = hit.part;
+    if (hit.part == PLP_Point && !mSelection.IsSet(hit.item))
+        mSelection.DoSet(hit.item, SelMask::SEL_Only);
+    Pick(hit);
+}
+
+void PolyLineControl::ControlMove(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
+{
+    HandleOverlay::ControlMove(info, mouse, tags);
+    if (mDragType != DRAG_Handle)
+        return;
+    const OrbPoint at(info->MouseX, info->MouseY);
+    switch (mCreation.gesture) {
+    case PolyLineCreation::PCG_Click:
+        PullHandles(*info, at);
+        break;
+    case PolyLineCreation::PCG_Stroke:
+        if (mCreation.AddSample({at, mStrokeClock.elapsed() / 1000.0, 1.0}, OnePixel(*info)))
+            Redraw();
+        break;
+    case PolyLineCreation::PCG_Move:
+        MovePicked(*info);
+        break;
+    default:
+        break;
+    }
+}
+
+// The new point's handles follow the mouse, smooth, once it has left the
+// point; they stay on the point while it has not.
+void PolyLineControl::PullHandles(const PreviewInfo &info, OrbPoint to)
+{
+    const AutoRef<PolyLine> shape = Shape();
+    // A B-spline's control points have no handles to pull.
+    if (!shape || mCreation.index >= shape->GetCount() || shape->DataType() == CLSID_DataType_BSplinePolyline)
+        return;
+    const OrbPoint point = shape->GetPoint(mCreation.index)->Pos();
+    if ((info.TransformOut(to) - info.TransformOut(point)).Length() < kPullDistance)
+        to = point;
+    WriteShape(PolyLineCreation::Pulled(*shape, mCreation.index, to));
+}
+
+void PolyLineControl::MovePicked(const PreviewInfo &info)
+{
+    const AutoRef<PolyLine> shape = Shape();
+    const OrbPoint to = info.TransformIn(info.MouseInViewer() + mGrabOffset);
+    if (!mStepOpen)
+        OpenStep("Move Point");
+    WriteShape(PolyLineCreation::Moved(*shape, mCreation.index, mCreation.part, to));
+}
+
+OrbPoint PolyLineControl::OnePixel(const PreviewInfo &info)
+{
+    return OrbPoint(1.0 / info.Mapping().SpanX(), 1.0 / info.Mapping().SpanY());
+}
+
+void PolyLineControl::ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
+{
+    if (mCreation.gesture == PolyLineCreation::PCG_Stroke)
+        EndStroke(*info);
+    mCreation.gesture = PolyLineCreation::PCG_None;
+    CloseStep();
+    HandleOverlay::ControlUp(info, mouse, tags);
+    Redraw();
+}
+
+// The stroke goes in as one step: fitted ("Freehand Add Points"), or every
+// sample a corner at tolerance 0 ("Add Points"), or a single point where
+// the hand did not move ("Add Point"). A stroke that went away and ends on
+// the shape's first point (its own, on an empty shape) closes the shape.
+void PolyLineControl::EndStroke(const PreviewInfo &info)
+{
+    const AutoRef<PolyLine> shape = Shape();
+    const std::vector<PolyLineCreation::Sample> &stroke = mCreation.Stroke();
+    const bool empty = !shape || shape->GetCount() == 0;
+    const OrbPoint start = info.TransformOut(empty ? stroke.front().at : shape->First()->Pos());
+    auto near = [&](OrbPoint at, float64 reach) {
+        const OrbPoint d = info.TransformOut(at) - start;
+        return std::fabs(d.x) < reach && std::fabs(d.y) < reach;
+    };
+    bool away = false;
+    for (const PolyLineCreation::Sample &s : stroke)
+        away = away || !near(s.at, 2.0 * info.PickTolerance);
+    const bool closes = away && near(stroke.back().at, info.PickTolerance) && !(shape && shape->IsClosed());
+    // The closing tail on the start is left to the closing segment.
+    while (closes && mCreation.Stroke().size() > 3 && near(mCreation.Stroke().back().at, info.PickTolerance))
+        mCreation.DropLastSample();
+    const uint32 record = (mRecordTime ? PLR_Time : 0u) | (mRecordPressure ? PLR_Pressure : 0u);
+    AutoRef<PolyLine> drawn = mCreation.WithStroke(shape.get(), OnePixel(info), mReduceTolerance, record, closes);
+    if (!drawn)
+        return;
+    if (closes)
+        drawn->Close();
+    OpenStep(stroke.size() < 2 ? "Add Point" : mReduceTolerance > 0.0 ? "Freehand Add Points" : "Add Points");
+    WriteShape(drawn);
+    if (closes)
+        SetMode(PLM_InsertModify);
+}
+
+bool PolyLineControl::WriteShape(PolyLine *shape)
+{
+    return shape && SetInputs(shape, GetCurrentTime(), 0, nullptr);
+}
+
+void PolyLineControl::OpenStep(const char *name)
+{
+    if (mStepOpen)
+        return;
+    if (OrbaneDoc *doc = GetDoc()) {
+        doc->StartUndo(name);
+        mStepOpen = true;
+    }
+}
+
+void PolyLineControl::CloseStep()
+{
+    if (!std::exchange(mStepOpen, false))
+        return;
+    if (OrbaneDoc *doc = GetDoc())
+        doc->EndUndo(true);
+}
+
+} // namespace Orbane
