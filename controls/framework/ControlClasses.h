@@ -12,6 +12,7 @@
 #include "overlays/CrosshairControl.h"
 #include "overlays/PointControl.h"
 #include "overlays/RectangleControl.h"
+#include "overlays/TransformControl.h"
 
 #include "orbane/OverlayControl.h"
 
@@ -32,8 +33,6 @@
 
 namespace Orbane {
 
-// Before the camera and light, which derive from it.
-ORBANE_PENDING_PREVIEW(TransformControl);
 ORBANE_PENDING_DERIVED(CameraControl, TransformControl);
 ORBANE_PENDING_INPUT(CheckListControl);
 ORBANE_PENDING_INPUT(ClipControl);

@@ -3,6 +3,7 @@
 #include "orbane/AutoParam.h"
 #include "orbane/ControlCommands.h"
 #include "orbane/GPainter.h"
+#include "orbane/OrbaneDoc.h"
 #include "orbane/PreviewInfo.h"
 #include "orbane/ScriptVal.h"
 
@@ -20,6 +21,11 @@ constexpr float32 kFadeStep = 0.05f;
 
 } // namespace
 
+HandleOverlay::~HandleOverlay()
+{
+    CloseGesture();
+}
+
 void HandleOverlay::ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
 {
     // A follow drag ends with the release: the overlay stops following.
@@ -28,6 +34,7 @@ void HandleOverlay::ControlUp(PreviewInfo *info, const OrbPointI &mouse, const T
         SetAttrsTagList(TagList{{PCA_FollowCursor, 0}});
     }
     mStartGrab = OrbPoint();
+    CloseGesture();
     PreviewControl::ControlUp(info, mouse, tags);
     Pick({});
 }
@@ -140,9 +147,7 @@ bool HandleOverlay::NudgeCommand(PreviewInfo *info, const OrbID &command, uint64
     } else if (command == CCMD_KeyDown) {
         const bool arrow = IsArrowKey(data);
         if (arrow) {
-            const OrbPoint to = point + NudgeOffset(data, 1.0 / info->ImageWidth, stepY, KeyModifiers());
-            AutoPoint value(to.x, to.y, 0.0);
-            SetInputs(value.get(), GetCurrentTime(), 0, nullptr);
+            WritePoint(point + NudgeOffset(data, 1.0 / info->ImageWidth, stepY, KeyModifiers()), 0);
         }
         PreviewControl::ControlCommand(info, command, data, tags);
         result = arrow ? 1 : 0;
@@ -225,6 +230,41 @@ bool HandleOverlay::CopyAttr(Tag tag, void *out)
     *static_cast<float64 *>(out) = tag == PCA_GrabOffsetX ? mGrabOffset.x : mGrabOffset.y;
     // False: the value was supplied.
     return false;
+}
+
+void HandleOverlay::OpenGesture(const char *name)
+{
+    if (mGestureOpen)
+        return;
+    if (OrbaneDoc *doc = GetDoc()) {
+        doc->StartUndo(name);
+        mGestureOpen = true;
+    }
+}
+
+void HandleOverlay::CloseGesture()
+{
+    if (!mGestureOpen)
+        return;
+    mGestureOpen = false;
+    if (OrbaneDoc *doc = GetDoc())
+        doc->EndUndo(true);
+}
+
+bool HandleOverlay::WriteNumber(float64 value, uint32 index)
+{
+    if (!std::isfinite(value) || index >= Inputs().size())
+        return false;
+    AutoNumber number(value);
+    return SetInputs(number.get(), GetCurrentTime(), index, nullptr);
+}
+
+bool HandleOverlay::WritePoint(OrbPoint value, uint32 index)
+{
+    if (!std::isfinite(value.x) || !std::isfinite(value.y) || index >= Inputs().size())
+        return false;
+    AutoPoint point(value.x, value.y, 0.0);
+    return SetInputs(point.get(), GetCurrentTime(), index, nullptr);
 }
 
 void HandleOverlay::ReadGrabOffset(const TagList &tags)

@@ -30,6 +30,7 @@ class HandleOverlay : public PreviewControl
 {
 public:
     using PreviewControl::PreviewControl;
+    ~HandleOverlay() override;
 
     std::size_t SizeOf() const override { return sizeof(HandleOverlay); }
     // Supplies the grab offset (PCA_GrabOffsetX, PCA_GrabOffsetY).
@@ -96,6 +97,16 @@ protected:
     // The keyboard's modifiers now, as the application sees them.
     static Qt::KeyboardModifiers KeyModifiers();
 
+    // One drag that writes several Inputs is one undo step under the
+    // overlay's own `name`: opened at the first write of the drag (a second
+    // call does nothing), closed at the release or when the overlay goes.
+    void OpenGesture(const char *name);
+    void CloseGesture();
+    // Writes a value to Input `index` at the current time; nothing for a
+    // value that is not a finite number or an index with no Input.
+    bool WriteNumber(float64 value, uint32 index);
+    bool WritePoint(OrbPoint value, uint32 index);
+
     // Takes the grab offset a tool or script gives (PCA_GrabOffsetX/Y).
     void ReadGrabOffset(const TagList &tags);
 
@@ -116,6 +127,7 @@ private:
     bool UpdateFade(const PreviewInfo &info);
 
     HandleSet mHandles;
+    bool mGestureOpen = false;
     bool mFades = false;
     float32 mFade = 1.0f, mDrawnFade = 1.0f; // as last tested, as last drawn
 };

@@ -17,6 +17,7 @@
 #include "framework/PointTags.h"
 #include "framework/RectangleTags.h"
 #include "framework/SliderTags.h"
+#include "framework/TransformTags.h"
 #include "framework/VariantRegistration.h"
 #include "polyline/PolyLineTags.h"
 
@@ -135,7 +136,8 @@ ControlRegistration<SplineControl> gSpline{D::Input("SplineControl")
                                                .Flag(REG_MenuPath, "Controls\\Spline")};
 // The tracker is an overlay whose map carries the inspector's name; kept so.
 ControlRegistration<TrackerControl> gTracker{D::Preview("TrackerControl").MapName("InputControl.Create")};
-ControlRegistration<TransformControl> gTransform{D::Preview("TransformControl").Flag(REG_PreviewFlag65)};
+ControlRegistration<TransformControl> gTransform{
+    D::Preview("TransformControl").Tags<TransformControlTags>().Flag(REG_PreviewFlag65)};
 ControlRegistration<XYOffsetControl> gXYOffset{D::Preview("XYOffsetControl")};
 
 } // namespace
