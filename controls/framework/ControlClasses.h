@@ -9,10 +9,12 @@
 #include "inputcontrols/ScriptValListControl.h"
 #include "inputcontrols/SliderControl.h"
 #include "overlays/AngleControl.h"
+#include "overlays/CropControl.h"
 #include "overlays/CrosshairControl.h"
 #include "overlays/PointControl.h"
 #include "overlays/RectangleControl.h"
 #include "overlays/TransformControl.h"
+#include "overlays/XYOffsetControl.h"
 
 #include "orbane/OverlayControl.h"
 
@@ -41,7 +43,6 @@ ORBANE_PENDING_INPUT(ColorGamutControl);
 ORBANE_PENDING_INPUT(ColorRangesControl);
 ORBANE_PENDING_INPUT(ColorSuppressionControl);
 ORBANE_PENDING_INPUT(ColorWheelControl);
-ORBANE_PENDING_PREVIEW(CropControl);
 ORBANE_PENDING_INPUT(CustomFilterControl);
 ORBANE_PENDING_PREVIEW(EllipseControl);
 ORBANE_PENDING_INPUT(FileControl);
@@ -69,6 +70,5 @@ ORBANE_PENDING_INPUT(ScrewControl);
 ORBANE_PENDING_DERIVED(SliderOverlay, OverlayControl);
 ORBANE_PENDING_INPUT(SplineControl);
 ORBANE_PENDING_PREVIEW(TrackerControl);
-ORBANE_PENDING_PREVIEW(XYOffsetControl);
 
 } // namespace Orbane

@@ -19,6 +19,7 @@
 #include "framework/SliderTags.h"
 #include "framework/TransformTags.h"
 #include "framework/VariantRegistration.h"
+#include "framework/XYOffsetTags.h"
 #include "polyline/PolyLineTags.h"
 
 #include "orbane/ClassIDs.h"
@@ -138,7 +139,7 @@ ControlRegistration<SplineControl> gSpline{D::Input("SplineControl")
 ControlRegistration<TrackerControl> gTracker{D::Preview("TrackerControl").MapName("InputControl.Create")};
 ControlRegistration<TransformControl> gTransform{
     D::Preview("TransformControl").Tags<TransformControlTags>().Flag(REG_PreviewFlag65)};
-ControlRegistration<XYOffsetControl> gXYOffset{D::Preview("XYOffsetControl")};
+ControlRegistration<XYOffsetControl> gXYOffset{D::Preview("XYOffsetControl").Tags<XYOffsetControlTags>()};
 
 } // namespace
 

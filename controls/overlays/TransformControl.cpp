@@ -210,10 +210,7 @@ DragType TransformControl::ControlDown(PreviewInfo *info, const OrbPointI &mouse
         mDragPart = hit.part;
         mAtPress = mShape;
         mMovePivot = hit.part == TPART_Center && HasRole(TR_Pivot) && (KeyModifiers() & Qt::ControlModifier);
-        const Handle *h = nullptr;
-        for (const Handle &each : Handles().Handles())
-            if (each.part == hit.part)
-                h = &each;
+        const Handle *h = Handles().Find(hit.part);
         mGrabOffset = h ? h->at - info->MouseInViewer() : OrbPoint();
         const OrbPoint d = info->MouseInViewer() - info->TransformOut(mShape.center);
         mAngleOffset = AngleGeometry::PressDirection(d) - mShape.angle;

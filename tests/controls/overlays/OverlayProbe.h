@@ -14,6 +14,8 @@
 #include <utility>
 #include <vector>
 
+Q_DECLARE_METATYPE(Orbane::OrbPoint)
+
 namespace Orbane {
 namespace Test {
 

@@ -16,8 +16,6 @@
 using namespace Orbane;
 using namespace Orbane::Test;
 
-Q_DECLARE_METATYPE(Orbane::OrbPoint)
-
 namespace {
 
 constexpr Tag RC_PenStyle = 0x10058000, RCD_SetAngle = 0x20058002, RCD_LockAspect = 0x20058003;
