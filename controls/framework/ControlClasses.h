@@ -12,6 +12,7 @@
 #include "overlays/CropControl.h"
 #include "overlays/CrosshairControl.h"
 #include "overlays/PointControl.h"
+#include "overlays/PositionerControl.h"
 #include "overlays/RectangleControl.h"
 #include "overlays/TransformControl.h"
 #include "overlays/XYOffsetControl.h"
@@ -64,7 +65,6 @@ ORBANE_PENDING_PREVIEW(ObloidControl);
 ORBANE_PENDING_INPUT(OffsetControl);
 ORBANE_PENDING_INPUT(PatternControl);
 ORBANE_PENDING_PREVIEW(PolyLineControl);
-ORBANE_PENDING_PREVIEW(PositionerControl);
 ORBANE_PENDING_INPUT(RangeControl);
 ORBANE_PENDING_INPUT(ScrewControl);
 ORBANE_PENDING_DERIVED(SliderOverlay, OverlayControl);

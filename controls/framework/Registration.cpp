@@ -15,6 +15,7 @@
 #include "framework/FFICasts.h"
 #include "framework/ListTags.h"
 #include "framework/PointTags.h"
+#include "framework/PositionerTags.h"
 #include "framework/RectangleTags.h"
 #include "framework/SliderTags.h"
 #include "framework/TransformTags.h"
@@ -117,7 +118,7 @@ ControlRegistration<PatternControl> gPattern{D::Input("PatternControl")};
 ControlRegistration<PointControl> gPoint{D::Preview("PointControl").Tags<PointControlTags>()};
 ControlRegistration<PolyLineControl> gPolyLine{
     D::Preview("PolyLineControl", "PolylineControl").Script("PolylineControl").Tags<PolyLineControlTags>()};
-ControlRegistration<PositionerControl> gPositioner{D::Preview("PositionerControl")};
+ControlRegistration<PositionerControl> gPositioner{D::Preview("PositionerControl").Tags<PositionerControlTags>()};
 ControlRegistration<RangeControl> gRange{D::Input("RangeControl")};
 ControlRegistration<RectangleControl> gRectangle{D::Preview("RectangleControl").Tags<RectangleControlTags>()};
 ControlRegistration<ScrewControl> gScrew{D::Input("ScrewControl")};
