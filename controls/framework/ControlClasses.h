@@ -10,6 +10,7 @@
 #include "inputcontrols/SliderControl.h"
 #include "overlays/AngleControl.h"
 #include "overlays/CropControl.h"
+#include "overlays/ImgOverlayControl.h"
 #include "overlays/CrosshairControl.h"
 #include "overlays/PointControl.h"
 #include "overlays/PositionerControl.h"
@@ -52,7 +53,6 @@ ORBANE_PENDING_INPUT(GammaControl);
 ORBANE_PENDING_INPUT(GradientControl);
 ORBANE_PENDING_INPUT(HistogramControl);
 ORBANE_PENDING_INPUT(ImageControl);
-ORBANE_PENDING_PREVIEW(ImgOverlayControl);
 ORBANE_PENDING_INPUT(LabelControl);
 ORBANE_PENDING_INPUT(LevelsControl);
 ORBANE_PENDING_INPUT(LevelsOutputControl);

@@ -13,6 +13,7 @@
 #include "framework/ControlRegistration.h"
 #include "framework/CrosshairTags.h"
 #include "framework/FFICasts.h"
+#include "framework/ImgOverlayTags.h"
 #include "framework/ListTags.h"
 #include "framework/PointTags.h"
 #include "framework/PositionerTags.h"
@@ -95,8 +96,10 @@ ControlRegistration<GammaControl> gGamma{D::Input("GammaControl")};
 ControlRegistration<GradientControl> gGradient{D::Input("GradientControl")};
 ControlRegistration<HistogramControl> gHistogram{D::Input("HistogramControl")};
 ControlRegistration<ImageControl> gImage{D::Input("ImageControl")};
-ControlRegistration<ImgOverlayControl> gImgOverlay{
-    D::Preview("ImgOverlayControl").Script("ImageOverlayControl").Flag(REG_PreviewFlag64)};
+ControlRegistration<ImgOverlayControl> gImgOverlay{D::Preview("ImgOverlayControl")
+                                                       .Script("ImageOverlayControl")
+                                                       .Tags<ImgOverlayControlTags>()
+                                                       .Flag(REG_PreviewFlag64)};
 ControlRegistration<LabelControl> gLabel{LabelDesc()};
 VariantRegistration<LabelControl> gLabelNest{LabelDesc().Variant(CLSID_InputControl_Nest)};
 VariantRegistration<LabelControl> gLabelSeparator{LabelDesc().Variant(CLSID_InputControl_Separator)};

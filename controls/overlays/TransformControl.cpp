@@ -362,7 +362,7 @@ void TransformControl::DrawTransform(GPainter &p, const PreviewInfo &info) const
 void TransformControl::DrawFrame(GPainter &p, const PreviewInfo &info, const TransformFrame &frame) const
 {
     const OrbPoint corners[4] = {{0, 0}, {1, 0}, {1, 1}, {0, 1}};
-    p.Color(info.GetColor(OrbColor()), info.GetShadow(OrbColor()));
+    p.Color(info.GetColor(mFrameColor), info.GetShadow(mFrameColor));
     p.Begin(Graphics::GP_LineLoop);
     for (const OrbPoint c : corners) {
         const OrbPoint at = info.TransformOut(frame.ToImage(c));

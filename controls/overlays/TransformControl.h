@@ -71,6 +71,11 @@ protected:
     virtual TransformFrame FrameIn(const PreviewInfo &info, const TransformShape &shape) const;
     // Draws the frame and the handles; derived overlays add theirs.
     virtual void DrawTransform(Graphics::GPainter &p, const PreviewInfo &info) const;
+    // The frame's outline, in the frame colour.
+    virtual void DrawFrame(Graphics::GPainter &p, const PreviewInfo &info, const TransformFrame &frame) const;
+
+    // The frame's colour; "no colour" draws it in the overlay colour.
+    OrbColor mFrameColor;
 
 private:
     void ReadInputs();
@@ -81,7 +86,6 @@ private:
     void DragScale(const PreviewInfo &info);
     void DragShear(const PreviewInfo &info);
     void WriteRole(Role role, float64 value);
-    void DrawFrame(Graphics::GPainter &p, const PreviewInfo &info, const TransformFrame &frame) const;
     void DrawKnob(Graphics::GPainter &p, const PreviewInfo &info, OrbPoint at, uint32 part) const;
     void DrawRing(Graphics::GPainter &p, const PreviewInfo &info, OrbPoint at) const;
 
