@@ -9,5 +9,7 @@ return {
     { file = "tools/Sliders.lua", name = "Sliders1" },
     { file = "tools/Choices.lua", name = "Choices1" },
     { file = "tools/Transform.lua", name = "Transform1" },
+    { file = "tools/Layers.lua", name = "Layers1" },
+    { file = "tools/Framing.lua", name = "Framing1" },
   },
 }

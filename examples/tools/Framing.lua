@@ -1,0 +1,30 @@
+-- Framing the demo image: a crop box (drag its edges, corners or inside;
+-- Shift or Keep Aspect holds its shape) darkens what it leaves out, and a
+-- picture-in-picture inset laid over it in a transform's frame, with its
+-- own handles, opacity and label. The crop takes its Inputs in order:
+-- Corner (0, the lower-left corner), Size (1) and Keep Aspect (2).
+local MaxScale = 0x20030003
+return {
+  type = "Framing",
+  inputs = {
+    { id = "Corner", name = "Corner", type = "Point", default = { 0.08, 0.1 },
+      control = "OffsetControl", overlay = "CropControl",
+      overlayInputs = { "Size", "KeepAspect" } },
+    { id = "Size", name = "Size", type = "Point", default = { 0.84, 0.8 },
+      control = "OffsetControl" },
+    { id = "KeepAspect", name = "Keep Aspect", type = "Number", default = 0,
+      control = "CheckboxControl" },
+    { id = "InsetCenter", name = "Inset Center", type = "Point", default = { 0.74, 0.7 },
+      control = "OffsetControl", overlay = "ImgOverlayControl",
+      overlayInputs = { "InsetSize" },
+      tags = { IO_AngleInput = -1, IO_XSizeInput = 1, IO_YSizeInput = -1, IO_PivotInput = -1,
+               IO_ShearInput = -1, IOD_FrameWidth = 0.3, IO_FitImage = true,
+               IOP_Image = "Inset", IOP_Opacity = "InsetOpacity", IOS_Label = "Inset",
+               IO_BorderStyle = 2 } },
+    { id = "InsetSize", name = "Inset Size", type = "Number", default = 1,
+      control = "SliderControl", attrs = { [MaxScale] = 2 } },
+    { id = "InsetOpacity", name = "Inset Opacity", type = "Number", default = 0.8,
+      control = "SliderControl" },
+    { id = "Inset", name = "Inset", type = "Image", default = "../images/dusk.png" },
+  },
+}
