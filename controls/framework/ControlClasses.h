@@ -10,6 +10,7 @@
 #include "inputcontrols/SliderControl.h"
 #include "overlays/AngleControl.h"
 #include "overlays/CropControl.h"
+#include "overlays/EllipseControl.h"
 #include "overlays/ImgOverlayControl.h"
 #include "overlays/CrosshairControl.h"
 #include "overlays/PointControl.h"
@@ -46,7 +47,6 @@ ORBANE_PENDING_INPUT(ColorRangesControl);
 ORBANE_PENDING_INPUT(ColorSuppressionControl);
 ORBANE_PENDING_INPUT(ColorWheelControl);
 ORBANE_PENDING_INPUT(CustomFilterControl);
-ORBANE_PENDING_PREVIEW(EllipseControl);
 ORBANE_PENDING_INPUT(FileControl);
 ORBANE_PENDING_INPUT(FontfileControl);
 ORBANE_PENDING_INPUT(GammaControl);

@@ -12,6 +12,7 @@
 #include "framework/ControlClasses.h"
 #include "framework/ControlRegistration.h"
 #include "framework/CrosshairTags.h"
+#include "framework/EllipseTags.h"
 #include "framework/FFICasts.h"
 #include "framework/ImgOverlayTags.h"
 #include "framework/ListTags.h"
@@ -88,7 +89,8 @@ VariantRegistration<ComboControl> gComboID{ComboDesc().Variant(CLSID_InputContro
 ControlRegistration<CropControl> gCrop{D::Preview("CropControl", CLSID_PreviewControl_Crop).NoScript().NoHook()};
 ControlRegistration<CrosshairControl> gCrosshair{D::Preview("CrosshairControl").Tags<CrosshairControlTags>()};
 ControlRegistration<CustomFilterControl> gCustomFilter{D::Input("CustomFilterControl")};
-ControlRegistration<EllipseControl> gEllipse{D::Preview("EllipseControl").Cleanup(&EllipseControl::RegCleanup)};
+ControlRegistration<EllipseControl> gEllipse{
+    D::Preview("EllipseControl").Tags<EllipseControlTags>().Cleanup(&EllipseControl::RegCleanup)};
 ControlRegistration<FileControl> gFile{D::Input("FileControl")};
 ControlRegistration<FontfileControl> gFontfile{
     D::Input("FontfileControl", "FontFileControl").Script("FontFileControl").Cleanup(&FontfileControl::RegCleanup)};

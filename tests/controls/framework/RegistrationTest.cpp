@@ -264,11 +264,11 @@ TEST(TagMaps, PublishedMapsAreWellFormed)
         ExpectRowsWellFormed(map->Table());
     }
     const std::map<std::string, int> published = {
-        {"AngleControl", 16},     {"ButtonControl", 2},        {"CheckboxControl", 1},      {"ComboControl", 5},
-        {"ComboIDControl", 5},    {"CrosshairControl", 7},     {"ImageOverlayControl", 32}, {"ListControl", 4},
-        {"ListIDControl", 4},     {"PointControl", 4},         {"PolylineControl", 56},     {"PositionerControl", 16},
-        {"RectangleControl", 35}, {"ScriptValListControl", 4}, {"SliderControl", 4},        {"TransformControl", 10},
-        {"XYOffsetControl", 1}};
+        {"AngleControl", 16},      {"ButtonControl", 2},     {"CheckboxControl", 1},      {"ComboControl", 5},
+        {"ComboIDControl", 5},     {"CrosshairControl", 7},  {"EllipseControl", 53},      {"ImageOverlayControl", 32},
+        {"ListControl", 4},        {"ListIDControl", 4},     {"PointControl", 4},         {"PolylineControl", 56},
+        {"PositionerControl", 16}, {"RectangleControl", 35}, {"ScriptValListControl", 4}, {"SliderControl", 4},
+        {"TransformControl", 10},  {"XYOffsetControl", 1}};
     EXPECT_EQ(counts, published);
     const auto table = [](const char *type) { return FFITagMap::ForType(FFIType::FindScriptName(type))->Table(); };
     EXPECT_EQ(table("ComboIDControl"), table("ComboControl")) << "variants share their primary's table";
