@@ -18,6 +18,8 @@ const std::vector<Goal> &Goals()
         {"P5", "load the control library and register every class", "BM_ControlLibrary_Load", nullptr, 2.0, ""},
         {"V1", "hover over 100 rectangles and 100 angle dials, one mouse event", "BM_Viewer_HoverShapes/100/100",
          nullptr, 0.5, ""},
+        {"V2", "hover over 100 each of six layer overlays (transform to image), one mouse event",
+         "BM_Viewer_HoverLayers/100", nullptr, 0.5, ""},
     };
     return goals;
 }
