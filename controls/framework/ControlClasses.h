@@ -16,6 +16,7 @@
 #include "overlays/PointControl.h"
 #include "overlays/PositionerControl.h"
 #include "overlays/RectangleControl.h"
+#include "overlays/SliderOverlay.h"
 #include "overlays/TransformControl.h"
 #include "overlays/XYOffsetControl.h"
 
@@ -67,7 +68,6 @@ ORBANE_PENDING_INPUT(PatternControl);
 ORBANE_PENDING_PREVIEW(PolyLineControl);
 ORBANE_PENDING_INPUT(RangeControl);
 ORBANE_PENDING_INPUT(ScrewControl);
-ORBANE_PENDING_DERIVED(SliderOverlay, OverlayControl);
 ORBANE_PENDING_INPUT(SplineControl);
 ORBANE_PENDING_PREVIEW(TrackerControl);
 

@@ -26,13 +26,15 @@ class GPainter;
 //     painter draws each primitive as a shadow pass and then a colour pass.
 // Sizes and tolerances are the viewer's logical pixels: the viewer's pick
 // tolerance and handle scale, which a high-DPI screen does not change.
-class HandleOverlay : public PreviewControl
+// `Base` is the host family the overlay belongs to: PreviewControl for
+// overlays of a tool's Inputs, OverlayControl for the viewer slider.
+template <class Base> class HandleOverlayOn : public Base
 {
 public:
-    using PreviewControl::PreviewControl;
-    ~HandleOverlay() override;
+    using Base::Base;
+    ~HandleOverlayOn() override;
 
-    std::size_t SizeOf() const override { return sizeof(HandleOverlay); }
+    std::size_t SizeOf() const override { return sizeof(HandleOverlayOn); }
     // Supplies the grab offset (PCA_GrabOffsetX, PCA_GrabOffsetY).
     bool CopyAttr(Tag tag, void *out) override;
     void ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
@@ -131,5 +133,7 @@ private:
     bool mFades = false;
     float32 mFade = 1.0f, mDrawnFade = 1.0f; // as last tested, as last drawn
 };
+
+using HandleOverlay = HandleOverlayOn<PreviewControl>;
 
 } // namespace Orbane

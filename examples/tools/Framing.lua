@@ -1,7 +1,8 @@
 -- Framing the demo image: a crop box (drag its edges, corners or inside;
 -- Shift or Keep Aspect holds its shape) darkens what it leaves out, and a
 -- picture-in-picture inset laid over it in a transform's frame, with its
--- own handles, opacity and label. The crop takes its Inputs in order:
+-- own handles, opacity and label; the opacity has a slider in the viewer
+-- too (bottom left: drag the knob, Ctrl finer, or click the track). The crop takes its Inputs in order:
 -- Corner (0, the lower-left corner), Size (1) and Keep Aspect (2).
 local MaxScale = 0x20030003
 return {
@@ -24,7 +25,7 @@ return {
     { id = "InsetSize", name = "Inset Size", type = "Number", default = 1,
       control = "SliderControl", attrs = { [MaxScale] = 2 } },
     { id = "InsetOpacity", name = "Inset Opacity", type = "Number", default = 0.8,
-      control = "SliderControl" },
+      control = "SliderControl", overlay = "SliderOverlay" },
     { id = "Inset", name = "Inset", type = "Image", default = "../images/dusk.png" },
   },
 }
