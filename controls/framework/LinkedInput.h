@@ -1,5 +1,6 @@
 #pragma once
 
+#include "orbane/AutoParam.h"
 #include "orbane/Input.h"
 #include "orbane/PreviewControl.h"
 #include "orbane/TagList.h"
@@ -44,6 +45,33 @@ template <class Owner, std::size_t N> void DetachLinkedInputs(Owner &owner, cons
 {
     for (const LinkedInput<Owner> &row : rows)
         owner.DetachFromInput(owner.*(row.slot));
+}
+
+// Tells the overlay the values of the rows in `mask` (AttachLinkedInputs'
+// answer), so that a newly linked Input shows from the moment it is linked,
+// not only after its next change.
+template <class Owner, std::size_t N>
+void PullLinkedInputs(Owner &owner, const LinkedInput<Owner> (&rows)[N], uint32 mask)
+{
+    for (std::size_t i = 0; i < N; ++i)
+        if (Input *in = owner.*(rows[i].slot); in && (mask & (1u << i))) {
+            const AutoParameter value(in->GetValue(owner.GetCurrentTime()));
+            owner.NotifyChanged(in, value.get(), nullptr);
+        }
+}
+
+// Lets go of `input` in every slot that holds it (one Input may fill
+// several); true where any did.
+template <class Owner, std::size_t N>
+bool DetachLinkedInput(Owner &owner, const LinkedInput<Owner> (&rows)[N], const Input *input)
+{
+    bool held = false;
+    for (const LinkedInput<Owner> &row : rows)
+        if (input && owner.*(row.slot) == input) {
+            owner.DetachFromInput(owner.*(row.slot));
+            held = true;
+        }
+    return held;
 }
 
 // The row whose slot holds `input`, or null (also for a null `input`).

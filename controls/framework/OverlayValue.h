@@ -16,7 +16,16 @@ namespace Orbane {
 class OverlayValue
 {
 public:
+    // Beyond this many viewer units a shape has left every screen; drawing
+    // it would only feed the painter huge numbers.
+    static constexpr float64 FarAway = 1e7;
+
     static bool Finite(OrbPoint p) noexcept { return std::isfinite(p.x) && std::isfinite(p.y); }
+    // A viewer point worth drawing or grabbing: finite and not far away.
+    static bool OnScreen(OrbPoint p) noexcept
+    {
+        return Finite(p) && std::fabs(p.x) < FarAway && std::fabs(p.y) < FarAway;
+    }
 
     // A Number Input's value, where it is a finite number.
     static bool ReadNumber(const Parameter *value, float64 &out)

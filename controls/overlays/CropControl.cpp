@@ -22,17 +22,11 @@ namespace {
 // The knobs' half side in handle pixels; the shade's darkness.
 constexpr float64 kKnob = 4.0;
 constexpr float32 kShade = 0.55f;
-constexpr float64 kFarAway = 1e7;
 constexpr int32 kParts[8] = {1, 2, 4, 8, 3, 6, 12, 9};
 
 OrbPointI SideOf(uint32 part) noexcept
 {
     return {(part & 1) ? 1 : (part & 4) ? -1 : 0, (part & 2) ? 1 : (part & 8) ? -1 : 0};
-}
-
-bool OnScreen(OrbPoint p)
-{
-    return OV::Finite(p) && std::fabs(p.x) < kFarAway && std::fabs(p.y) < kFarAway;
 }
 
 // Image units to image pixels, axis by axis.
@@ -113,7 +107,7 @@ void CropControl::BuildHandles(const PreviewInfo &info, HandleSet &handles) cons
 {
     handles.Clear();
     const OrbPoint lo = info.TransformOut(Low()), hi = info.TransformOut(High());
-    if (!OnScreen(lo) || !OnScreen(hi))
+    if (!OV::OnScreen(lo) || !OV::OnScreen(hi))
         return;
     const OrbPoint at = (lo + hi) / 2.0, half = (hi - lo) / 2.0;
     const float64 t = info.PickTolerance;
@@ -207,7 +201,7 @@ void CropControl::DrawControls(PreviewInfo *info, const TagList *tags)
 {
     GPainter *p = info->GetPainter();
     const OrbPoint lo = info->TransformOut(Low()), hi = info->TransformOut(High());
-    if (p && info->DrawPass != 3 && OnScreen(lo) && OnScreen(hi)) {
+    if (p && info->DrawPass != 3 && OV::OnScreen(lo) && OV::OnScreen(hi)) {
         p->PushAttrib();
         DrawShade(*p, *info, lo, hi);
         DrawBox(*p, *info, lo, hi);

@@ -25,7 +25,6 @@ using OV = OverlayValue;
 
 namespace {
 
-constexpr float64 kFarAway = 1e7;
 constexpr int32 kMaxSegments = 1024;
 constexpr Tag kRoleTags[EllipseControl::ER_Count] = {EC_RadiusXInput, EC_RadiusYInput, EC_AngleInput, EC_SoftInput};
 constexpr Tag kSetTags[EllipseControl::ER_Count] = {ECD_SetRadiusX, ECD_SetRadiusY, ECD_SetAngle, ECD_SetSoft};
@@ -46,11 +45,6 @@ const std::vector<OrbPoint> &UnitCircle(int32 segments)
             gCircle->emplace_back(std::cos(2 * M_PI * i / segments), std::sin(2 * M_PI * i / segments));
     }
     return *gCircle;
-}
-
-bool OnScreen(OrbPoint p)
-{
-    return OV::Finite(p) && std::fabs(p.x) < kFarAway && std::fabs(p.y) < kFarAway;
 }
 
 void SetPen(GPainter &p, int32 style, float64 width)
@@ -166,12 +160,7 @@ bool EllipseControl::SetAttrsTagList(Input *input, const TagList &tags)
 {
     const uint32 linked = AttachLinkedInputs(*this, Links, GetOperator(nullptr), tags);
     ReadAttrs(tags);
-    for (std::size_t i = 0; i < std::size(Links); ++i)
-        if (linked & (1u << i)) {
-            Input *in = this->*(Links[i].slot);
-            const AutoParameter value(in->GetValue(GetCurrentTime()));
-            StoreLinked(in, value.get());
-        }
+    PullLinkedInputs(*this, Links, linked);
     // A role that moved to another Input shows that Input's value.
     bool moved = false;
     for (std::size_t i = 0; i < Inputs().size(); ++i) {
@@ -219,12 +208,8 @@ bool EllipseControl::AddInput(Input *input, const TagList *tags)
 
 bool EllipseControl::RemoveInput(Input *input, const TagList *tags)
 {
-    bool wasLinked = false;
-    while (const LinkedInput<EllipseControl> *row = FindLinkedInput(*this, Links, input)) {
-        DetachFromInput(this->*(row->slot));
-        wasLinked = true;
-    }
-    return HandleOverlay::RemoveInput(input, tags) || wasLinked;
+    const bool linked = DetachLinkedInput(*this, Links, input);
+    return HandleOverlay::RemoveInput(input, tags) || linked;
 }
 
 bool EllipseControl::HasRole(Role role) const
@@ -321,12 +306,12 @@ void EllipseControl::BuildHandles(const PreviewInfo &info, HandleSet &handles) c
     handles.Clear();
     const Shape s = Drawn();
     const float64 yPerX = info.AspectScaleYOut(1.0);
-    if (!mVisible || mLocked || !OnScreen(info.TransformOut(s.center)) || !OV::Finite(s.radius))
+    if (!mVisible || mLocked || !OV::OnScreen(info.TransformOut(s.center)) || !OV::Finite(s.radius))
         return;
     const OrbPoint knob(mKnobSize, mKnobSize);
     auto add = [&](OrbPoint local, uint32 part, int32 priority) {
         const OrbPoint at = info.TransformOut(ToImage(s, local, yPerX));
-        if (OnScreen(at))
+        if (OV::OnScreen(at))
             handles.AddBox(at, knob * -1.0, knob, part, priority);
     };
     if (mShowCenter)
@@ -522,7 +507,7 @@ std::vector<OrbPoint> EllipseControl::Outline(const Shape &shape, float64 grow, 
     const OrbPoint r(std::max(std::fabs(shape.radius.x) + grow, 0.0), std::max(std::fabs(shape.radius.y) + grow, 0.0));
     for (const OrbPoint c : UnitCircle(mSegments)) {
         const OrbPoint at = info.TransformOut(ToImage(shape, OrbPoint(c.x * r.x, c.y * r.y), yPerX));
-        if (!OnScreen(at))
+        if (!OV::OnScreen(at))
             return {};
         points.push_back(at);
     }
@@ -541,7 +526,7 @@ void EllipseControl::DrawControls(PreviewInfo *info, const TagList *tags)
 {
     GPainter *p = info->GetPainter();
     const Shape s = Drawn();
-    if (p && info->DrawPass != 3 && mVisible && OnScreen(info->TransformOut(s.center)) && OV::Finite(s.radius) &&
+    if (p && info->DrawPass != 3 && mVisible && OV::OnScreen(info->TransformOut(s.center)) && OV::Finite(s.radius) &&
         std::isfinite(s.angle)) {
         p->PushAttrib();
         DrawLook(*p, *info, s);
@@ -610,7 +595,7 @@ void EllipseControl::DrawKnobs(GPainter &p, const PreviewInfo &info, const Shape
     }
     if (!mLabel.empty()) {
         const OrbPoint at = info.TransformOut(ToImage(s, {std::fabs(s.radius.x), 0.0}, info.AspectScaleYOut(1.0)));
-        if (OnScreen(at)) {
+        if (OV::OnScreen(at)) {
             p.Color(info.GetColor(mColor), info.GetShadow(mColor));
             p.Text(at.x + 8, at.y + 8, mLabel.c_str());
         }

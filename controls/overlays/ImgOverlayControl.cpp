@@ -23,12 +23,6 @@ using OV = OverlayValue;
 namespace {
 
 constexpr Tag kCropTags[4] = {IOD_CropLeft, IOD_CropBottom, IOD_CropRight, IOD_CropTop};
-constexpr float64 kFarAway = 1e7;
-
-bool OnScreen(OrbPoint p)
-{
-    return OV::Finite(p) && std::fabs(p.x) < kFarAway && std::fabs(p.y) < kFarAway;
-}
 
 } // namespace
 
@@ -83,12 +77,7 @@ bool ImgOverlayControl::SetAttrsTagList(Input *input, const TagList &tags)
 {
     const uint32 linked = AttachLinkedInputs(*this, Links, GetOperator(nullptr), tags);
     ReadLook(tags);
-    for (std::size_t i = 0; i < std::size(Links); ++i)
-        if (linked & (1u << i)) {
-            Input *in = this->*(Links[i].slot);
-            const AutoParameter value(in->GetValue(GetCurrentTime()));
-            NotifyChanged(in, value.get(), nullptr);
-        }
+    PullLinkedInputs(*this, Links, linked);
     return TransformControl::SetAttrsTagList(input, tags);
 }
 
@@ -119,14 +108,10 @@ void ImgOverlayControl::ReadLook(const TagList &tags)
 
 bool ImgOverlayControl::RemoveInput(Input *input, const TagList *tags)
 {
-    bool wasLinked = false;
-    while (const LinkedInput<ImgOverlayControl> *row = FindLinkedInput(*this, Links, input)) {
-        if (row->slot == &ImgOverlayControl::mImageInput)
-            mImage = QImage();
-        DetachFromInput(this->*(row->slot));
-        wasLinked = true;
-    }
-    return TransformControl::RemoveInput(input, tags) || wasLinked;
+    if (input && input == mImageInput)
+        mImage = QImage();
+    const bool linked = DetachLinkedInput(*this, Links, input);
+    return TransformControl::RemoveInput(input, tags) || linked;
 }
 
 void ImgOverlayControl::NotifyChanged(Input *input, Parameter *value, const TagList *tags)
@@ -184,7 +169,7 @@ void ImgOverlayControl::DrawTransform(GPainter &p, const PreviewInfo &info) cons
         TransformControl::DrawTransform(p, info);
     if (!mLabel.empty() && frame.IsValid()) {
         const OrbPoint corner = info.TransformOut(frame.ToImage(OrbPoint(0.0, 1.0)));
-        if (OnScreen(corner)) {
+        if (OV::OnScreen(corner)) {
             p.Color(info.GetColor(mFrameColor), info.GetShadow(mFrameColor));
             p.Text(corner.x + 4, corner.y + 4, mLabel.c_str());
         }
@@ -219,7 +204,7 @@ void ImgOverlayControl::DrawImage(GPainter &p, const PreviewInfo &info, const Tr
     float64 corners[8];
     for (int i = 0; i < 4; ++i) {
         const OrbPoint v = info.TransformOut(frame.ToImage(at[i]));
-        if (!OnScreen(v))
+        if (!OV::OnScreen(v))
             return;
         corners[2 * i] = v.x;
         corners[2 * i + 1] = v.y;

@@ -20,12 +20,6 @@ using OV = OverlayValue;
 namespace {
 
 constexpr float64 kCenterDisc = 6.0; // handle pixels
-constexpr float64 kFarAway = 1e7;
-
-bool OnScreen(OrbPoint p)
-{
-    return OV::Finite(p) && std::fabs(p.x) < kFarAway && std::fabs(p.y) < kFarAway;
-}
 
 } // namespace
 
@@ -90,24 +84,15 @@ bool PositionerControl::SetAttrsTagList(Input *input, const TagList &tags)
         if (!from && std::isfinite(to))
             *field = to;
     }
-    for (std::size_t i = 0; i < std::size(Links); ++i)
-        if (linked & (1u << i)) {
-            Input *in = this->*(Links[i].slot);
-            const AutoParameter value(in->GetValue(GetCurrentTime()));
-            NotifyChanged(in, value.get(), nullptr);
-        }
+    PullLinkedInputs(*this, Links, linked);
     UpdateDisplay(nullptr, nullptr);
     return HandleOverlay::SetAttrsTagList(input, tags);
 }
 
 bool PositionerControl::RemoveInput(Input *input, const TagList *tags)
 {
-    bool wasLinked = false;
-    while (const LinkedInput<PositionerControl> *row = FindLinkedInput(*this, Links, input)) {
-        DetachFromInput(this->*(row->slot));
-        wasLinked = true;
-    }
-    return HandleOverlay::RemoveInput(input, tags) || wasLinked;
+    const bool linked = DetachLinkedInput(*this, Links, input);
+    return HandleOverlay::RemoveInput(input, tags) || linked;
 }
 
 void PositionerControl::NotifyChanged(Input *input, Parameter *value, const TagList *tags)
@@ -147,11 +132,11 @@ void PositionerControl::BuildHandles(const PreviewInfo &info, HandleSet &handles
 {
     handles.Clear();
     const OrbPoint at = info.TransformOut(mPosition);
-    if (!OnScreen(at))
+    if (!OV::OnScreen(at))
         return;
     handles.AddDisc(at, kCenterDisc, PPART_Center, HP_Point);
     const Box box = BoxIn(info);
-    if (mShowBox && OnScreen(box.middle) && OnScreen(box.half))
+    if (mShowBox && OV::OnScreen(box.middle) && OV::OnScreen(box.half))
         handles.AddBoxPart(box.middle, box.unitX, box.half, 0.0, {0, 0}, PPART_Box, HP_Body);
 }
 
@@ -206,10 +191,10 @@ void PositionerControl::DrawControls(PreviewInfo *info, const TagList *tags)
 {
     GPainter *p = info->GetPainter();
     const OrbPoint at = info->TransformOut(mPosition);
-    if (p && info->DrawPass != 3 && OnScreen(at)) {
+    if (p && info->DrawPass != 3 && OV::OnScreen(at)) {
         p->PushAttrib();
         const Box box = BoxIn(*info);
-        if (mShowBox && OnScreen(box.middle) && OnScreen(box.half))
+        if (mShowBox && OV::OnScreen(box.middle) && OV::OnScreen(box.half))
             DrawBox(*p, *info, box);
         BeginHandle(*p, *info, at, PPART_Center);
         p->Begin(Graphics::GP_Lines);

@@ -28,9 +28,6 @@ namespace {
 constexpr float64 kScaleEpsilon = 1.1920928955078125e-07;
 // A size this small would blow a written width up: it counts as 1.
 constexpr float64 kMinSize = 1e-5;
-// Beyond this many viewer units an outline has left every screen; drawing
-// it would only feed the painter huge numbers.
-constexpr float64 kFarAway = 1e7;
 // Corner strips reach this fraction of the smaller half side along each edge.
 constexpr float64 kCornerStrip = 0.25;
 
@@ -120,13 +117,7 @@ bool RectangleControl::SetAttrsTagList(Input *input, const TagList &tags)
         mShownBlendAmount = mBlendAmount;
         UpdateDisplay(nullptr, nullptr);
     }
-    // Linked Inputs show their values from the moment they are linked.
-    for (std::size_t i = 0; i < std::size(Links); ++i)
-        if (linked & (1u << i)) {
-            Input *in = this->*(Links[i].slot);
-            const AutoParameter value(in->GetValue(GetCurrentTime()));
-            NotifyChanged(in, value.get(), nullptr);
-        }
+    PullLinkedInputs(*this, Links, linked);
     return HandleOverlay::SetAttrsTagList(input, tags);
 }
 
@@ -439,8 +430,8 @@ void RectangleControl::DrawControls(PreviewInfo *info, const TagList *tags)
             p->Enable(Graphics::GC_LineStipple);
         }
         const OrbPoint corner = info->TransformOut(frame.At(1.0, 1.0)) - info->TransformOut(frame.At(-1.0, -1.0));
-        if (frame.IsValid() && OV::Finite(corner) && std::fabs(corner.x) + std::fabs(corner.y) < kFarAway &&
-            info->TransformOut(frame.ToImage(frame.Middle())).Length() < kFarAway) {
+        if (frame.IsValid() && OV::Finite(corner) && std::fabs(corner.x) + std::fabs(corner.y) < OV::FarAway &&
+            info->TransformOut(frame.ToImage(frame.Middle())).Length() < OV::FarAway) {
             if (mImageInput && !mImage.isNull())
                 DrawImage(*p, *info, frame);
             DrawOutline(*p, *info, frame);

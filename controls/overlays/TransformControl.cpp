@@ -25,8 +25,6 @@ namespace {
 constexpr float64 kKnob = 4.0;
 constexpr float64 kCenterDisc = 6.0;
 constexpr float64 kShearBar = 30.0;
-// Beyond this many viewer units a frame has left every screen.
-constexpr float64 kFarAway = 1e7;
 
 constexpr Tag kRoleTags[TransformControl::TR_Count] = {TC_AngleInput, TC_XSizeInput, TC_YSizeInput, TC_PivotInput,
                                                        TC_ShearInput};
@@ -44,11 +42,6 @@ OrbPoint LayerPoint(OrbPointI side) noexcept
 }
 
 constexpr int32 kSideCodes[8] = {1, 2, 4, 8, 3, 6, 12, 9};
-
-bool OnScreen(OrbPoint p)
-{
-    return OV::Finite(p) && std::fabs(p.x) < kFarAway && std::fabs(p.y) < kFarAway;
-}
 
 } // namespace
 
@@ -180,7 +173,7 @@ void TransformControl::BuildHandles(const PreviewInfo &info, HandleSet &handles)
     handles.Clear();
     const TransformFrame frame = FrameIn(info, mShape);
     const OrbPoint center = info.TransformOut(mShape.center);
-    if (!frame.IsValid() || !OnScreen(center))
+    if (!frame.IsValid() || !OV::OnScreen(center))
         return;
     handles.AddDisc(center, kCenterDisc, TPART_Center, HP_Point);
     if (HasRole(TR_Angle))
@@ -189,13 +182,13 @@ void TransformControl::BuildHandles(const PreviewInfo &info, HandleSet &handles)
         for (const int32 code : kSideCodes) {
             const OrbPointI side = SideOf(code);
             const OrbPoint at = info.TransformOut(frame.ToImage(LayerPoint(side)));
-            if (OnScreen(at))
+            if (OV::OnScreen(at))
                 handles.AddBox(at, {-kKnob, -kKnob}, {kKnob, kKnob}, SidePart(code),
                                side.x && side.y ? HP_Corner : HP_Edge);
         }
     if (HasRole(TR_Shear)) {
         const OrbPoint knob = info.TransformOut(frame.ShearKnob(kShearBar * info.HandleScale / info.Mapping().SpanX()));
-        if (OnScreen(knob))
+        if (OV::OnScreen(knob))
             handles.AddBox(knob, {-kKnob, -kKnob}, {kKnob, kKnob}, TPART_Shear, HP_Corner);
     }
 }
@@ -335,7 +328,7 @@ void TransformControl::DrawTransform(GPainter &p, const PreviewInfo &info) const
 {
     const TransformFrame frame = FrameIn(info, mShape);
     const OrbPoint center = info.TransformOut(mShape.center);
-    if (!frame.IsValid() || !OnScreen(center))
+    if (!frame.IsValid() || !OV::OnScreen(center))
         return;
     if (mShowFrame)
         DrawFrame(p, info, frame);
@@ -349,7 +342,7 @@ void TransformControl::DrawTransform(GPainter &p, const PreviewInfo &info) const
     if (HasRole(TR_Shear)) {
         const OrbPoint top = info.TransformOut(frame.ToImage(OrbPoint(0.5, 1.0)));
         const OrbPoint knob = info.TransformOut(frame.ShearKnob(kShearBar * info.HandleScale / info.Mapping().SpanX()));
-        if (OnScreen(top) && OnScreen(knob)) {
+        if (OV::OnScreen(top) && OV::OnScreen(knob)) {
             p.Color(HandleFill(info, TPART_Shear), HandleShadow(info));
             p.Begin(Graphics::GP_Lines);
             p.Vertex(top.x, top.y);
@@ -366,7 +359,7 @@ void TransformControl::DrawFrame(GPainter &p, const PreviewInfo &info, const Tra
     p.Begin(Graphics::GP_LineLoop);
     for (const OrbPoint c : corners) {
         const OrbPoint at = info.TransformOut(frame.ToImage(c));
-        if (OnScreen(at))
+        if (OV::OnScreen(at))
             p.Vertex(at.x, at.y);
     }
     p.End();

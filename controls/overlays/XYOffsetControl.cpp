@@ -21,12 +21,6 @@ namespace {
 // The tip's disc and the arrowhead's barbs, in handle pixels.
 constexpr float64 kTipDisc = 5.0;
 constexpr float64 kBarb = 10.0;
-constexpr float64 kFarAway = 1e7;
-
-bool OnScreen(OrbPoint p)
-{
-    return OV::Finite(p) && std::fabs(p.x) < kFarAway && std::fabs(p.y) < kFarAway;
-}
 
 } // namespace
 
@@ -58,18 +52,13 @@ void XYOffsetControl::GetState(ScriptVal &state) const
 
 bool XYOffsetControl::SetAttrsTagList(Input *input, const TagList &tags)
 {
-    if (AttachLinkedInputs(*this, Links, GetOperator(nullptr), tags)) {
-        const AutoParameter value(mCenterInput->GetValue(GetCurrentTime()));
-        NotifyChanged(mCenterInput, value.get(), nullptr);
-    }
+    PullLinkedInputs(*this, Links, AttachLinkedInputs(*this, Links, GetOperator(nullptr), tags));
     return HandleOverlay::SetAttrsTagList(input, tags);
 }
 
 bool XYOffsetControl::RemoveInput(Input *input, const TagList *tags)
 {
-    const bool linked = input && input == mCenterInput;
-    if (linked)
-        DetachFromInput(mCenterInput);
+    const bool linked = DetachLinkedInput(*this, Links, input);
     return HandleOverlay::RemoveInput(input, tags) || linked;
 }
 
@@ -90,7 +79,7 @@ void XYOffsetControl::BuildHandles(const PreviewInfo &info, HandleSet &handles) 
 {
     handles.Clear();
     const OrbPoint tip = info.TransformOut(Tip());
-    if (OnScreen(tip))
+    if (OV::OnScreen(tip))
         handles.AddDisc(tip, kTipDisc, 1);
 }
 
@@ -146,7 +135,7 @@ void XYOffsetControl::DrawControls(PreviewInfo *info, const TagList *tags)
 void XYOffsetControl::DrawArrow(GPainter &p, const PreviewInfo &info) const
 {
     const OrbPoint from = info.TransformOut(mCenter), to = info.TransformOut(Tip());
-    if (!OnScreen(from) || !OnScreen(to))
+    if (!OV::OnScreen(from) || !OV::OnScreen(to))
         return;
     p.Color(info.GetColor(OrbColor()), info.GetShadow(OrbColor()));
     p.Begin(Graphics::GP_Lines);

@@ -179,13 +179,7 @@ void CropControlTest::badInput()
     ViewerFixture f;
     AddCrop(f, corner, size, 1.0);
     QVERIFY(f.Show());
-    f.Grab();
-    for (int x = 30; x < ViewerFixture::kViewWidth; x += 40)
-        for (int y = 20; y < ViewerFixture::kViewHeight; y += 40) {
-            f.Hover(QPoint(x, y));
-            f.Drag(QPoint(x, y), QPoint(x + 23, y - 17), 2);
-        }
-    f.Grab();
+    SweepDrags(f);
     if (f.UndoSteps() > 0) {
         const Box now = Read(f);
         QVERIFY2(std::isfinite(now.l) && std::isfinite(now.b) && std::isfinite(now.r) && std::isfinite(now.t),

@@ -334,13 +334,7 @@ void EllipseControlTest::badInput()
     v.angle = angle;
     AddEllipse(f, v);
     QVERIFY(f.Show());
-    f.Grab();
-    for (int x = 30; x < ViewerFixture::kViewWidth; x += 40)
-        for (int y = 20; y < ViewerFixture::kViewHeight; y += 40) {
-            f.Hover(QPoint(x, y));
-            f.Drag(QPoint(x, y), QPoint(x + 23, y - 17), 2);
-        }
-    f.Grab();
+    SweepDrags(f);
     const Values now = Read(f);
     const double was[] = {v.center.x, v.center.y, v.rx, v.ry, v.angle, v.soft};
     const double got[] = {now.center.x, now.center.y, now.rx, now.ry, now.angle, now.soft};

@@ -88,6 +88,20 @@ inline double NumberOf(const ViewerFixture &f, const char *id)
     return n ? n->Value : -1000.0;
 }
 
+// Hovers and drags a little from every point of a grid over the whole
+// viewer, drawing before and after: a hand that tries everything, for
+// shapes that must never crash.
+inline void SweepDrags(ViewerFixture &f)
+{
+    f.Grab();
+    for (int x = 30; x < ViewerFixture::kViewWidth; x += 40)
+        for (int y = 20; y < ViewerFixture::kViewHeight; y += 40) {
+            f.Hover(QPoint(x, y));
+            f.Drag(QPoint(x, y), QPoint(x + 23, y - 17), 2);
+        }
+    f.Grab();
+}
+
 // Arrow-key nudges and how far they move a point, in image pixels.
 inline void NudgeRows()
 {
