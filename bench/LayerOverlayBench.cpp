@@ -4,6 +4,7 @@
 // the overlays whose hover bounds hold the mouse. The goal: under 0.5 ms
 // per mouse event.
 #include "BenchModule.h"
+#include "ViewerHover.h"
 
 #include "orbane/AutoParam.h"
 #include "orbane/ClassIDs.h"
@@ -14,8 +15,6 @@
 
 #include <benchmark/benchmark.h>
 
-#include <QApplication>
-#include <QMouseEvent>
 
 #include <string>
 #include <vector>
@@ -43,13 +42,7 @@ struct LayerRig
         tool->DecRef();
         for (int i = 0; i < each; ++i)
             AddSet(i);
-        QImage image(ImageWidth, ImageHeight, QImage::Format_ARGB32_Premultiplied);
-        image.fill(QColor(40, 60, 90));
-        viewer.SetImage(image);
-        viewer.resize(Width, Height);
-        viewer.ShowTool(tool);
-        viewer.show();
-        QApplication::processEvents();
+        ViewerHover::Show(viewer, tool, ImageWidth, ImageHeight, Width, Height);
     }
 
     Input *Number(const std::string &id, double value)
@@ -108,34 +101,12 @@ struct LayerRig
     ViewerPanel viewer;
 };
 
-std::vector<QPointF> Path()
-{
-    std::vector<QPointF> path;
-    for (int i = 0; i < 256; ++i)
-        path.emplace_back(40 + (i * 37) % (Width - 80), 30 + (i * 53) % (Height - 60));
-    return path;
-}
-
 void BM_Viewer_HoverLayers(benchmark::State &state)
 {
     if (!LoadControlModule())
         return state.SkipWithError("the control library did not load");
     LayerRig rig(int(state.range(0)));
-    const std::vector<QPointF> path = Path();
-    std::size_t i = 0;
-    for (auto _ : state) {
-        const QPointF at = path[i++ % path.size()];
-        QMouseEvent event(QEvent::MouseMove, at, rig.viewer.mapToGlobal(at.toPoint()), Qt::NoButton, Qt::NoButton,
-                          Qt::NoModifier);
-        QApplication::sendEvent(&rig.viewer, &event);
-        benchmark::DoNotOptimize(rig.viewer.HoverControl());
-        if (i % 64 == 0) {
-            state.PauseTiming();
-            QApplication::processEvents();
-            state.ResumeTiming();
-        }
-    }
-    state.SetItemsProcessed(state.iterations());
+    ViewerHover::Run(state, rig.viewer, ViewerHover::Path(Width, Height));
 }
 
 // Argument: overlays of each class.
