@@ -16,7 +16,6 @@
 
 #include <benchmark/benchmark.h>
 
-#include <QApplication>
 
 #include <algorithm>
 #include <cmath>

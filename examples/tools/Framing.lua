@@ -2,7 +2,10 @@
 -- Shift or Keep Aspect holds its shape) darkens what it leaves out, and a
 -- picture-in-picture inset laid over it in a transform's frame, with its
 -- own handles, opacity and label; the opacity has a slider in the viewer
--- too (bottom left: drag the knob, Ctrl finer, or click the track). The crop takes its Inputs in order:
+-- too (bottom left: drag the knob, Ctrl finer, or click the track). The
+-- Glow ellipse sits on the sun: its axis knobs resize it (Shift both, Ctrl
+-- about the opposite knob), the diamond beyond +X turns it and the knob off
+-- its top edge widens the soft edge between its dotted ellipses. The crop takes its Inputs in order:
 -- Corner (0, the lower-left corner), Size (1) and Keep Aspect (2).
 local MaxScale = 0x20030003
 return {
@@ -27,5 +30,17 @@ return {
     { id = "InsetOpacity", name = "Inset Opacity", type = "Number", default = 0.8,
       control = "SliderControl", overlay = "SliderOverlay" },
     { id = "Inset", name = "Inset", type = "Image", default = "../images/dusk.png" },
+    { id = "Glow", name = "Glow", type = "Point", default = { 0.655, 0.43 },
+      control = "OffsetControl", overlay = "EllipseControl",
+      overlayInputs = { "GlowWidth", "GlowHeight", "GlowAngle", "GlowSoftness" },
+      tags = { EC_ShowAxes = true, ECS_Label = "Glow" } },
+    { id = "GlowWidth", name = "Glow Width", type = "Number", default = 0.12,
+      control = "SliderControl" },
+    { id = "GlowHeight", name = "Glow Height", type = "Number", default = 0.08,
+      control = "SliderControl" },
+    { id = "GlowAngle", name = "Glow Angle", type = "Number", default = 20,
+      control = "SliderControl", attrs = { [0x20030002] = -180, [MaxScale] = 180 } },
+    { id = "GlowSoftness", name = "Glow Softness", type = "Number", default = 0.04,
+      control = "SliderControl", attrs = { [MaxScale] = 0.2 } },
   },
 }
