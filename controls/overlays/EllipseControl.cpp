@@ -212,9 +212,13 @@ bool EllipseControl::RemoveInput(Input *input, const TagList *tags)
     return HandleOverlay::RemoveInput(input, tags) || linked;
 }
 
+// An Input holds one role: where two name the same, the first takes it.
 bool EllipseControl::HasRole(Role role) const
 {
     const int32 index = mRoleIndex[role];
+    for (int32 r = 0; r < role; ++r)
+        if (mRoleIndex[r] == index)
+            return false;
     return index > 0 && index < int32(Inputs().size());
 }
 
@@ -223,7 +227,7 @@ void EllipseControl::Store(int32 index, const Parameter *value, bool &moved)
     if (index == 0)
         moved = OV::TakePoint(mCenter, value) || moved;
     for (int32 r = 0; index > 0 && r < ER_Count; ++r)
-        if (index == mRoleIndex[r])
+        if (index == mRoleIndex[r] && HasRole(Role(r)))
             moved = OV::TakeNumber(mInput[r], value) || moved;
 }
 

@@ -117,9 +117,13 @@ void TransformControl::ReadInputs()
     }
 }
 
+// An Input holds one role: where two name the same, the first takes it.
 bool TransformControl::HasRole(Role role) const
 {
     const int32 index = mRoleIndex[role];
+    for (int32 r = 0; r < role; ++r)
+        if (mRoleIndex[r] == index)
+            return false;
     return index > 0 && index < int32(Inputs().size());
 }
 
@@ -130,15 +134,15 @@ void TransformControl::Store(int32 index, const Parameter *value, bool &moved)
         moved = OV::TakePoint(mShape.center, value) || moved;
     if (index <= 0)
         return;
-    if (index == mRoleIndex[TR_Angle])
+    if (index == mRoleIndex[TR_Angle] && HasRole(TR_Angle))
         moved = OV::TakeNumber(mShape.angle, value) || moved;
-    if (index == mRoleIndex[TR_XSize])
+    if (index == mRoleIndex[TR_XSize] && HasRole(TR_XSize))
         moved = OV::TakeNumber(mShape.size.x, value) || moved;
-    if (index == mRoleIndex[TR_YSize])
+    if (index == mRoleIndex[TR_YSize] && HasRole(TR_YSize))
         moved = OV::TakeNumber(mShape.size.y, value) || moved;
-    if (index == mRoleIndex[TR_Pivot])
+    if (index == mRoleIndex[TR_Pivot] && HasRole(TR_Pivot))
         moved = OV::TakePoint(mShape.pivot, value) || moved;
-    if (index == mRoleIndex[TR_Shear])
+    if (index == mRoleIndex[TR_Shear] && HasRole(TR_Shear))
         moved = OV::TakeNumber(mShape.shear, value) || moved;
 }
 

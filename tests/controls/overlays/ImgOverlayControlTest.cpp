@@ -43,7 +43,7 @@ Input *AddOverlay(ViewerFixture &f, const TagList &more = TagList())
     f.tool->AddInput(OrbID("Visible"), "Visible", CLSID_DataType_Number, TagList(), AutoNumber(1.0));
     TagList attrs{{INPA_PreviewControl, OrbID("ImgOverlayControl")},
                   {INPA_OverlayInput, OrbID("XSize")},
-                  {IO_AngleInput, -1},
+                  {IO_AngleInput, 2}, // none: no Input 2
                   {IO_XSizeInput, 1},
                   {IOD_FrameWidth, 0.5},
                   {IO_FitImage, true},

@@ -16,7 +16,7 @@ using namespace Orbane::Test;
 
 namespace {
 
-constexpr Tag TC_YSizeInput = 0x10058002, TC_KeepAspect = 0x10058005;
+constexpr Tag TC_YSizeInput = 0x10058002, TC_ShearInput = 0x10058004, TC_KeepAspect = 0x10058005;
 constexpr double kNaN = std::numeric_limits<double>::quiet_NaN();
 
 struct Values
@@ -283,8 +283,8 @@ void TransformControlTest::badInput()
     QVERIFY2(Same(Read(f), v), Describe(Read(f)));
 }
 
-// Without a Y size the X size scales both axes; without roles there is
-// nothing to grab but the centre.
+// Without a Y size the X size scales both axes; a role named twice goes to
+// the first; without roles there is nothing to grab but the centre.
 void TransformControlTest::missingRolesHaveNoHandles()
 {
     ViewerFixture f;
@@ -295,6 +295,19 @@ void TransformControlTest::missingRolesHaveNoHandles()
     QCOMPARE(NumberOf(f, "XSize"), 1.5);
     QCOMPARE(NumberOf(f, "YSize"), 1.0);
     QCOMPARE(StateOf(f.OverlayOf(c), "sizeY"), 1.5);
+
+    // The shear named on the angle's Input: the angle keeps it, and the
+    // shear (no Input of its own) has no bar.
+    ViewerFixture twice;
+    Values turned;
+    turned.angle = 30;
+    Input *t = AddTransform(twice, turned, TagList{{TC_ShearInput, 1}});
+    QVERIFY(twice.Show());
+    QCOMPARE(StateOf(twice.OverlayOf(t), "angle"), 30.0);
+    QCOMPARE(StateOf(twice.OverlayOf(t), "shear"), 0.0);
+    const OrbPoint bar(-std::sin(M_PI / 6) * 130, std::cos(M_PI / 6) * 130);
+    twice.Hover(twice.At({0.5, 0.5}, QPoint(int(std::lround(bar.x)), int(std::lround(bar.y)))));
+    QCOMPARE(StateOf(twice.OverlayOf(t), "hoverPart"), 0.0);
 
     ViewerFixture bare;
     Input *alone = bare.AddPoint("Center", 0.5, 0.5, TagList{{INPA_PreviewControl, OrbID("TransformControl")}});
