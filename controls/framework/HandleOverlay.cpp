@@ -275,6 +275,14 @@ template <class Base> bool HandleOverlayOn<Base>::WritePoint(OrbPoint value, uin
     return this->SetInputs(point.get(), this->GetCurrentTime(), index, nullptr);
 }
 
+template <class Base> bool HandleOverlayOn<Base>::HoldsRole(const int32 *indexes, int32 role) const
+{
+    for (int32 r = 0; r < role; ++r)
+        if (indexes[r] == indexes[role])
+            return false;
+    return indexes[role] > 0 && indexes[role] < int32(this->Inputs().size());
+}
+
 template <class Base> void HandleOverlayOn<Base>::ReadGrabOffset(const TagList &tags)
 {
     mGrabOffset.x = tags.GetDouble(PCA_GrabOffsetX, mGrabOffset.x);

@@ -109,6 +109,11 @@ protected:
     bool WriteNumber(float64 value, uint32 index);
     bool WritePoint(OrbPoint value, uint32 index);
 
+    // Overlays that edit several values take each from the Input whose
+    // index `indexes[role]` gives: true where that Input is there (not the
+    // main one) and no earlier role names it, for an Input holds one role.
+    bool HoldsRole(const int32 *indexes, int32 role) const;
+
     // Takes the grab offset a tool or script gives (PCA_GrabOffsetX/Y).
     void ReadGrabOffset(const TagList &tags);
 

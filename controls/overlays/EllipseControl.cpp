@@ -212,14 +212,9 @@ bool EllipseControl::RemoveInput(Input *input, const TagList *tags)
     return HandleOverlay::RemoveInput(input, tags) || linked;
 }
 
-// An Input holds one role: where two name the same, the first takes it.
 bool EllipseControl::HasRole(Role role) const
 {
-    const int32 index = mRoleIndex[role];
-    for (int32 r = 0; r < role; ++r)
-        if (mRoleIndex[r] == index)
-            return false;
-    return index > 0 && index < int32(Inputs().size());
+    return HoldsRole(mRoleIndex, role);
 }
 
 void EllipseControl::Store(int32 index, const Parameter *value, bool &moved)

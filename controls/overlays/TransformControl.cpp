@@ -117,14 +117,9 @@ void TransformControl::ReadInputs()
     }
 }
 
-// An Input holds one role: where two name the same, the first takes it.
 bool TransformControl::HasRole(Role role) const
 {
-    const int32 index = mRoleIndex[role];
-    for (int32 r = 0; r < role; ++r)
-        if (mRoleIndex[r] == index)
-            return false;
-    return index > 0 && index < int32(Inputs().size());
+    return HoldsRole(mRoleIndex, role);
 }
 
 // The copy of the value at `index`; without a Y size the X size scales both.
