@@ -27,6 +27,8 @@ const std::vector<Goal> &Goals()
         {"S1", "freehand reduction, 5,000-sample stroke", "BM_PolyLine_Reduce/5000", nullptr, 10.0, ""},
         {"S2", "closest point among 100,000 points", "BM_PolyLine_Closest/100000", "BM_NaiveScan_Closest/100000", 0.05,
          "a scan of every point"},
+        {"V2", "hover over 100 each of six layer overlays (transform to image), one mouse event",
+         "BM_Viewer_HoverLayers/100", nullptr, 0.5, ""},
     };
     return goals;
 }

@@ -6,6 +6,7 @@
 // arithmetic. The goal: under 0.5 ms per mouse event.
 #include "BenchModule.h"
 #include "BenchViewer.h"
+#include "ViewerHover.h"
 
 #include "orbane/AutoParam.h"
 #include "orbane/ClassIDs.h"
@@ -86,36 +87,12 @@ struct ShapeRig : BenchViewer
     }
 };
 
-// The mouse walks a fixed path across the viewer, over edges and between
-// them; the repaints that hovers ask for are left to the event loop.
-std::vector<QPointF> Path()
-{
-    std::vector<QPointF> path;
-    for (int i = 0; i < 256; ++i)
-        path.emplace_back(40 + (i * 37) % (Width - 80), 30 + (i * 53) % (Height - 60));
-    return path;
-}
-
 void BM_Viewer_HoverShapes(benchmark::State &state)
 {
     if (!LoadControlModule())
         return state.SkipWithError("the control library did not load");
     ShapeRig rig(int(state.range(0)), int(state.range(1)));
-    const std::vector<QPointF> path = Path();
-    std::size_t i = 0;
-    for (auto _ : state) {
-        const QPointF at = path[i++ % path.size()];
-        QMouseEvent event(QEvent::MouseMove, at, rig.viewer.mapToGlobal(at.toPoint()), Qt::NoButton, Qt::NoButton,
-                          Qt::NoModifier);
-        QApplication::sendEvent(&rig.viewer, &event);
-        benchmark::DoNotOptimize(rig.viewer.HoverControl());
-        if (i % 64 == 0) {
-            state.PauseTiming();
-            QApplication::processEvents();
-            state.ResumeTiming();
-        }
-    }
-    state.SetItemsProcessed(state.iterations());
+    ViewerHover::Run(state, rig.viewer, ViewerHover::Path(Width, Height));
 }
 
 // The plain alternative: every rectangle's frame worked out from scratch
@@ -126,7 +103,7 @@ void BM_NaiveLoop_HoverShapes(benchmark::State &state)
     const std::vector<Rect> rects = Rects(int(state.range(0)));
     const std::vector<OrbPoint> dials = Dials(int(state.range(1)));
     std::vector<float> fades(dials.size(), 0.5f);
-    const std::vector<QPointF> path = Path();
+    const std::vector<QPointF> path = ViewerHover::Path(Width, Height);
     const double zoom = std::min(double(Width) / ImageWidth, double(Height) / ImageHeight);
     const QPointF origin((Width - ImageWidth * zoom) / 2, (Height - ImageHeight * zoom) / 2);
     std::size_t i = 0;

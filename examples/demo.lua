@@ -12,5 +12,7 @@ return {
     { file = "tools/Files.lua", name = "Files1" },
     { file = "tools/Groups.lua", name = "Groups1" },
     { file = "tools/Roto.lua", name = "Roto1" },
+    { file = "tools/Layers.lua", name = "Layers1" },
+    { file = "tools/Framing.lua", name = "Framing1" },
   },
 }

@@ -19,9 +19,16 @@
 #include "inputcontrols/ScriptValListControl.h"
 #include "inputcontrols/SliderControl.h"
 #include "overlays/AngleControl.h"
+#include "overlays/CropControl.h"
 #include "overlays/CrosshairControl.h"
+#include "overlays/EllipseControl.h"
+#include "overlays/ImgOverlayControl.h"
 #include "overlays/PointControl.h"
+#include "overlays/PositionerControl.h"
 #include "overlays/RectangleControl.h"
+#include "overlays/SliderOverlay.h"
+#include "overlays/TransformControl.h"
+#include "overlays/XYOffsetControl.h"
 #include "polyline/PolyLineControl.h"
 
 #include "orbane/OverlayControl.h"
@@ -43,22 +50,17 @@
 
 namespace Orbane {
 
-// Before the camera and light, which derive from it.
-ORBANE_PENDING_PREVIEW(TransformControl);
 ORBANE_PENDING_DERIVED(CameraControl, TransformControl);
 ORBANE_PENDING_INPUT(ColorControl);
 ORBANE_PENDING_INPUT(ColorGamutControl);
 ORBANE_PENDING_INPUT(ColorRangesControl);
 ORBANE_PENDING_INPUT(ColorSuppressionControl);
 ORBANE_PENDING_INPUT(ColorWheelControl);
-ORBANE_PENDING_PREVIEW(CropControl);
 ORBANE_PENDING_INPUT(CustomFilterControl);
-ORBANE_PENDING_PREVIEW(EllipseControl);
 ORBANE_PENDING_INPUT(GammaControl);
 ORBANE_PENDING_INPUT(GradientControl);
 ORBANE_PENDING_INPUT(HistogramControl);
 ORBANE_PENDING_INPUT(ImageControl);
-ORBANE_PENDING_PREVIEW(ImgOverlayControl);
 ORBANE_PENDING_INPUT(LevelsControl);
 ORBANE_PENDING_INPUT(LevelsOutputControl);
 ORBANE_PENDING_DERIVED(LightControl, TransformControl);
@@ -66,10 +68,7 @@ ORBANE_PENDING_INPUT(LogControl);
 ORBANE_PENDING_PREVIEW(MeshControl);
 ORBANE_PENDING_PREVIEW(ObloidControl);
 ORBANE_PENDING_INPUT(PatternControl);
-ORBANE_PENDING_PREVIEW(PositionerControl);
-ORBANE_PENDING_DERIVED(SliderOverlay, OverlayControl);
 ORBANE_PENDING_INPUT(SplineControl);
 ORBANE_PENDING_PREVIEW(TrackerControl);
-ORBANE_PENDING_PREVIEW(XYOffsetControl);
 
 } // namespace Orbane

@@ -36,6 +36,9 @@ enum HandleShape : int32
     // of `reach` from the rounding circle's centre. Lengths in frame units;
     // `reach` stands for the tolerance, one per axis of the frame.
     HSH_Outline,
+    // Inside the same turned box as HSH_Outline, out to `reach` beyond its
+    // sides (closed): the body of a box that is dragged as a whole.
+    HSH_Inside,
 };
 
 // Sides of a box that the tolerance widens.
@@ -70,7 +73,7 @@ struct Handle
     OrbPoint lo, hi;      // HSH_Box: extent about the anchor, handle pixels
     OrbPoint end;         // HSH_Band: the segment's other end, viewer units
     float64 radius = 0.0; // HSH_Ring, HSH_Disc, HSH_Band: handle pixels; HSH_Outline: frame units
-    // HSH_Outline: the frame's rows, the box's half sides, the tolerance per
+    // HSH_Outline, HSH_Inside: the frame's rows, the box's half sides, the tolerance per
     // axis (frame units) and the part's sides (+1, -1 or 0 each).
     OrbPoint frameX{1.0, 0.0}, frameY{0.0, 1.0};
     OrbPoint half;

@@ -113,6 +113,11 @@ bool HandleGeometry::Hits(const Handle &h, OrbPoint mouse, float64 s, float64 vi
         const OrbPointI sides = OutlineSides(InFrame(h, m), h.half, h.reach, h.radius);
         return sides.x == h.sideX && sides.y == h.sideY && (sides.x || sides.y);
     }
+    case HSH_Inside: {
+        const OrbPoint local = InFrame(h, m);
+        return std::fabs(local.x) <= std::fabs(h.half.x) + h.reach.x &&
+               std::fabs(local.y) <= std::fabs(h.half.y) + h.reach.y;
+    }
     }
     return false;
 }
@@ -137,6 +142,7 @@ OrbRect HandleGeometry::Extent(const Handle &h, float64 s, float64 viewerToleran
                 std::max(h.at.y, h.end.y) + r};
     }
     case HSH_Outline:
+    case HSH_Inside:
         return OutlineExtent(h);
     }
     return {};

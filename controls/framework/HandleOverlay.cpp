@@ -3,6 +3,8 @@
 #include "orbane/AutoParam.h"
 #include "orbane/ControlCommands.h"
 #include "orbane/GPainter.h"
+#include "orbane/OrbaneDoc.h"
+#include "orbane/OverlayControl.h"
 #include "orbane/PreviewInfo.h"
 #include "orbane/ScriptVal.h"
 
@@ -20,28 +22,36 @@ constexpr float32 kFadeStep = 0.05f;
 
 } // namespace
 
-void HandleOverlay::ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
+template <class Base> HandleOverlayOn<Base>::~HandleOverlayOn()
+{
+    CloseGesture();
+}
+
+template <class Base>
+void HandleOverlayOn<Base>::ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
 {
     // A follow drag ends with the release: the overlay stops following.
-    if (mFollowCursor && mDragType == DRAG_Linked) {
-        mDragType = DRAG_None;
-        SetAttrsTagList(TagList{{PCA_FollowCursor, 0}});
+    if (mFollowCursor && this->mDragType == DRAG_Linked) {
+        this->mDragType = DRAG_None;
+        this->SetAttrsTagList(TagList{{PCA_FollowCursor, 0}});
     }
     mStartGrab = OrbPoint();
-    PreviewControl::ControlUp(info, mouse, tags);
+    CloseGesture();
+    Base::ControlUp(info, mouse, tags);
     Pick({});
 }
 
-uint64 HandleOverlay::ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags)
+template <class Base>
+uint64 HandleOverlayOn<Base>::ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags)
 {
     if (command == CCMD_HitTest)
         return HitTest(*info, data);
-    if (command == CCMD_GetInputAt && GetMainInput() && PressHit(*info))
-        return uint64(reinterpret_cast<uintptr_t>(GetMainInput()));
-    return PreviewControl::ControlCommand(info, command, data, tags);
+    if (command == CCMD_GetInputAt && this->GetMainInput() && PressHit(*info))
+        return uint64(reinterpret_cast<uintptr_t>(this->GetMainInput()));
+    return Base::ControlCommand(info, command, data, tags);
 }
 
-bool HandleOverlay::HoverBounds(const PreviewInfo &info, OrbRect &bounds) const
+template <class Base> bool HandleOverlayOn<Base>::HoverBounds(const PreviewInfo &info, OrbRect &bounds) const
 {
     if (mFades)
         return false;
@@ -51,9 +61,9 @@ bool HandleOverlay::HoverBounds(const PreviewInfo &info, OrbRect &bounds) const
     return true;
 }
 
-void HandleOverlay::GetState(ScriptVal &state) const
+template <class Base> void HandleOverlayOn<Base>::GetState(ScriptVal &state) const
 {
-    PreviewControl::GetState(state);
+    Base::GetState(state);
     const HandleHit poised = mHandles.PoisedHit();
     state.SetKey(ScriptVal("hover"), ScriptVal(bool(poised)));
     state.SetKey(ScriptVal("hoverPart"), ScriptVal(int64(poised.part)));
@@ -63,63 +73,65 @@ void HandleOverlay::GetState(ScriptVal &state) const
     }
 }
 
-float32 HandleOverlay::FadeAt(float64 distance) noexcept
+template <class Base> float32 HandleOverlayOn<Base>::FadeAt(float64 distance) noexcept
 {
     return float32(std::clamp(1.0 - (distance - 10.0) / 100.0, 0.5, 1.0));
 }
 
-HandleHit HandleOverlay::HoverHit(PreviewInfo &info)
+template <class Base> HandleHit HandleOverlayOn<Base>::HoverHit(PreviewInfo &info)
 {
     BuildHandles(info, mHandles);
     return mHandles.HitTest(info.MouseInViewer(), info.HandleScale, info.PickTolerance, HandleGeometry::Hover);
 }
 
-float64 HandleOverlay::FadeDistance(const PreviewInfo &) const
+template <class Base> float64 HandleOverlayOn<Base>::FadeDistance(const PreviewInfo &) const
 {
     return 0.0;
 }
 
-HandleHit HandleOverlay::PressHit(const PreviewInfo &info)
+template <class Base> HandleHit HandleOverlayOn<Base>::PressHit(const PreviewInfo &info)
 {
     BuildHandles(info, mHandles);
     return mHandles.HitTest(info.MouseInViewer(), info.HandleScale, info.PickTolerance, HandleGeometry::Press);
 }
 
-void HandleOverlay::Pick(HandleHit hit)
+template <class Base> void HandleOverlayOn<Base>::Pick(HandleHit hit)
 {
     mHandles.SetPicked(hit);
     UpdateHighlight();
 }
 
-void HandleOverlay::UpdateHighlight()
+template <class Base> void HandleOverlayOn<Base>::UpdateHighlight()
 {
-    mHighlighted = bool(mHandles.PoisedHit()) || bool(mHandles.PickedHit());
+    this->mHighlighted = bool(mHandles.PoisedHit()) || bool(mHandles.PickedHit());
 }
 
-void HandleOverlay::EnableFade()
+template <class Base> void HandleOverlayOn<Base>::EnableFade()
 {
     mFades = true;
     mFade = mDrawnFade = 0.5f;
 }
 
-void HandleOverlay::SettleFade(const PreviewInfo &info)
+template <class Base> void HandleOverlayOn<Base>::SettleFade(const PreviewInfo &info)
 {
-    if (info.Highlight || mDragType == DRAG_Handle)
+    if (info.Highlight || this->mDragType == DRAG_Handle)
         mFade = mDrawnFade = 1.0f;
 }
 
-Graphics::GColor HandleOverlay::HandleFill(const PreviewInfo &info, uint32 part, int32 item) const
+template <class Base>
+Graphics::GColor HandleOverlayOn<Base>::HandleFill(const PreviewInfo &info, uint32 part, int32 item) const
 {
     return mHandles.FillOf(info.GetColor(OrbColor()).Faded(mFade), part, item);
 }
 
-Graphics::GColor HandleOverlay::HandleShadow(const PreviewInfo &info) const
+template <class Base> Graphics::GColor HandleOverlayOn<Base>::HandleShadow(const PreviewInfo &info) const
 {
     return info.GetShadow(OrbColor()).Faded(mFade);
 }
 
-void HandleOverlay::BeginHandle(Graphics::GPainter &p, const PreviewInfo &info, OrbPoint at, uint32 part,
-                                int32 item) const
+template <class Base>
+void HandleOverlayOn<Base>::BeginHandle(Graphics::GPainter &p, const PreviewInfo &info, OrbPoint at, uint32 part,
+                                        int32 item) const
 {
     p.Color(HandleFill(info, part, item), HandleShadow(info));
     p.PushMatrix();
@@ -127,41 +139,42 @@ void HandleOverlay::BeginHandle(Graphics::GPainter &p, const PreviewInfo &info, 
     p.Scale(info.HandleScale, info.HandleScale, 1.0);
 }
 
-void HandleOverlay::EndHandle(Graphics::GPainter &p)
+template <class Base> void HandleOverlayOn<Base>::EndHandle(Graphics::GPainter &p)
 {
     p.PopMatrix();
 }
 
-bool HandleOverlay::NudgeCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags,
-                                 OrbPoint point, float64 stepY, uint64 &result)
+template <class Base>
+bool HandleOverlayOn<Base>::NudgeCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags,
+                                         OrbPoint point, float64 stepY, uint64 &result)
 {
     if (command == CCMD_NeedsKey) {
         result = IsArrowKey(data) ? 1 : 0;
     } else if (command == CCMD_KeyDown) {
         const bool arrow = IsArrowKey(data);
         if (arrow) {
-            const OrbPoint to = point + NudgeOffset(data, 1.0 / info->ImageWidth, stepY, KeyModifiers());
-            AutoPoint value(to.x, to.y, 0.0);
-            SetInputs(value.get(), GetCurrentTime(), 0, nullptr);
+            WritePoint(point + NudgeOffset(data, 1.0 / info->ImageWidth, stepY, KeyModifiers()), 0);
         }
-        PreviewControl::ControlCommand(info, command, data, tags);
+        Base::ControlCommand(info, command, data, tags);
         result = arrow ? 1 : 0;
     } else if (command == CCMD_KeyUpAll) {
         // Ends the one undo step of a run of nudges.
-        ResetUndo(nullptr);
-        result = PreviewControl::ControlCommand(info, command, data, tags);
+        this->ResetUndo(nullptr);
+        result = Base::ControlCommand(info, command, data, tags);
     } else {
         return false;
     }
     return true;
 }
 
-bool HandleOverlay::IsArrowKey(uint64 key) noexcept
+template <class Base> bool HandleOverlayOn<Base>::IsArrowKey(uint64 key) noexcept
 {
     return key == Qt::Key_Left || key == Qt::Key_Up || key == Qt::Key_Right || key == Qt::Key_Down;
 }
 
-OrbPoint HandleOverlay::NudgeOffset(uint64 key, float64 stepX, float64 stepY, Qt::KeyboardModifiers mods) noexcept
+template <class Base>
+OrbPoint HandleOverlayOn<Base>::NudgeOffset(uint64 key, float64 stepX, float64 stepY,
+                                            Qt::KeyboardModifiers mods) noexcept
 {
     float64 factor = 1.0;
     if (mods & Qt::ShiftModifier)
@@ -182,14 +195,14 @@ OrbPoint HandleOverlay::NudgeOffset(uint64 key, float64 stepX, float64 stepY, Qt
     }
 }
 
-Qt::KeyboardModifiers HandleOverlay::KeyModifiers()
+template <class Base> Qt::KeyboardModifiers HandleOverlayOn<Base>::KeyModifiers()
 {
     return qGuiApp ? QGuiApplication::queryKeyboardModifiers() : Qt::NoModifier;
 }
 
 // Claims the mouse only where no overlay above has; the hover may still
 // move (off this overlay) and the fade change, each asking for a redraw.
-uint64 HandleOverlay::HitTest(PreviewInfo &info, uint64 data)
+template <class Base> uint64 HandleOverlayOn<Base>::HitTest(PreviewInfo &info, uint64 data)
 {
     HandleHit hit;
     if (!(data & 1)) {
@@ -204,9 +217,9 @@ uint64 HandleOverlay::HitTest(PreviewInfo &info, uint64 data)
     return changed ? data | 2 : data;
 }
 
-bool HandleOverlay::UpdateFade(const PreviewInfo &info)
+template <class Base> bool HandleOverlayOn<Base>::UpdateFade(const PreviewInfo &info)
 {
-    if (!info.Highlight && mDragType != DRAG_Handle) {
+    if (!info.Highlight && this->mDragType != DRAG_Handle) {
         mFade = FadeAt(FadeDistance(info));
         if (std::fabs(mFade - mDrawnFade) <= kFadeStep)
             return false;
@@ -218,19 +231,65 @@ bool HandleOverlay::UpdateFade(const PreviewInfo &info)
     return changed;
 }
 
-bool HandleOverlay::CopyAttr(Tag tag, void *out)
+template <class Base> bool HandleOverlayOn<Base>::CopyAttr(Tag tag, void *out)
 {
     if (!out || (tag != PCA_GrabOffsetX && tag != PCA_GrabOffsetY))
-        return PreviewControl::CopyAttr(tag, out);
+        return Base::CopyAttr(tag, out);
     *static_cast<float64 *>(out) = tag == PCA_GrabOffsetX ? mGrabOffset.x : mGrabOffset.y;
     // False: the value was supplied.
     return false;
 }
 
-void HandleOverlay::ReadGrabOffset(const TagList &tags)
+template <class Base> void HandleOverlayOn<Base>::OpenGesture(const char *name)
+{
+    if (mGestureOpen)
+        return;
+    if (OrbaneDoc *doc = this->GetDoc()) {
+        doc->StartUndo(name);
+        mGestureOpen = true;
+    }
+}
+
+template <class Base> void HandleOverlayOn<Base>::CloseGesture()
+{
+    if (!mGestureOpen)
+        return;
+    mGestureOpen = false;
+    if (OrbaneDoc *doc = this->GetDoc())
+        doc->EndUndo(true);
+}
+
+template <class Base> bool HandleOverlayOn<Base>::WriteNumber(float64 value, uint32 index)
+{
+    if (!std::isfinite(value) || index >= this->Inputs().size())
+        return false;
+    AutoNumber number(value);
+    return this->SetInputs(number.get(), this->GetCurrentTime(), index, nullptr);
+}
+
+template <class Base> bool HandleOverlayOn<Base>::WritePoint(OrbPoint value, uint32 index)
+{
+    if (!std::isfinite(value.x) || !std::isfinite(value.y) || index >= this->Inputs().size())
+        return false;
+    AutoPoint point(value.x, value.y, 0.0);
+    return this->SetInputs(point.get(), this->GetCurrentTime(), index, nullptr);
+}
+
+template <class Base> bool HandleOverlayOn<Base>::HoldsRole(const int32 *indexes, int32 role) const
+{
+    for (int32 r = 0; r < role; ++r)
+        if (indexes[r] == indexes[role])
+            return false;
+    return indexes[role] > 0 && indexes[role] < int32(this->Inputs().size());
+}
+
+template <class Base> void HandleOverlayOn<Base>::ReadGrabOffset(const TagList &tags)
 {
     mGrabOffset.x = tags.GetDouble(PCA_GrabOffsetX, mGrabOffset.x);
     mGrabOffset.y = tags.GetDouble(PCA_GrabOffsetY, mGrabOffset.y);
 }
+
+template class HandleOverlayOn<PreviewControl>;
+template class HandleOverlayOn<OverlayControl>;
 
 } // namespace Orbane

@@ -26,12 +26,15 @@ class GPainter;
 //     painter draws each primitive as a shadow pass and then a colour pass.
 // Sizes and tolerances are the viewer's logical pixels: the viewer's pick
 // tolerance and handle scale, which a high-DPI screen does not change.
-class HandleOverlay : public PreviewControl
+// `Base` is the host family the overlay belongs to: PreviewControl for
+// overlays of a tool's Inputs, OverlayControl for the viewer slider.
+template <class Base> class HandleOverlayOn : public Base
 {
 public:
-    using PreviewControl::PreviewControl;
+    using Base::Base;
+    ~HandleOverlayOn() override;
 
-    std::size_t SizeOf() const override { return sizeof(HandleOverlay); }
+    std::size_t SizeOf() const override { return sizeof(HandleOverlayOn); }
     // Supplies the grab offset (PCA_GrabOffsetX, PCA_GrabOffsetY).
     bool CopyAttr(Tag tag, void *out) override;
     void ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags) override;
@@ -96,6 +99,21 @@ protected:
     // The keyboard's modifiers now, as the application sees them.
     static Qt::KeyboardModifiers KeyModifiers();
 
+    // One drag that writes several Inputs is one undo step under the
+    // overlay's own `name`: opened at the first write of the drag (a second
+    // call does nothing), closed at the release or when the overlay goes.
+    void OpenGesture(const char *name);
+    void CloseGesture();
+    // Writes a value to Input `index` at the current time; nothing for a
+    // value that is not a finite number or an index with no Input.
+    bool WriteNumber(float64 value, uint32 index);
+    bool WritePoint(OrbPoint value, uint32 index);
+
+    // Overlays that edit several values take each from the Input whose
+    // index `indexes[role]` gives: true where that Input is there (not the
+    // main one) and no earlier role names it, for an Input holds one role.
+    bool HoldsRole(const int32 *indexes, int32 role) const;
+
     // Takes the grab offset a tool or script gives (PCA_GrabOffsetX/Y).
     void ReadGrabOffset(const TagList &tags);
 
@@ -116,8 +134,11 @@ private:
     bool UpdateFade(const PreviewInfo &info);
 
     HandleSet mHandles;
+    bool mGestureOpen = false;
     bool mFades = false;
     float32 mFade = 1.0f, mDrawnFade = 1.0f; // as last tested, as last drawn
 };
+
+using HandleOverlay = HandleOverlayOn<PreviewControl>;
 
 } // namespace Orbane

@@ -56,6 +56,27 @@ Handle &HandleSet::AddBand(OrbPoint from, OrbPoint to, float64 extend, uint32 pa
     return h;
 }
 
+Handle &HandleSet::AddBoxPart(OrbPoint at, OrbPoint unitX, OrbPoint half, float64 reach, OrbPointI side, uint32 part,
+                              int32 priority)
+{
+    Handle &h = Start(side.x || side.y ? HSH_Outline : HSH_Inside, at, part, priority);
+    h.frameX = unitX;
+    h.frameY = OrbPoint(-unitX.y, unitX.x);
+    h.half = half;
+    h.reach = OrbPoint(reach, reach);
+    h.sideX = int8(side.x);
+    h.sideY = int8(side.y);
+    return h;
+}
+
+const Handle *HandleSet::Find(uint32 part, int32 item) const
+{
+    for (const Handle &h : mHandles)
+        if (h.part == part && h.item == item)
+            return &h;
+    return nullptr;
+}
+
 HandleHit HandleSet::HitTest(OrbPoint mouse, float64 scale, float64 tolerance, HandleGeometry::Reach reach) const
 {
     const Handle *best = nullptr;

@@ -41,6 +41,15 @@ public:
     Handle &AddRing(OrbPoint at, float64 radius, uint32 part, int32 priority = HP_Edge);
     Handle &AddDisc(OrbPoint at, float64 radius, uint32 part, int32 priority = HP_Point);
     Handle &AddBand(OrbPoint from, OrbPoint to, float64 extend, uint32 part, int32 priority = HP_Edge);
+    // A part of a box about `at` (viewer units) whose X side runs along the
+    // unit vector `unitX` and whose Y side along its left normal, with half
+    // sides `half` (viewer units): its outline's side or corner `side`
+    // (HSH_Outline, within `reach` of it), or with side 0, 0 its inside out
+    // to `reach` beyond it (HSH_Inside).
+    Handle &AddBoxPart(OrbPoint at, OrbPoint unitX, OrbPoint half, float64 reach, OrbPointI side, uint32 part,
+                       int32 priority);
+    // The handle of `part` (and `item`), or null: where the overlay put it.
+    const Handle *Find(uint32 part, int32 item = -1) const;
     const std::vector<Handle> &Handles() const { return mHandles; }
     bool Empty() const { return mHandles.empty(); }
 

@@ -2,11 +2,9 @@
 
 #include "orbane/AutoParam.h"
 #include "orbane/Input.h"
-#include "orbane/Number.h"
 #include "orbane/PreviewControl.h"
 #include "orbane/TagList.h"
 
-#include <cmath>
 #include <cstddef>
 
 namespace Orbane {
@@ -49,6 +47,33 @@ template <class Owner, std::size_t N> void DetachLinkedInputs(Owner &owner, cons
         owner.DetachFromInput(owner.*(row.slot));
 }
 
+// Tells the overlay the values of the rows in `mask` (AttachLinkedInputs'
+// answer), so that a newly linked Input shows from the moment it is linked,
+// not only after its next change.
+template <class Owner, std::size_t N>
+void PullLinkedInputs(Owner &owner, const LinkedInput<Owner> (&rows)[N], uint32 mask)
+{
+    for (std::size_t i = 0; i < N; ++i)
+        if (Input *in = owner.*(rows[i].slot); in && (mask & (1u << i))) {
+            const AutoParameter value(in->GetValue(owner.GetCurrentTime()));
+            owner.NotifyChanged(in, value.get(), nullptr);
+        }
+}
+
+// Lets go of `input` in every slot that holds it (one Input may fill
+// several); true where any did.
+template <class Owner, std::size_t N>
+bool DetachLinkedInput(Owner &owner, const LinkedInput<Owner> (&rows)[N], const Input *input)
+{
+    bool held = false;
+    for (const LinkedInput<Owner> &row : rows)
+        if (input && owner.*(row.slot) == input) {
+            owner.DetachFromInput(owner.*(row.slot));
+            held = true;
+        }
+    return held;
+}
+
 // The row whose slot holds `input`, or null (also for a null `input`).
 template <class Owner, std::size_t N>
 const LinkedInput<Owner> *FindLinkedInput(const Owner &owner, const LinkedInput<Owner> (&rows)[N], const Input *input)
@@ -61,17 +86,6 @@ const LinkedInput<Owner> *FindLinkedInput(const Owner &owner, const LinkedInput<
     return nullptr;
 }
 
-// Lets go of `input` where a row holds it, for RemoveInput; the row that
-// held it, or null.
-template <class Owner, std::size_t N>
-const LinkedInput<Owner> *DetachLinkedInput(Owner &owner, const LinkedInput<Owner> (&rows)[N], const Input *input)
-{
-    const LinkedInput<Owner> *row = FindLinkedInput(owner, rows, input);
-    if (row)
-        owner.DetachFromInput(owner.*(row->slot));
-    return row;
-}
-
 // Writes the id of every attached Input under its row's id tag (rows taken
 // by pointer only have none), for GetAttrs.
 template <class Owner, std::size_t N>
@@ -80,40 +94,6 @@ void WriteLinkedInputIds(const Owner &owner, const LinkedInput<Owner> (&rows)[N]
     for (const LinkedInput<Owner> &row : rows)
         if (const Input *in = owner.*(row.slot); in && row.idTag)
             tags.Set(row.idTag, in->GetID());
-}
-
-// Tells the overlay the value now of each row that `linked` names (the mask
-// AttachLinkedInputs answers), so linked Inputs show from the moment they
-// are linked, not from their next change.
-template <class Owner, std::size_t N>
-void NotifyLinkedInputs(Owner &owner, const LinkedInput<Owner> (&rows)[N], uint32 linked)
-{
-    for (std::size_t i = 0; i < N; ++i)
-        if (linked & (1u << i)) {
-            Input *in = owner.*(rows[i].slot);
-            const AutoParameter value(in->GetValue(owner.GetCurrentTime()));
-            owner.NotifyChanged(in, value.get(), nullptr);
-        }
-}
-
-// A linked Number Input's value, where it is a finite number.
-inline bool ReadLinkedNumber(const Parameter *value, float64 &out)
-{
-    const auto *n = dynamic_cast<const Number *>(value);
-    if (!n || !std::isfinite(n->Value))
-        return false;
-    out = n->Value;
-    return true;
-}
-
-// Takes `to` into the overlay's `copy` where it moved by more than the
-// threshold; true where it did.
-inline bool TakeMoved(float64 &copy, float64 to)
-{
-    if (!PreviewControl::Moved(copy, to))
-        return false;
-    copy = to;
-    return true;
 }
 
 } // namespace Orbane

@@ -14,19 +14,24 @@
 #include "framework/ControlClasses.h"
 #include "framework/ControlRegistration.h"
 #include "framework/CrosshairTags.h"
+#include "framework/EllipseTags.h"
 #include "framework/FFICasts.h"
 #include "framework/FileTags.h"
 #include "framework/FontfileTags.h"
+#include "framework/ImgOverlayTags.h"
 #include "framework/LabelTags.h"
 #include "framework/ListTags.h"
 #include "framework/MultiButtonTags.h"
 #include "framework/OffsetTags.h"
 #include "framework/PointTags.h"
+#include "framework/PositionerTags.h"
 #include "framework/RangeTags.h"
 #include "framework/RectangleTags.h"
 #include "framework/ScrewTags.h"
 #include "framework/SliderTags.h"
+#include "framework/TransformTags.h"
 #include "framework/VariantRegistration.h"
+#include "framework/XYOffsetTags.h"
 #include "polyline/PolyLineTags.h"
 
 #include "orbane/ClassIDs.h"
@@ -93,7 +98,8 @@ VariantRegistration<ComboControl> gComboID{ComboDesc().Variant(CLSID_InputContro
 ControlRegistration<CropControl> gCrop{D::Preview("CropControl", CLSID_PreviewControl_Crop).NoScript().NoHook()};
 ControlRegistration<CrosshairControl> gCrosshair{D::Preview("CrosshairControl").Tags<CrosshairControlTags>()};
 ControlRegistration<CustomFilterControl> gCustomFilter{D::Input("CustomFilterControl")};
-ControlRegistration<EllipseControl> gEllipse{D::Preview("EllipseControl").Cleanup(&EllipseControl::RegCleanup)};
+ControlRegistration<EllipseControl> gEllipse{
+    D::Preview("EllipseControl").Tags<EllipseControlTags>().Cleanup(&EllipseControl::RegCleanup)};
 ControlRegistration<FileControl> gFile{D::Input("FileControl").Tags<FileControlTags>()};
 ControlRegistration<FontfileControl> gFontfile{D::Input("FontfileControl", "FontFileControl")
                                                    .Script("FontFileControl")
@@ -103,8 +109,10 @@ ControlRegistration<GammaControl> gGamma{D::Input("GammaControl")};
 ControlRegistration<GradientControl> gGradient{D::Input("GradientControl")};
 ControlRegistration<HistogramControl> gHistogram{D::Input("HistogramControl")};
 ControlRegistration<ImageControl> gImage{D::Input("ImageControl")};
-ControlRegistration<ImgOverlayControl> gImgOverlay{
-    D::Preview("ImgOverlayControl").Script("ImageOverlayControl").Flag(REG_PreviewFlag64)};
+ControlRegistration<ImgOverlayControl> gImgOverlay{D::Preview("ImgOverlayControl")
+                                                       .Script("ImageOverlayControl")
+                                                       .Tags<ImgOverlayControlTags>()
+                                                       .Flag(REG_PreviewFlag64)};
 ControlRegistration<LabelControl> gLabel{LabelDesc()};
 VariantRegistration<LabelControl> gLabelNest{LabelDesc().Variant(CLSID_InputControl_Nest)};
 VariantRegistration<LabelControl> gLabelSeparator{LabelDesc().Variant(CLSID_InputControl_Separator)};
@@ -126,7 +134,7 @@ ControlRegistration<PatternControl> gPattern{D::Input("PatternControl")};
 ControlRegistration<PointControl> gPoint{D::Preview("PointControl").Tags<PointControlTags>()};
 ControlRegistration<PolyLineControl> gPolyLine{
     D::Preview("PolyLineControl", "PolylineControl").Script("PolylineControl").Tags<PolyLineControlTags>()};
-ControlRegistration<PositionerControl> gPositioner{D::Preview("PositionerControl")};
+ControlRegistration<PositionerControl> gPositioner{D::Preview("PositionerControl").Tags<PositionerControlTags>()};
 ControlRegistration<RangeControl> gRange{D::Input("RangeControl").Tags<RangeControlTags>()};
 ControlRegistration<RectangleControl> gRectangle{D::Preview("RectangleControl").Tags<RectangleControlTags>()};
 ControlRegistration<ScrewControl> gScrew{D::Input("ScrewControl").Tags<ScrewControlTags>()};
@@ -146,8 +154,9 @@ ControlRegistration<SplineControl> gSpline{D::Input("SplineControl")
                                                .Flag(REG_MenuPath, "Controls\\Spline")};
 // The tracker is an overlay whose map carries the inspector's name; kept so.
 ControlRegistration<TrackerControl> gTracker{D::Preview("TrackerControl").MapName("InputControl.Create")};
-ControlRegistration<TransformControl> gTransform{D::Preview("TransformControl").Flag(REG_PreviewFlag65)};
-ControlRegistration<XYOffsetControl> gXYOffset{D::Preview("XYOffsetControl")};
+ControlRegistration<TransformControl> gTransform{
+    D::Preview("TransformControl").Tags<TransformControlTags>().Flag(REG_PreviewFlag65)};
+ControlRegistration<XYOffsetControl> gXYOffset{D::Preview("XYOffsetControl").Tags<XYOffsetControlTags>()};
 
 } // namespace
 

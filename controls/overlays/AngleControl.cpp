@@ -145,24 +145,13 @@ bool AngleControl::SetAttrsTagList(Input *input, const TagList &tags)
 // next change.
 void AngleControl::AttachInputs(const TagList &tags)
 {
-    const uint32 linked = AttachLinkedInputs(*this, Links, GetOperator(nullptr), tags) & ~kCenterZRow;
-    for (std::size_t i = 0; i < std::size(Links); ++i)
-        if (linked & (1u << i)) {
-            Input *now = this->*(Links[i].slot);
-            const AutoParameter value(now->GetValue(GetCurrentTime()));
-            NotifyChanged(now, value.get(), nullptr);
-        }
+    PullLinkedInputs(*this, Links, AttachLinkedInputs(*this, Links, GetOperator(nullptr), tags) & ~kCenterZRow);
 }
 
 bool AngleControl::RemoveInput(Input *input, const TagList *tags)
 {
-    // One Input may fill several slots: each lets go of it.
-    bool wasLinked = false;
-    while (const LinkedInput<AngleControl> *row = FindLinkedInput(*this, Links, input)) {
-        DetachFromInput(this->*(row->slot));
-        wasLinked = true;
-    }
-    return HandleOverlay::RemoveInput(input, tags) || wasLinked;
+    const bool linked = DetachLinkedInput(*this, Links, input);
+    return HandleOverlay::RemoveInput(input, tags) || linked;
 }
 
 // Copies take finite values only: an Input that holds no number leaves the

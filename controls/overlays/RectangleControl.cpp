@@ -1,5 +1,6 @@
 #include "overlays/RectangleControl.h"
 
+#include "framework/OverlayValue.h"
 #include "framework/RectangleTags.h"
 
 #include "orbane/AutoParam.h"
@@ -27,25 +28,10 @@ namespace {
 constexpr float64 kScaleEpsilon = 1.1920928955078125e-07;
 // A size this small would blow a written width up: it counts as 1.
 constexpr float64 kMinSize = 1e-5;
-// Beyond this many viewer units an outline has left every screen; drawing
-// it would only feed the painter huge numbers.
-constexpr float64 kFarAway = 1e7;
 // Corner strips reach this fraction of the smaller half side along each edge.
 constexpr float64 kCornerStrip = 0.25;
 
-bool Finite(OrbPoint p)
-{
-    return std::isfinite(p.x) && std::isfinite(p.y);
-}
-
-bool ReadPoint(const Parameter *value, OrbPoint &out)
-{
-    const auto *p = dynamic_cast<const Point *>(value);
-    if (!p || !std::isfinite(p->X) || !std::isfinite(p->Y))
-        return false;
-    out = OrbPoint(p->X, p->Y);
-    return true;
-}
+using OV = OverlayValue;
 
 } // namespace
 
@@ -73,9 +59,6 @@ RectangleControl::RectangleControl(const Registry *reg, const ScriptVal &args, c
 
 RectangleControl::~RectangleControl()
 {
-    if (mAdjusting)
-        if (OrbaneDoc *doc = GetDoc())
-            doc->EndUndo(true);
     DetachLinkedInputs(*this, Links);
 }
 
@@ -134,7 +117,7 @@ bool RectangleControl::SetAttrsTagList(Input *input, const TagList &tags)
         mShownBlendAmount = mBlendAmount;
         UpdateDisplay(nullptr, nullptr);
     }
-    NotifyLinkedInputs(*this, Links, linked);
+    PullLinkedInputs(*this, Links, linked);
     return HandleOverlay::SetAttrsTagList(input, tags);
 }
 
@@ -185,9 +168,11 @@ bool RectangleControl::ReadAspectLock(const TagList &tags)
 
 bool RectangleControl::RemoveInput(Input *input, const TagList *tags)
 {
-    const LinkedInput<RectangleControl> *row = DetachLinkedInput(*this, Links, input);
+    const LinkedInput<RectangleControl> *row = FindLinkedInput(*this, Links, input);
     if (row && row->slot == &RectangleControl::mImageInput)
         mImage = QImage();
+    if (row)
+        DetachFromInput(this->*(row->slot));
     return HandleOverlay::RemoveInput(input, tags) || row;
 }
 
@@ -196,11 +181,10 @@ void RectangleControl::NotifyChanged(Input *input, Parameter *value, const TagLi
     if (!value)
         return;
     bool moved = false;
-    float64 number = 0.0;
     if (input && input == GetMainInput())
-        moved = ReadLinkedNumber(value, number) && TakeMoved(mWidth, number);
+        moved = OV::TakeNumber(mWidth, value);
     else if (input && Inputs().size() > 1 && input == Inputs()[1])
-        moved = ReadLinkedNumber(value, number) && TakeMoved(mHeight, number);
+        moved = OV::TakeNumber(mHeight, value);
     else if (FindLinkedInput(*this, Links, input))
         StoreLinked(input, value, moved);
     else
@@ -215,23 +199,23 @@ void RectangleControl::StoreLinked(Input *input, const Parameter *value, bool &m
 {
     OrbPoint point;
     float64 n = 0.0;
-    const bool isPoint = ReadPoint(value, point), isNumber = ReadLinkedNumber(value, n);
+    const bool isPoint = OV::ReadPoint(value, point), isNumber = OV::ReadNumber(value, n);
     if (input == mCenterInput && isPoint)
-        moved = (TakeMoved(mCenter.x, point.x) | TakeMoved(mCenter.y, point.y)) || moved;
+        moved = OV::Take(mCenter, point) || moved;
     if (input == mCenterXInput && isNumber)
-        moved = TakeMoved(mCenter.x, n) || moved;
+        moved = OV::Take(mCenter.x, n) || moved;
     if (input == mCenterYInput && isNumber)
-        moved = TakeMoved(mCenter.y, n) || moved;
+        moved = OV::Take(mCenter.y, n) || moved;
     if (input == mAngleInput && isNumber)
-        moved = TakeMoved(mAngle, n) || moved;
+        moved = OV::Take(mAngle, n) || moved;
     if (input == mSizeInput && isNumber)
-        moved = TakeMoved(mSize, n) || moved;
+        moved = OV::Take(mSize, n) || moved;
     if (input == mAxisInput && isPoint)
-        moved = (TakeMoved(mAxis.x, point.x) | TakeMoved(mAxis.y, point.y)) || moved;
+        moved = OV::Take(mAxis, point) || moved;
     if (input == mAxisXInput && isNumber)
-        moved = TakeMoved(mAxis.x, n) || moved;
+        moved = OV::Take(mAxis.x, n) || moved;
     if (input == mAxisYInput && isNumber)
-        moved = TakeMoved(mAxis.y, n) || moved;
+        moved = OV::Take(mAxis.y, n) || moved;
     if (input == mFlipXInput && isNumber && mFlipX != (n != 0.0)) {
         mFlipX = n != 0.0;
         moved = true;
@@ -305,7 +289,7 @@ void RectangleControl::AddOutline(const PreviewInfo &info, const RectangleFrame 
     const OrbPoint origin = frame.ToFrame(mCenter);
     const OrbPoint stepX = frame.ToFrame(mCenter + OrbPoint(1.0 / m.SpanX(), 0.0)) - origin;
     const OrbPoint stepY = frame.ToFrame(mCenter + OrbPoint(0.0, 1.0 / m.SpanY())) - origin;
-    if (!frame.IsValid() || !Finite(at) || !Finite(stepX) || !Finite(stepY))
+    if (!frame.IsValid() || !OV::Finite(at) || !OV::Finite(stepX) || !OV::Finite(stepY))
         return;
     Handle h;
     h.shape = HSH_Outline;
@@ -362,7 +346,7 @@ DragType RectangleControl::ControlDown(PreviewInfo *info, const OrbPointI &mouse
     }
     const RectangleFrame frame = DrawnFrame(*info);
     mGrabOffset = RectangleGrabOffset(MouseInFrame(*info, frame), hit ? part : mLastPart, frame.Half(), mCornerRound);
-    if (!Finite(mGrabOffset))
+    if (!OV::Finite(mGrabOffset))
         mGrabOffset = OrbPoint();
     if (mDragType == DRAG_Handle) {
         mDragPart = part;
@@ -381,7 +365,7 @@ void RectangleControl::ControlMove(PreviewInfo *info, const OrbPointI &mouse, co
     const ViewMapping &m = info->Mapping();
     const RectangleFrame frame(Shape(), m.ImageWidth(), m.ImageHeight(), m.PixelAspect());
     const OrbPoint to = frame.ToFrame(OrbPoint(info->MouseX, info->MouseY)) + mGrabOffset;
-    if (!frame.IsValid() || !Finite(to))
+    if (!frame.IsValid() || !OV::Finite(to))
         return;
     const OrbPoint mid = to - frame.Middle();
     OrbPoint sides(0.0, 0.0);
@@ -396,7 +380,7 @@ void RectangleControl::ControlMove(PreviewInfo *info, const OrbPointI &mouse, co
     // Locked: the values as drawn go straight to both Inputs, in the base's
     // own undo step, not ours.
     const OrbPoint locked = RectangleLockedSize(hasW ? sides.x : 0.0, hasH ? sides.y : 0.0, mAspect);
-    if (Finite(locked) && (Moved(locked.x, mWidth) || Moved(locked.y, mHeight))) {
+    if (OV::Finite(locked) && (Moved(locked.x, mWidth) || Moved(locked.y, mHeight))) {
         WriteNumber(locked.x, 0);
         WriteNumber(locked.y, 1);
     }
@@ -412,34 +396,16 @@ void RectangleControl::WriteSides(OrbPoint drawn)
     const bool h = mDragHeight && std::isfinite(height) && Moved(height, mHeight);
     if (!w && !h)
         return;
-    if (!mAdjusting) {
-        if (OrbaneDoc *doc = GetDoc()) {
-            doc->StartUndo("Adjust Rectangle");
-            mAdjusting = true;
-        }
-    }
+    OpenGesture("Adjust Rectangle");
     if (w)
         WriteNumber(width, 0);
     if (h)
         WriteNumber(height, 1);
 }
 
-void RectangleControl::WriteNumber(float64 value, uint32 index)
-{
-    if (!std::isfinite(value) || index >= Inputs().size())
-        return;
-    AutoNumber number(value);
-    SetInputs(number.get(), GetCurrentTime(), index, nullptr);
-}
-
 void RectangleControl::ControlUp(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
 {
     mDragWidth = 0;
-    if (mAdjusting) {
-        mAdjusting = false;
-        if (OrbaneDoc *doc = GetDoc())
-            doc->EndUndo(true);
-    }
     HandleOverlay::ControlUp(info, mouse, tags);
 }
 
@@ -464,8 +430,8 @@ void RectangleControl::DrawControls(PreviewInfo *info, const TagList *tags)
             p->Enable(Graphics::GC_LineStipple);
         }
         const OrbPoint corner = info->TransformOut(frame.At(1.0, 1.0)) - info->TransformOut(frame.At(-1.0, -1.0));
-        if (frame.IsValid() && Finite(corner) && std::fabs(corner.x) + std::fabs(corner.y) < kFarAway &&
-            info->TransformOut(frame.ToImage(frame.Middle())).Length() < kFarAway) {
+        if (frame.IsValid() && OV::Finite(corner) && std::fabs(corner.x) + std::fabs(corner.y) < OV::FarAway &&
+            info->TransformOut(frame.ToImage(frame.Middle())).Length() < OV::FarAway) {
             if (mImageInput && !mImage.isNull())
                 DrawImage(*p, *info, frame);
             DrawOutline(*p, *info, frame);

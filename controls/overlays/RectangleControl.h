@@ -74,7 +74,6 @@ private:
     bool ReadAspectLock(const TagList &tags);
     void StoreLinked(Input *input, const Parameter *value, bool &moved);
     void WriteSides(OrbPoint sides);
-    void WriteNumber(float64 value, uint32 index);
     void DrawOutline(Graphics::GPainter &p, const PreviewInfo &info, const RectangleFrame &frame) const;
     void DrawStrip(Graphics::GPainter &p, const PreviewInfo &info, const RectangleFrame &frame, int32 part) const;
     void DrawImage(Graphics::GPainter &p, const PreviewInfo &info, const RectangleFrame &frame) const;
@@ -102,9 +101,8 @@ private:
     uint8 mDragWidth = 0, mDragHeight = 0;
     int32 mDragPart = 1, mLastPart = 9;
     float64 mCornerRound = 0.0;
-    QImage mImage;           // the image Input's pixels, shown inside
-    RectangleShape mDrawn;   // the shape as last drawn, which the mouse meets
-    bool mAdjusting = false; // our own undo group is open
+    QImage mImage;         // the image Input's pixels, shown inside
+    RectangleShape mDrawn; // the shape as last drawn, which the mouse meets
 };
 
 } // namespace Orbane

@@ -99,7 +99,7 @@ bool PolyLineControl::SetAttrsTagList(Input *input, const TagList &tags)
     if (main)
         mShapeReadOnly = main->GetAttrs().GetBool(INPA_ReadOnly, mShapeReadOnly);
     EmptySelectionWhenHidden();
-    NotifyLinkedInputs(*this, Links, linked);
+    PullLinkedInputs(*this, Links, linked);
     UpdateDisplay(nullptr, nullptr);
     return HandleOverlay::SetAttrsTagList(input, tags);
 }
@@ -259,7 +259,7 @@ void PolyLineControl::GetState(ScriptVal &state) const
 
 bool PolyLineControl::RemoveInput(Input *input, const TagList *tags)
 {
-    const bool linked = DetachLinkedInput(*this, Links, input) != nullptr;
+    const bool linked = DetachLinkedInput(*this, Links, input);
     return HandleOverlay::RemoveInput(input, tags) || linked;
 }
 
@@ -302,10 +302,10 @@ bool PolyLineControl::StoreShape(const Parameter *value)
 void PolyLineControl::StoreLinked(Input *input, const Parameter *value, bool &moved)
 {
     float64 n = 0.0;
-    const bool isNumber = ReadLinkedNumber(value, n);
+    const bool isNumber = OverlayValue::ReadNumber(value, n);
     if (input == mCenterInput)
         if (const auto *p = dynamic_cast<const Point *>(value))
-            moved = (TakeMoved(mCenter.x, p->X) | TakeMoved(mCenter.y, p->Y)) || moved;
+            moved = (OverlayValue::Take(mCenter.x, p->X) | OverlayValue::Take(mCenter.y, p->Y)) || moved;
     for (auto [in, field] : {std::pair{mCenterXInput, &mCenter.x},
                              {mCenterYInput, &mCenter.y},
                              {mAngleInput, &mAngle},
@@ -315,7 +315,7 @@ void PolyLineControl::StoreLinked(Input *input, const Parameter *value, bool &mo
                              {mTrackerSizeInput, &mTrackerSize},
                              {mTrackerSearchSizeInput, &mTrackerSearchSize}})
         if (in == input && isNumber)
-            moved = TakeMoved(*field, n) || moved;
+            moved = OverlayValue::Take(*field, n) || moved;
     // The shapes paired with this one redraw with it.
     if (input == mOuterInput || input == mInnerInput)
         moved = true;

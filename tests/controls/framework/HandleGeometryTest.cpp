@@ -45,6 +45,13 @@ Handle Outline(int8 sideX, int8 sideY, OrbPoint frameX = {1, 0}, OrbPoint frameY
     return h;
 }
 
+Handle Inside(OrbPoint frameX, OrbPoint frameY)
+{
+    Handle h = Outline(0, 0, frameX, frameY);
+    h.shape = HSH_Inside;
+    return h;
+}
+
 // A quarter turn: the frame's X runs up the viewer.
 constexpr OrbPoint kUp{0, 1}, kLeft{-1, 0};
 
@@ -122,6 +129,9 @@ const Row kRows[] = {
      1,
      HandleGeometry::Press,
      true},
+    {"inside turned: 45 up is within the reach", Inside(kUp, kLeft), {-25, 45}, 1, HandleGeometry::Press, true},
+    {"inside turned: 47 up is past it", Inside(kUp, kLeft), {0, 47}, 1, HandleGeometry::Press, false},
+    {"inside turned: 27 across is past it", Inside(kUp, kLeft), {27, 0}, 1, HandleGeometry::Hover, false},
     {"outline: a rounded edge stops short",
      Outline(1, 0, {1, 0}, {0, 1}, {6, 6}, 10),
      {40, 17},

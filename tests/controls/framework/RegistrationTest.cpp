@@ -264,12 +264,13 @@ TEST(TagMaps, PublishedMapsAreWellFormed)
         ExpectRowsWellFormed(map->Table());
     }
     const std::map<std::string, int> published = {
-        {"AngleControl", 16},        {"ButtonControl", 2},       {"CheckboxControl", 1},       {"CheckListControl", 7},
-        {"ClipControl", 3},          {"ComboControl", 5},        {"ComboIDControl", 5},        {"CrosshairControl", 7},
-        {"FileControl", 4},          {"FontFileControl", 3},     {"LabelControl", 10},         {"ListControl", 4},
-        {"ListIDControl", 4},        {"MultiButtonControl", 33}, {"MultiButtonIDControl", 33}, {"OffsetControl", 2},
-        {"PointControl", 4},         {"PolylineControl", 56},    {"RangeControl", 14},         {"RectangleControl", 35},
-        {"ScriptValListControl", 4}, {"ScrewControl", 1},        {"SliderControl", 4}};
+        {"AngleControl", 16},         {"ButtonControl", 2}, {"CheckboxControl", 1},   {"CheckListControl", 7},
+        {"ClipControl", 3},           {"ComboControl", 5},  {"ComboIDControl", 5},    {"CrosshairControl", 7},
+        {"EllipseControl", 53},       {"FileControl", 4},   {"FontFileControl", 3},   {"ImageOverlayControl", 32},
+        {"LabelControl", 10},         {"ListControl", 4},   {"ListIDControl", 4},     {"MultiButtonControl", 33},
+        {"MultiButtonIDControl", 33}, {"OffsetControl", 2}, {"PointControl", 4},      {"PolylineControl", 56},
+        {"PositionerControl", 16},    {"RangeControl", 14}, {"RectangleControl", 35}, {"ScriptValListControl", 4},
+        {"ScrewControl", 1},          {"SliderControl", 4}, {"TransformControl", 10}, {"XYOffsetControl", 1}};
     EXPECT_EQ(counts, published);
     const auto table = [](const char *type) { return FFITagMap::ForType(FFIType::FindScriptName(type))->Table(); };
     EXPECT_EQ(table("ComboIDControl"), table("ComboControl")) << "variants share their primary's table";

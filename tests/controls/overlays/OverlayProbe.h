@@ -2,11 +2,19 @@
 
 #include "ViewerFixture.h"
 
+#include "orbane/AutoParam.h"
+#include "orbane/Operator.h"
+#include "orbane/ScriptVal.h"
+
 #include <QImage>
 #include <QPoint>
 #include <QtTest>
 
 #include <algorithm>
+#include <utility>
+#include <vector>
+
+Q_DECLARE_METATYPE(Orbane::OrbPoint)
 
 namespace Orbane {
 namespace Test {
@@ -32,6 +40,66 @@ inline bool Lit(const QImage &image, QPoint at, int radius = 1)
 inline bool Dark(const QImage &image, QPoint at, int radius = 1)
 {
     return Level(image, at, radius) < 20;
+}
+
+// Holds modifier keys down while it lives, as a hand on the keyboard does
+// during a drag: overlays read the keyboard's state, not the mouse event's.
+class HeldKeys
+{
+public:
+    HeldKeys(QWidget *widget, Qt::KeyboardModifiers mods) : mWidget(widget), mMods(mods)
+    {
+        for (const auto &[mod, key] : Keys())
+            if (mMods & mod)
+                QTest::keyPress(mWidget, key, mod);
+    }
+    ~HeldKeys()
+    {
+        for (const auto &[mod, key] : Keys())
+            if (mMods & mod)
+                QTest::keyRelease(mWidget, key, Qt::NoModifier);
+    }
+    HeldKeys(const HeldKeys &) = delete;
+    HeldKeys &operator=(const HeldKeys &) = delete;
+
+private:
+    static std::vector<std::pair<Qt::KeyboardModifier, Qt::Key>> Keys()
+    {
+        return {{Qt::ShiftModifier, Qt::Key_Shift}, {Qt::ControlModifier, Qt::Key_Control}};
+    }
+    QWidget *mWidget;
+    Qt::KeyboardModifiers mMods;
+};
+
+// The overlay's state field `key` as a number (a boolean as 0 or 1; -1
+// where there is none).
+inline double StateOf(const PreviewControl *overlay, const char *key)
+{
+    ScriptVal state = ScriptVal::NewTable();
+    overlay->GetState(state);
+    const ScriptVal *v = state.FindKeyConst(ScriptVal(key));
+    return v ? (v->IsBool() ? double(v->GetBool()) : v->GetNumber()) : -1.0;
+}
+
+// A Number Input's value now, or -1000 where it holds none.
+inline double NumberOf(const ViewerFixture &f, const char *id)
+{
+    const AutoNumber n(f.tool->FindInput(OrbID(id)), f.doc.GetCurrentTime());
+    return n ? n->Value : -1000.0;
+}
+
+// Hovers and drags a little from every point of a grid over the whole
+// viewer, drawing before and after: a hand that tries everything, for
+// shapes that must never crash.
+inline void SweepDrags(ViewerFixture &f)
+{
+    f.Grab();
+    for (int x = 30; x < ViewerFixture::kViewWidth; x += 40)
+        for (int y = 20; y < ViewerFixture::kViewHeight; y += 40) {
+            f.Hover(QPoint(x, y));
+            f.Drag(QPoint(x, y), QPoint(x + 23, y - 17), 2);
+        }
+    f.Grab();
 }
 
 // Arrow-key nudges and how far they move a point, in image pixels.

@@ -16,8 +16,6 @@
 using namespace Orbane;
 using namespace Orbane::Test;
 
-Q_DECLARE_METATYPE(Orbane::OrbPoint)
-
 namespace {
 
 constexpr Tag RC_PenStyle = 0x10058000, RCD_SetAngle = 0x20058002, RCD_LockAspect = 0x20058003;
@@ -34,20 +32,6 @@ Input *AddRectangle(ViewerFixture &f, double width, double height, const TagList
     Input *w = f.tool->AddInput(OrbID("Width"), "Width", CLSID_DataType_Number, attrs, AutoNumber(width));
     f.tool->AddInput(OrbID("Height"), "Height", CLSID_DataType_Number, TagList(), AutoNumber(height));
     return w;
-}
-
-double ValueOf(const ViewerFixture &f, const char *id)
-{
-    const AutoNumber n(f.tool->FindInput(OrbID(id)), f.doc.GetCurrentTime());
-    return n ? n->Value : -1.0;
-}
-
-double StateOf(const PreviewControl *overlay, const char *key)
-{
-    ScriptVal state = ScriptVal::NewTable();
-    overlay->GetState(state);
-    const ScriptVal *v = state.FindKeyConst(ScriptVal(key));
-    return v ? (v->IsBool() ? double(v->GetBool()) : v->GetNumber()) : -1.0;
 }
 
 // Where the rectangle has the point (u, v) (-1..1 across each half side)
@@ -231,12 +215,12 @@ void RectangleControlTest::drag()
     const QPoint from = ScreenOf(f, r, u, v, 0);
     f.Drag(from, from + QPoint(move.x(), -move.y()), 4);
     QCOMPARE(StateOf(f.OverlayOf(w), "lastPart"), double(PartCode(u, v)));
-    QVERIFY2(std::fabs(ValueOf(f, "Width") - width) < 1e-9, qPrintable(QString::number(ValueOf(f, "Width"))));
-    QVERIFY2(std::fabs(ValueOf(f, "Height") - height) < 1e-9, qPrintable(QString::number(ValueOf(f, "Height"))));
+    QVERIFY2(std::fabs(NumberOf(f, "Width") - width) < 1e-9, qPrintable(QString::number(NumberOf(f, "Width"))));
+    QVERIFY2(std::fabs(NumberOf(f, "Height") - height) < 1e-9, qPrintable(QString::number(NumberOf(f, "Height"))));
     QCOMPARE(f.doc.UndoNames(), QStringList{undo});
     QVERIFY(f.doc.Undo());
-    QCOMPARE(ValueOf(f, "Width"), 0.5);
-    QCOMPARE(ValueOf(f, "Height"), 0.25);
+    QCOMPARE(NumberOf(f, "Width"), 0.5);
+    QCOMPARE(NumberOf(f, "Height"), 0.25);
 }
 
 void RectangleControlTest::badInput_data()
@@ -277,7 +261,7 @@ void RectangleControlTest::badInput()
         }
     f.Grab();
     for (auto [id, was] : {std::pair{"Width", width}, {"Height", height}}) {
-        const double now = ValueOf(f, id);
+        const double now = NumberOf(f, id);
         QVERIFY2(std::isfinite(now) || (std::isnan(was) && std::isnan(now)) || now == was, id);
     }
 }
@@ -433,7 +417,7 @@ void RectangleControlTest::followsItsCentreAsLinkedDrag()
     f.Grab();
     f.Hover(f.At({0.5, 0.5}, QPoint(140, 0)));
     QCOMPARE(StateOf(f.OverlayOf(w), "hoverPart"), 1.0);
-    QCOMPARE(ValueOf(f, "Width"), 0.5);
+    QCOMPARE(NumberOf(f, "Width"), 0.5);
 }
 
 // A white image inside, over the black backdrop: at full amount it shows
