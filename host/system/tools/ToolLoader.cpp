@@ -5,6 +5,7 @@
 #include "orbane/Gradient.h"
 #include "orbane/Input.h"
 #include "orbane/LuaRuntime.h"
+#include "orbane/LuaSandbox.h"
 #include "orbane/Operator.h"
 #include "orbane/OrbaneDoc.h"
 #include "orbane/Parameter.h"
@@ -44,14 +45,20 @@ std::vector<std::string> Names(const ScriptVal &table, const char *key)
     return names;
 }
 
-// Runs a description file and takes the table it returns.
+// Runs a description file as content (whoever asked for it: tool and comp
+// files come from outside) and takes the table it returns.
 bool RunDescription(const std::string &path, ScriptVal &out, std::string *error)
 {
-    LuaRuntime &lua = LuaRuntime::Instance();
-    if (!lua.RunFile(path, error, 1))
+    lua_State *L = LuaRuntime::Instance().State();
+    if (!LuaSandbox::RunFile(L, path, 1, error))
         return false;
-    out = LuaRuntime::ToScriptVal(lua.State(), -1);
-    lua_pop(lua.State(), 1);
+    std::string why;
+    const bool ok = LuaRuntime::ToScriptVal(L, -1, out, why);
+    lua_pop(L, 1);
+    if (!ok) {
+        *error = path + ": the returned table: " + why;
+        return false;
+    }
     if (!out.IsTable()) {
         *error = path + ": the file must return a table";
         return false;
