@@ -26,7 +26,7 @@ constexpr int kTypeCData = 10;
 constexpr int kMaxDepth = 100;
 // A table that shares subtables can stand for more entries than memory holds
 // ({t, t} thirty times over): the walk stops past this many.
-constexpr std::size_t kMaxEntries = std::size_t(1) << 22;
+constexpr std::size_t kMaxEntries = std::size_t(1) << 20;
 
 // Registry keys: the addresses are unique.
 char kModuleKey, kWrapKey, kClassifyKey, kCdefKey;

@@ -64,13 +64,14 @@ void CountHook(lua_State *L, lua_Debug *)
     if (!meter || meter->nesting == 0)
         return;
     meter->instructionsLeft -= kHookEvery;
-    if (meter->instructionsLeft > 0)
+    // A script that caught the memory error is stopped here too.
+    if (meter->instructionsLeft > 0 && !meter->outOfMemory)
         return;
-    meter->outOfBudget = true;
+    meter->outOfBudget = !meter->outOfMemory;
     // From now on at every instruction, so that a pcall in the script that
     // swallows the error cannot keep the run going.
     lua_sethook(L, CountHook, LUA_MASKCOUNT, 1);
-    lua_pushliteral(L, "instruction budget exhausted");
+    lua_pushliteral(L, "stopped by the sandbox");
     lua_error(L);
 }
 
@@ -201,9 +202,11 @@ void End(lua_State *L, Meter &meter, const SavedRun &saved)
 
 std::string LimitMessage(const Meter &meter, const std::string &name)
 {
-    if (meter.outOfBudget)
-        return name + ": stopped after " + std::to_string(gLimits.instructions) + " instructions (an endless loop?)";
-    return name + ": stopped: it needed more than " + std::to_string(gLimits.memoryBytes >> 20) + " MB of memory";
+    // A script that catches the memory error runs on until the budget
+    // stops it: the memory is the cause then.
+    if (meter.outOfMemory)
+        return name + ": stopped: it needed more than " + std::to_string(gLimits.memoryBytes >> 20) + " MB of memory";
+    return name + ": stopped after " + std::to_string(gLimits.instructions) + " instructions (an endless loop?)";
 }
 
 } // namespace
