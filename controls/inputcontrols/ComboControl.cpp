@@ -97,7 +97,7 @@ void ComboControl::FillRows()
         else
             mCombo->AddItem(ToQString(mItems.Texts[i]), index, ToQString(mItems.SecondTexts[i]));
     }
-    mCombo->ShowItem(mSelection);
+    ShowSelection();
 }
 
 bool ComboControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
@@ -109,7 +109,7 @@ bool ComboControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
         if (now)
             mSelection = SelectionFor(now);
     }
-    mCombo->ShowItem(mSelection);
+    ShowSelection();
     Label()->show();
     mCombo->show();
     // Only a number can come from a typed expression.
@@ -121,6 +121,12 @@ void ComboControl::ShowTexts()
 {
     Label()->setText(ToQString(GetLabelTexts().label));
     Label()->setToolTip(ToQString(GetLabelTexts().second));
+}
+
+// A selected separator has no row text to show: the drop-down shows none.
+void ComboControl::ShowSelection()
+{
+    mCombo->ShowItem(mItems.IsSeparator(mSelection) ? -1 : mSelection);
 }
 
 int32 ComboControl::SelectionFor(const Parameter *value) const
@@ -155,7 +161,7 @@ bool ComboControl::UpdateDisplay(Input *input, const TagList *tags)
     if (mPreviewing)
         return InputControl::UpdateDisplay(input, tags);
     if (IsOpen())
-        mCombo->ShowItem(mSelection);
+        ShowSelection();
     return LabelledInputControl::UpdateDisplay(input, tags);
 }
 

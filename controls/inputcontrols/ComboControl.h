@@ -57,6 +57,7 @@ private slots:
 
 private:
     void FillRows();
+    void ShowSelection();
     int32 SelectionFor(const Parameter *value) const;
     void Select(int row, bool final);
     AutoParameter ValueOf(int32 index) const;
