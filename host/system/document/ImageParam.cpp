@@ -20,6 +20,13 @@ Parameter *ImageParam::Clone() const
     return new ImageParam(Path, Image);
 }
 
+// The pixels count in full, though copies share them: the history must not
+// hold more than its bound even when every step holds another image.
+std::size_t ImageParam::Footprint() const noexcept
+{
+    return kSmallFootprint + std::size_t(Image.sizeInBytes()) + Path.str().size();
+}
+
 bool ImageParam::Equals(const Parameter &o) const
 {
     const auto *i = dynamic_cast<const ImageParam *>(&o);
