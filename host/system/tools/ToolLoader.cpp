@@ -19,12 +19,18 @@
 #include <QDir>
 #include <QFileInfo>
 
+#include <cmath>
 #include <set>
+#include <string>
 #include <vector>
 
 namespace Orbane {
 
 namespace {
+
+// A comp lists its tools; more than this is not a comp anyone made by hand
+// or by tool, and each one runs a file.
+constexpr int32 kMaxCompTools = 4096;
 
 const char *Str(const ScriptVal &table, const char *key, const char *def)
 {
@@ -261,6 +267,95 @@ bool AddInputFrom(Operator &tool, const ScriptVal &decl, ToolContext &ctx, std::
     return true;
 }
 
+// What a comp file asks of the document, read and checked in full before
+// any of it is applied, so that a comp that fails leaves the document as it
+// was.
+struct CompPlan
+{
+    std::vector<AutoRef<Operator>> tools;
+    const ScriptVal *time = nullptr;
+    const ScriptVal *aspect = nullptr;
+    std::string image;
+    ScriptVal comp;
+};
+
+bool Refuse(std::string *error, const std::string &path, const std::string &why)
+{
+    *error = path + ": " + why;
+    return false;
+}
+
+bool IsFiniteNumber(const ScriptVal *v)
+{
+    return v && v->IsNumber() && std::isfinite(v->GetNumber());
+}
+
+bool ReadCompTools(const OrbaneDoc &doc, const std::string &path, CompPlan &plan, std::string *error)
+{
+    const QDir base = QFileInfo(QString::fromStdString(path)).absoluteDir();
+    const ScriptVal *tools = plan.comp.FindKeyConst(ScriptVal("tools"));
+    if (tools && !tools->IsTable())
+        return Refuse(error, path, "tools must be a list");
+    if (tools && tools->Length() > kMaxCompTools)
+        return Refuse(error, path, "more than " + std::to_string(kMaxCompTools) + " tools");
+    std::set<std::string> names;
+    for (int32 i = 1; tools && i <= tools->Length(); ++i) {
+        const ScriptVal &entry = *tools->FindKeyConst(ScriptVal(i));
+        const char *file = Str(entry, "file", nullptr);
+        if (!file)
+            return Refuse(error, path, "tool " + std::to_string(i) + " names no file");
+        const std::string name = Str(entry, "name", "Tool");
+        if (doc.FindTool(name.c_str()) || !names.insert(name).second)
+            return Refuse(error, path, "cannot add tool \"" + name + "\" (is the name taken?)");
+        AutoRef<Operator> tool(
+            ToolLoader::LoadTool(base.filePath(QString::fromUtf8(file)).toStdString(), name.c_str(), error));
+        if (!tool)
+            return false;
+        plan.tools.push_back(std::move(tool));
+    }
+    return true;
+}
+
+bool ReadComp(const OrbaneDoc &doc, const std::string &path, CompPlan &plan, std::string *error)
+{
+    if (!RunDescription(path, plan.comp, error) || !ReadCompTools(doc, path, plan, error))
+        return false;
+    plan.time = plan.comp.FindKeyConst(ScriptVal("time"));
+    if (plan.time && !IsFiniteNumber(plan.time))
+        return Refuse(error, path, "time must be a finite number");
+    plan.aspect = plan.comp.FindKeyConst(ScriptVal("pixelAspect"));
+    if (plan.aspect && !(IsFiniteNumber(plan.aspect) && plan.aspect->GetNumber() > 0))
+        return Refuse(error, path, "pixelAspect must be a finite number above 0");
+    if (const ScriptVal *image = plan.comp.FindKeyConst(ScriptVal("image"))) {
+        if (!image->IsString())
+            return Refuse(error, path, "image must be a file name");
+        const QDir base = QFileInfo(QString::fromStdString(path)).absoluteDir();
+        plan.image = base.filePath(QString::fromUtf8(image->GetString())).toStdString();
+    }
+    return true;
+}
+
+bool ApplyComp(OrbaneDoc &doc, const std::string &path, const CompPlan &plan, std::string *error)
+{
+    for (std::size_t i = 0; i < plan.tools.size(); ++i) {
+        if (doc.AddTool(plan.tools[i].get()))
+            continue;
+        // Checked before, so only a watcher of the document can get here.
+        const std::string name = plan.tools[i]->GetName();
+        while (i > 0)
+            doc.RemoveTool(plan.tools[--i].get());
+        return Refuse(error, path, "cannot add tool \"" + name + "\"");
+    }
+    if (plan.time)
+        doc.SetCurrentTime(plan.time->GetNumber());
+    // The pixel aspect first, so the image is fitted with it.
+    if (plan.aspect)
+        doc.SetPref(PREF_ViewerPixelAspect, plan.aspect->GetNumber());
+    if (!plan.image.empty())
+        doc.SetPref(PREF_ViewerImage, plan.image);
+    return true;
+}
+
 } // namespace
 
 Operator *ToolLoader::FromTable(const ScriptVal &desc, const char *name, std::string *error, const std::string &dir)
@@ -300,30 +395,10 @@ Operator *ToolLoader::LoadTool(const std::string &path, const char *name, std::s
 
 bool ToolLoader::LoadComp(OrbaneDoc &doc, const std::string &path, std::string *error)
 {
-    ScriptVal comp;
-    if (!RunDescription(path, comp, error))
+    CompPlan plan;
+    if (!ReadComp(doc, path, plan, error))
         return false;
-    const QDir base = QFileInfo(QString::fromStdString(path)).absoluteDir();
-    const ScriptVal *tools = comp.FindKeyConst(ScriptVal("tools"));
-    for (int32 i = 1; tools && i <= tools->Length(); ++i) {
-        const ScriptVal &entry = *tools->FindKeyConst(ScriptVal(i));
-        const std::string file = base.filePath(QString::fromUtf8(Str(entry, "file", ""))).toStdString();
-        AutoRef<Operator> tool(LoadTool(file, Str(entry, "name", "Tool"), error));
-        if (!tool)
-            return false;
-        if (!doc.AddTool(tool.get())) {
-            *error = path + ": cannot add tool \"" + tool->GetName() + "\" (is the name taken?)";
-            return false;
-        }
-    }
-    if (const ScriptVal *time = comp.FindKeyConst(ScriptVal("time")))
-        doc.SetCurrentTime(time->GetNumber());
-    // The pixel aspect first, so the image is fitted with it.
-    if (const ScriptVal *aspect = comp.FindKeyConst(ScriptVal("pixelAspect")); aspect && aspect->IsNumber())
-        doc.SetPref(PREF_ViewerPixelAspect, aspect->GetNumber());
-    if (const char *image = Str(comp, "image", nullptr))
-        doc.SetPref(PREF_ViewerImage, base.filePath(QString::fromUtf8(image)).toStdString());
-    return true;
+    return ApplyComp(doc, path, plan, error);
 }
 
 } // namespace Orbane
