@@ -1,13 +1,14 @@
 #include "orbane/ImageParam.h"
 
 #include "orbane/ClassIDs.h"
+#include "orbane/ImageFile.h"
 
 namespace Orbane {
 
 ImageParam::ImageParam(OrbString path) : Path(std::move(path))
 {
     if (!Path.IsEmpty())
-        Image.load(QString::fromUtf8(Path.c_str()));
+        Image = ImageFile::Read(QString::fromUtf8(Path.c_str()));
 }
 
 const OrbID &ImageParam::DataType() const noexcept

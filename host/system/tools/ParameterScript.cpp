@@ -1,5 +1,6 @@
 #include "orbane/ParameterScript.h"
 
+#include "orbane/ImageFile.h"
 #include "orbane/ClassIDs.h"
 #include "orbane/ImageParam.h"
 #include "orbane/Number.h"
@@ -56,6 +57,14 @@ Parameter *Make(const OrbID &type, const ScriptVal &v)
 
 Parameter *ParameterScript::FromScript(const OrbID &dataType, const ScriptVal &value, std::string *error)
 {
+    // An image is refused with its reason before it is decoded.
+    QString why;
+    if (dataType == CLSID_DataType_Image && value.IsString() && *value.GetString() &&
+        !ImageFile::Check(QString::fromUtf8(value.GetString()), &why)) {
+        if (error)
+            *error = why.toStdString();
+        return nullptr;
+    }
     if (Parameter *p = Make(dataType, value))
         return p;
     if (error)
