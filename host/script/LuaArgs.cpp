@@ -23,6 +23,12 @@ bool IsFinite(const ScriptVal &v)
     return true;
 }
 
+// NaN fails every comparison, so it is never within range.
+bool WholeIn(float64 n, int32 lo, int32 hi)
+{
+    return n >= lo && n <= hi && n == std::floor(n);
+}
+
 std::string Num(double n)
 {
     char text[32];
@@ -92,7 +98,7 @@ float64 LuaArgs::OptNumber(int idx, const char *name, float64 def) const
 int32 LuaArgs::Integer(int idx, const char *name, int32 lo, int32 hi) const
 {
     const float64 n = lua_type(mL, idx) == LUA_TNUMBER ? lua_tonumber(mL, idx) : NAN;
-    if (!(n >= lo && n <= hi) || n != std::floor(n))
+    if (!WholeIn(n, lo, hi))
         Fail(idx, name, "expected a whole number from " + Num(lo) + " to " + Num(hi) + ", got " + Shown(mL, idx));
     return int32(n);
 }
@@ -106,26 +112,29 @@ bool LuaArgs::OptTable(int idx, const char *name) const
     return true;
 }
 
-int32 LuaArgs::IntegerField(int idx, const char *key, int32 lo, int32 hi, int32 def) const
+bool LuaArgs::NumberAt(int idx, const char *key, float64 &n) const
 {
     lua_getfield(mL, idx, key);
-    const bool absent = lua_isnil(mL, -1);
-    const float64 n = lua_type(mL, -1) == LUA_TNUMBER ? lua_tonumber(mL, -1) : NAN;
+    const bool present = !lua_isnil(mL, -1);
+    n = lua_type(mL, -1) == LUA_TNUMBER ? lua_tonumber(mL, -1) : NAN;
     lua_pop(mL, 1);
-    if (absent)
+    return present;
+}
+
+int32 LuaArgs::IntegerField(int idx, const char *key, int32 lo, int32 hi, int32 def) const
+{
+    float64 n = 0;
+    if (!NumberAt(idx, key, n))
         return def;
-    if (!(n >= lo && n <= hi) || n != std::floor(n))
+    if (!WholeIn(n, lo, hi))
         FieldExpected(idx, key, ("a whole number from " + Num(lo) + " to " + Num(hi)).c_str());
     return int32(n);
 }
 
 float64 LuaArgs::NumberField(int idx, const char *key, float64 lo, float64 hi, float64 def) const
 {
-    lua_getfield(mL, idx, key);
-    const bool absent = lua_isnil(mL, -1);
-    const float64 n = lua_type(mL, -1) == LUA_TNUMBER ? lua_tonumber(mL, -1) : NAN;
-    lua_pop(mL, 1);
-    if (absent)
+    float64 n = 0;
+    if (!NumberAt(idx, key, n))
         return def;
     if (!(n >= lo && n <= hi))
         FieldExpected(idx, key, ("a number from " + Num(lo) + " to " + Num(hi)).c_str());

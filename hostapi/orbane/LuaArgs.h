@@ -41,6 +41,9 @@ public:
     lua_State *State() const noexcept { return mL; }
 
 private:
+    // The number of a field (NaN where it holds another kind); false where
+    // the field is absent.
+    bool NumberAt(int idx, const char *key, float64 &n) const;
     [[noreturn]] void Expected(int idx, const char *name, const char *what) const;
     [[noreturn]] void FieldExpected(int idx, const char *key, const char *what) const;
 
