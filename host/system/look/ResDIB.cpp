@@ -2,8 +2,8 @@
 
 #include "orbane/LookPack.h"
 
-#include <QFileInfo>
 #include "orbane/ImageFile.h"
+#include <QFileInfo>
 
 #include <QImageReader>
 #include <QPainter>

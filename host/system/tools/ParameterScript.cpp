@@ -1,7 +1,7 @@
 #include "orbane/ParameterScript.h"
 
-#include "orbane/ImageFile.h"
 #include "orbane/ClassIDs.h"
+#include "orbane/ImageFile.h"
 #include "orbane/ImageParam.h"
 #include "orbane/Number.h"
 #include "orbane/OrbIDParam.h"
