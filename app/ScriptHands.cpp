@@ -28,9 +28,10 @@ int ScriptHands::KeyCode(const LuaArgs &args, int idx)
         return args.Integer(idx, "key", 0, int32(~Qt::KeyboardModifierMask));
     const char *name = args.String(idx, "key");
     const QKeySequence seq = QKeySequence::fromString(QString::fromUtf8(name));
-    if (seq.isEmpty() || (seq[0] & ~Qt::KeyboardModifierMask) == 0)
+    const int key = seq.isEmpty() ? 0 : int(seq[0] & ~Qt::KeyboardModifierMask);
+    if (key == 0 || key == Qt::Key_unknown)
         args.Fail(idx, "key", std::string("unknown key \"") + name + "\"");
-    return seq[0] & ~Qt::KeyboardModifierMask;
+    return key;
 }
 
 QByteArray ScriptHands::KeyPhase(const LuaArgs &args, int idx)

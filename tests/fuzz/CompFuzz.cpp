@@ -2,6 +2,8 @@
 // loaded as a comp and as a tool through the sandbox.
 #include "FuzzInput.h"
 
+#include "orbane/AutoRef.h"
+#include "orbane/Operator.h"
 #include "orbane/OrbaneDoc.h"
 #include "orbane/ToolLoader.h"
 

@@ -20,6 +20,7 @@
 #include <QFileInfo>
 
 #include <cmath>
+#include <cstdint>
 #include <set>
 #include <string>
 #include <vector>
@@ -93,22 +94,35 @@ bool AddGradientAttr(Tag tag, const ScriptVal &stops, TagList &tags, std::string
     return true;
 }
 
+// A key that is a whole number a tag id can hold, as that tag id; else 0.
+Tag TagOf(const ScriptVal &key)
+{
+    const float64 n = key.GetNumber(-1);
+    return n >= 0 && n <= float64(UINT32_MAX) && n == std::floor(n) ? Tag(n) : 0;
+}
+
 bool AddNumberedAttr(const ScriptVal &key, const ScriptVal &value, TagList &tags, std::string *error)
 {
-    const Tag tag = Tag(key.GetNumber());
+    const Tag tag = TagOf(key);
     const uint32 type = TagTypeOf(tag);
-    if (!key.IsNumber() || type == 0) {
+    if (type == 0) {
         *error = std::string("attrs: keys are tag ids, got ") + key.TypeName();
         return false;
     }
     if (type == TAGTYPE_Object && value.IsTable())
         return AddGradientAttr(tag, value, tags, error);
+    // An integer tag holds what an int64 can; NaN and infinities are no value.
+    const float64 number = value.IsBool() ? float64(value.GetBool()) : value.GetNumber();
+    if (!value.IsString() && !(std::fabs(number) < (type == TAGTYPE_Double ? HUGE_VAL : 9.2e18))) {
+        *error = "attrs: the value of tag " + std::to_string(tag) + " is out of range";
+        return false;
+    }
     if (value.IsString())
         type == TAGTYPE_ID ? tags.Add(tag, OrbID(value.GetString())) : tags.Add(tag, value.GetString());
     else if (type == TAGTYPE_Double)
         tags.Add(tag, value.GetNumber());
     else
-        tags.Add(tag, int64(value.IsBool() ? value.GetBool() : value.GetNumber()));
+        tags.Add(tag, int64(number));
     return true;
 }
 
@@ -117,7 +131,7 @@ bool AddNumberedAttr(const ScriptVal &key, const ScriptVal &value, TagList &tags
 bool AddNumberedAttrs(const ScriptVal &attrs, TagList &tags, std::string *error)
 {
     for (const auto &[key, value] : attrs.GetEntries()) {
-        const bool pair = key.IsNumber() && TagTypeOf(Tag(key.GetNumber())) == 0 && value.IsTable();
+        const bool pair = key.IsNumber() && TagTypeOf(TagOf(key)) == 0 && value.IsTable();
         const ScriptVal *pairTag = pair ? value.FindKeyConst(ScriptVal(1)) : nullptr;
         const ScriptVal *pairValue = pair ? value.FindKeyConst(ScriptVal(2)) : nullptr;
         if (pair && (!pairTag || !pairValue)) {
