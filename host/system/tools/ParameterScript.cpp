@@ -10,6 +10,8 @@
 #include "orbane/ScriptValParam.h"
 #include "orbane/Text.h"
 
+#include <QFileInfo>
+
 namespace Orbane {
 
 namespace {
@@ -57,10 +59,11 @@ Parameter *Make(const OrbID &type, const ScriptVal &v)
 
 Parameter *ParameterScript::FromScript(const OrbID &dataType, const ScriptVal &value, std::string *error)
 {
-    // An image is refused with its reason before it is decoded.
+    // An image file that is there but corrupt or too large is refused with
+    // its reason before it is decoded; a file not there yet keeps its path.
     QString why;
-    if (dataType == CLSID_DataType_Image && value.IsString() && *value.GetString() &&
-        !ImageFile::Check(QString::fromUtf8(value.GetString()), &why)) {
+    const QString image = dataType == CLSID_DataType_Image ? QString::fromUtf8(value.GetString()) : QString();
+    if (!image.isEmpty() && QFileInfo::exists(image) && !ImageFile::Check(image, &why)) {
         if (error)
             *error = why.toStdString();
         return nullptr;
