@@ -1,9 +1,10 @@
 # The two commands of the README:
 #   make demo   set up, build, and open the bundled demo comp
-#   make test   set up, build with address/undefined sanitizers, run every test
+#   make test   set up, build with address/undefined sanitizers, run every test,
+#               then run each fuzz target briefly (clang, libFuzzer)
 JOBS ?= $(shell nproc)
 
-.PHONY: setup demo test release asan bench clean
+.PHONY: setup demo test release asan bench fuzz clean
 
 setup:
 	@./scripts/setup.sh
@@ -21,6 +22,12 @@ demo: release
 
 test: asan
 	ctest --preset asan -j $(JOBS)
+	JOBS=$(JOBS) ./scripts/fuzz.sh --ci
+
+# A long fuzzing campaign: FUZZ_SECONDS per target (one hour by default).
+FUZZ_SECONDS ?= 3600
+fuzz: setup
+	JOBS=$(JOBS) ./scripts/fuzz.sh $(FUZZ_SECONDS)
 
 # The benchmarks alone, built in release; each goal's figure is the best of the
 # repetitions, as the shared machine only ever adds time.

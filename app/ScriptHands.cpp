@@ -26,14 +26,24 @@ void ScriptHands::SendMouse(QWidget *w, QEvent::Type type, QPoint pos, Qt::Mouse
     QApplication::sendEvent(w, &event);
 }
 
-int ScriptHands::KeyCode(lua_State *L, int idx)
+int ScriptHands::KeyCode(const LuaArgs &args, int idx)
 {
-    if (lua_isnumber(L, idx))
-        return int(lua_tointeger(L, idx));
-    const QKeySequence seq = QKeySequence::fromString(QString::fromUtf8(luaL_checkstring(L, idx)));
-    if (seq.isEmpty())
-        return Raise(L, QString("unknown key \"%1\"").arg(lua_tostring(L, idx)));
-    return seq[0] & ~Qt::KeyboardModifierMask;
+    if (lua_type(args.State(), idx) == LUA_TNUMBER)
+        return args.Integer(idx, "key", 0, int32(~Qt::KeyboardModifierMask));
+    const char *name = args.String(idx, "key");
+    const QKeySequence seq = QKeySequence::fromString(QString::fromUtf8(name));
+    const int key = seq.isEmpty() ? 0 : int(seq[0] & ~Qt::KeyboardModifierMask);
+    if (key == 0 || key == Qt::Key_unknown)
+        args.Fail(idx, "key", std::string("unknown key \"") + name + "\"");
+    return key;
+}
+
+QByteArray ScriptHands::KeyPhase(const LuaArgs &args, int idx)
+{
+    const QByteArray phase = args.OptString(idx, "phase", "click");
+    if (phase != "click" && phase != "press" && phase != "release")
+        args.Fail(idx, "phase", "expected click, press or release");
+    return phase;
 }
 
 Operator *ScriptHands::ToolOrRaise(lua_State *L, OrbaneDoc *doc, int idx)

@@ -4,6 +4,8 @@
 #include <QPoint>
 #include <QString>
 
+#include "orbane/LuaArgs.h"
+
 #include <lua.hpp>
 
 class QWidget;
@@ -24,7 +26,9 @@ public:
     static void SendMouse(QWidget *w, QEvent::Type type, QPoint pos, Qt::MouseButton button, Qt::MouseButtons held,
                           Qt::KeyboardModifiers mods);
     // A key by Qt name ("Left", "PgUp", "Home") or by code.
-    static int KeyCode(lua_State *L, int idx);
+    static int KeyCode(const LuaArgs &args, int idx);
+    // "click" (the default), "press" or "release".
+    static QByteArray KeyPhase(const LuaArgs &args, int idx);
     // The tool named by argument `idx`; raises where there is none.
     static Operator *ToolOrRaise(lua_State *L, OrbaneDoc *doc, int idx = 1);
     // The Input named by arguments 1 (tool) and 2 (Input id); raises where

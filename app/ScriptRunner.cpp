@@ -17,8 +17,11 @@ int ScriptRunner::Run(const QString &path, QTextStream &err)
         return 1;
     }
     int status = 0;
-    if (lua_gettop(L) > top && lua_isnumber(L, -1))
-        status = int(lua_tointeger(L, -1));
+    // An exit status is a small whole number; anything else is a failure.
+    if (lua_gettop(L) > top && lua_isnumber(L, -1)) {
+        const double n = lua_tonumber(L, -1);
+        status = n >= -255 && n <= 255 ? int(n) : 1;
+    }
     lua_settop(L, top);
     return status;
 }

@@ -10,7 +10,9 @@
 #include "orbane/CustomButton.h"
 #include "orbane/Input.h"
 #include "orbane/InputControl.h"
+#include "orbane/LuaArgs.h"
 #include "orbane/LuaRuntime.h"
+#include "orbane/LuaSandbox.h"
 #include "orbane/Operator.h"
 #include "orbane/OrbaneDoc.h"
 #include "orbane/ParameterScript.h"
@@ -35,6 +37,11 @@ namespace {
 
 using Hands = ScriptHands;
 
+// A drag takes this many steps at most, typing this many characters: each is
+// an event sent while the script waits.
+constexpr int kMaxSteps = 10000;
+constexpr int kMaxTyped = 10000;
+
 OrbaneDoc *gDoc = nullptr;
 MainWindow *gWindow = nullptr;
 
@@ -48,14 +55,36 @@ QWidget *TargetOrRaise(lua_State *L, int idx, InputControl **control = nullptr)
     return t.widget;
 }
 
-Input *InputOrRaise(lua_State *L)
+// A tool by name, or the tool object a button script is given, if it is
+// one of the document's.
+Operator *ToolArg(const LuaArgs &args, int idx)
 {
-    return Hands::InputOrRaise(L, gDoc);
+    if (ScriptObject *obj = LuaRuntime::ToObject(args.State(), idx)) {
+        auto *tool = dynamic_cast<Operator *>(obj);
+        if (!tool || gDoc->FindTool(tool->GetName()) != tool)
+            args.Fail(idx, "tool", "not a tool of the document");
+        return tool;
+    }
+    const char *name = args.String(idx, "tool");
+    Operator *tool = gDoc->FindTool(name);
+    if (!tool)
+        args.Fail(idx, "tool", std::string("no tool \"") + name + "\"");
+    return tool;
 }
 
-float64 TimeArg(lua_State *L, int idx)
+Input *InputArg(const LuaArgs &args)
 {
-    return Hands::TimeArg(L, gDoc, idx);
+    Operator *tool = ToolArg(args, 1);
+    const char *id = args.String(2, "input");
+    Input *input = tool->FindInput(OrbID(id));
+    if (!input)
+        args.Fail(2, "input", std::string("tool \"") + tool->GetName() + "\" has no Input \"" + id + "\"");
+    return input;
+}
+
+float64 TimeArg(const LuaArgs &args, int idx)
+{
+    return args.OptNumber(idx, "time", gDoc->GetCurrentTime());
 }
 
 void PushNames(lua_State *L, const QStringList &names)
@@ -72,7 +101,7 @@ void PushNames(lua_State *L, const QStringList &names)
 int LoadComp(lua_State *L)
 {
     std::string why;
-    if (!ToolLoader::LoadComp(*gDoc, luaL_checkstring(L, 1), &why))
+    if (!ToolLoader::LoadComp(*gDoc, LuaArgs(L, "LoadComp").String(1, "path"), &why))
         return Hands::Raise(L, QString::fromStdString(why));
     if (!gDoc->Tools().empty())
         gWindow->ShowTool(QString::fromUtf8(gDoc->Tools().front()->GetName()));
@@ -81,8 +110,9 @@ int LoadComp(lua_State *L)
 
 int LoadTool(lua_State *L)
 {
+    const LuaArgs args(L, "LoadTool");
     std::string why;
-    AutoRef<Operator> tool(ToolLoader::LoadTool(luaL_checkstring(L, 1), luaL_checkstring(L, 2), &why));
+    AutoRef<Operator> tool(ToolLoader::LoadTool(args.String(1, "path"), args.String(2, "name"), &why));
     if (!tool)
         return Hands::Raise(L, QString::fromStdString(why));
     if (!gDoc->AddTool(tool.get()))
@@ -101,15 +131,16 @@ int Tools(lua_State *L)
 
 int ShowTool(lua_State *L)
 {
-    if (!gWindow->ShowTool(QString::fromUtf8(luaL_checkstring(L, 1))))
+    if (!gWindow->ShowTool(QString::fromUtf8(LuaArgs(L, "ShowTool").String(1, "tool"))))
         return Hands::Raise(L, QString("no tool \"%1\"").arg(lua_tostring(L, 1)));
     return 0;
 }
 
 int GetValue(lua_State *L)
 {
-    Input *input = InputOrRaise(L);
-    AutoParameter value(input->GetValue(TimeArg(L, 3)));
+    const LuaArgs args(L, "GetValue");
+    Input *input = InputArg(args);
+    AutoParameter value(input->GetValue(TimeArg(args, 3)));
     LuaRuntime::Push(L, ParameterScript::ToScript(value.get()));
     return 1;
 }
@@ -117,12 +148,14 @@ int GetValue(lua_State *L)
 // A script's write: one undo step, like any other edit.
 int SetValue(lua_State *L)
 {
-    Input *input = InputOrRaise(L);
+    const LuaArgs args(L, "SetValue");
+    Input *input = InputArg(args);
+    const float64 time = TimeArg(args, 4);
     std::string why;
-    AutoParameter value(ParameterScript::FromScript(input->GetDataType(), LuaRuntime::ToScriptVal(L, 3), &why));
+    AutoParameter value(ParameterScript::FromScript(input->GetDataType(), args.Value(3, "value"), &why));
     if (!value)
-        return Hands::Raise(L, QString("Input \"%1\": %2").arg(input->GetName(), QString::fromStdString(why)));
-    if (!input->SetValue(value.get(), TimeArg(L, 4), 0, nullptr) && HasScriptError())
+        args.Fail(3, "value", std::string("Input \"") + input->GetName() + "\": " + why);
+    if (!input->SetValue(value.get(), time, 0, nullptr) && HasScriptError())
         return Hands::Raise(L, QString::fromStdString(TakeScriptError()));
     return 0;
 }
@@ -135,7 +168,7 @@ int GetTime(lua_State *L)
 
 int SetTime(lua_State *L)
 {
-    gDoc->SetCurrentTime(luaL_checknumber(L, 1));
+    gDoc->SetCurrentTime(LuaArgs(L, "SetTime").Number(1, "time"));
     return 0;
 }
 
@@ -177,7 +210,7 @@ int Control(lua_State *L)
 int Press(lua_State *L)
 {
     QWidget *w = TargetOrRaise(L, 1);
-    const UiGesture g = UiGesture::Read(L, 2);
+    const UiGesture g = UiGesture::Read(LuaArgs(L, "Press"), 2);
     Hands::SendMouse(w, QEvent::MouseButtonPress, g.At(w), g.button, g.button, g.mods);
     return 0;
 }
@@ -185,7 +218,7 @@ int Press(lua_State *L)
 int Release(lua_State *L)
 {
     QWidget *w = TargetOrRaise(L, 1);
-    const UiGesture g = UiGesture::Read(L, 2);
+    const UiGesture g = UiGesture::Read(LuaArgs(L, "Release"), 2);
     Hands::SendMouse(w, QEvent::MouseButtonRelease, g.At(w), g.button, Qt::NoButton, g.mods);
     return 0;
 }
@@ -194,7 +227,7 @@ int Release(lua_State *L)
 int Move(lua_State *L)
 {
     QWidget *w = TargetOrRaise(L, 1);
-    const UiGesture g = UiGesture::Read(L, 2);
+    const UiGesture g = UiGesture::Read(LuaArgs(L, "Move"), 2);
     bool hover = false;
     if (lua_istable(L, 2)) {
         lua_getfield(L, 2, "button");
@@ -208,7 +241,7 @@ int Move(lua_State *L)
 int Click(lua_State *L)
 {
     QWidget *w = TargetOrRaise(L, 1);
-    const UiGesture g = UiGesture::Read(L, 2);
+    const UiGesture g = UiGesture::Read(LuaArgs(L, "Click"), 2);
     QTest::mouseClick(w, g.button, g.mods, g.At(w));
     return 0;
 }
@@ -217,14 +250,10 @@ int Click(lua_State *L)
 // steps, release; one gesture.
 int Drag(lua_State *L)
 {
+    const LuaArgs args(L, "Drag");
     QWidget *w = TargetOrRaise(L, 1);
-    const UiGesture from = UiGesture::Read(L, 2), to = UiGesture::Read(L, 3), opts = UiGesture::Read(L, 4);
-    int steps = 10;
-    if (lua_istable(L, 4)) {
-        lua_getfield(L, 4, "steps");
-        steps = lua_isnumber(L, -1) ? qMax(1, int(lua_tointeger(L, -1))) : steps;
-        lua_pop(L, 1);
-    }
+    const UiGesture from = UiGesture::Read(args, 2), to = UiGesture::Read(args, 3), opts = UiGesture::Read(args, 4);
+    const int steps = args.OptTable(4, "options") ? args.IntegerField(4, "steps", 1, kMaxSteps, 10) : 10;
     const QPoint a = from.At(w), b = to.At(w);
     Hands::SendMouse(w, QEvent::MouseButtonPress, a, opts.button, opts.button, opts.mods);
     for (int i = 1; i <= steps; ++i)
@@ -236,10 +265,11 @@ int Drag(lua_State *L)
 // Key(target, "Left", "shift"[, "press"|"release"]).
 int Key(lua_State *L)
 {
+    const LuaArgs args(L, "Key");
     QWidget *w = TargetOrRaise(L, 1);
-    const int key = Hands::KeyCode(L, 2);
-    const Qt::KeyboardModifiers mods = UiGesture::Modifiers(QString::fromUtf8(luaL_optstring(L, 3, "")));
-    const QByteArray phase = luaL_optstring(L, 4, "click");
+    const int key = Hands::KeyCode(args, 2);
+    const Qt::KeyboardModifiers mods = UiGesture::ModifiersArg(args, 3, "mods", args.OptString(3, "mods", ""));
+    const QByteArray phase = Hands::KeyPhase(args, 4);
     if (phase != "release")
         QTest::keyPress(w, Qt::Key(key), mods);
     if (phase != "press")
@@ -247,17 +277,35 @@ int Key(lua_State *L)
     return 0;
 }
 
+// Types text as a keyboard would. QTest's own typing knows only the ASCII
+// keys (others stop it with an assertion): a character beyond them arrives
+// as a key event that carries the character but no key of its own.
+void TypeText(QWidget *w, const QString &text)
+{
+    for (const uint code : text.toUcs4()) {
+        const bool keyed = (code >= 0x20 && code < 0x7f) || code == '\t' || code == '\n' || code == '\b';
+        if (keyed)
+            QTest::keyClick(w, char(code));
+        else
+            QTest::sendKeyEvent(QTest::Click, w, Qt::Key_unknown, QString::fromUcs4(&code, 1), Qt::NoModifier);
+    }
+}
+
 int Type(lua_State *L)
 {
+    const LuaArgs args(L, "Type");
     QWidget *w = TargetOrRaise(L, 1);
-    QTest::keyClicks(w, QString::fromUtf8(luaL_checkstring(L, 2)));
+    const QString text = QString::fromUtf8(args.String(2, "text"));
+    if (text.size() > kMaxTyped)
+        args.Fail(2, "text", "longer than " + std::to_string(kMaxTyped) + " characters");
+    TypeText(w, text);
     return 0;
 }
 
 int Grab(lua_State *L)
 {
     QWidget *w = TargetOrRaise(L, 1);
-    const char *path = luaL_checkstring(L, 2);
+    const char *path = LuaArgs(L, "Grab").String(2, "path");
     if (!w->grab().save(QString::fromUtf8(path)))
         return Hands::Raise(L, QString("cannot write %1").arg(path));
     return 0;
@@ -335,6 +383,10 @@ void UiScripting::Install(OrbaneDoc *doc, MainWindow *window)
     };
     for (const auto &[name, fn] : functions)
         LuaRuntime::Instance().AddModuleFunction(name, fn);
+    // What content (a button script) may do: read and write the document,
+    // each write an undo step like any other.
+    for (const char *name : {"Tools", "GetValue", "SetValue", "GetTime", "SetTime", "UndoNames", "RedoNames"})
+        LuaSandbox::AllowCall(name);
     ViewerScripting::Install(window);
     ValueScripting::Install(doc);
 }

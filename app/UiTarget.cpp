@@ -4,12 +4,15 @@
 
 #include "orbane/Input.h"
 #include "orbane/InputControl.h"
-#include "orbane/ParameterPanel.h"
 #include "orbane/LayoutObj.h"
 #include "orbane/Operator.h"
+#include "orbane/ParameterPanel.h"
 
 #include <QAbstractItemView>
 #include <QApplication>
+
+#include <algorithm>
+#include <iterator>
 
 namespace Orbane {
 
@@ -21,14 +24,6 @@ QString Field(lua_State *L, int idx, const char *key)
     QString s = lua_isstring(L, -1) ? QString::fromUtf8(lua_tostring(L, -1)) : QString();
     lua_pop(L, 1);
     return s;
-}
-
-int IntField(lua_State *L, int idx, const char *key, int def)
-{
-    lua_getfield(L, idx, key);
-    const int v = lua_isnumber(L, -1) ? int(lua_tointeger(L, -1)) : def;
-    lua_pop(L, 1);
-    return v;
 }
 
 UiTarget Fail(const QString &why)
@@ -84,7 +79,7 @@ UiTarget OfControl(lua_State *L, int idx, MainWindow *window)
     if (!input)
         return Fail(QString("tool \"%1\" has no Input \"%2\"").arg(toolName, inputName));
     const auto controls = inspector->ControlsOf(input);
-    const int index = IntField(L, idx, "index", 1);
+    const int index = LuaArgs(L, "target").IntegerField(idx, "index", 1, 1 << 20, 1);
     if (index < 1 || index > int(controls.size()))
         return Fail(QString("Input \"%1\" has %2 controls, not %3").arg(inputName).arg(controls.size()).arg(index));
     UiTarget t;
@@ -111,36 +106,44 @@ UiTarget UiTarget::Resolve(lua_State *L, int idx, MainWindow *window)
     return Fail("expected a widget name or a control table");
 }
 
-Qt::KeyboardModifiers UiGesture::Modifiers(const QString &text)
+bool UiGesture::Modifiers(const QString &text, Qt::KeyboardModifiers &mods)
+{
+    const std::pair<const char *, Qt::KeyboardModifier> names[] = {{"ctrl", Qt::ControlModifier},
+                                                                   {"shift", Qt::ShiftModifier},
+                                                                   {"alt", Qt::AltModifier},
+                                                                   {"meta", Qt::MetaModifier}};
+    mods = Qt::NoModifier;
+    for (const QString &m : text.toLower().split('+', Qt::SkipEmptyParts)) {
+        const auto *it = std::find_if(std::begin(names), std::end(names), [&](auto &n) { return m == n.first; });
+        if (it == std::end(names))
+            return false;
+        mods |= it->second;
+    }
+    return true;
+}
+
+Qt::KeyboardModifiers UiGesture::ModifiersArg(const LuaArgs &args, int idx, const char *name, const char *text)
 {
     Qt::KeyboardModifiers mods;
-    for (const QString &m : text.toLower().split('+', Qt::SkipEmptyParts)) {
-        if (m == "ctrl")
-            mods |= Qt::ControlModifier;
-        else if (m == "shift")
-            mods |= Qt::ShiftModifier;
-        else if (m == "alt")
-            mods |= Qt::AltModifier;
-        else if (m == "meta")
-            mods |= Qt::MetaModifier;
-    }
+    if (!Modifiers(QString::fromUtf8(text), mods))
+        args.Fail(idx, name, std::string("unknown modifier in \"") + text + "\"; expected ctrl, shift, alt, meta");
     return mods;
 }
 
-UiGesture UiGesture::Read(lua_State *L, int idx)
+UiGesture UiGesture::Read(const LuaArgs &args, int idx)
 {
     UiGesture g;
-    if (lua_type(L, idx) != LUA_TTABLE)
+    if (!args.OptTable(idx, "gesture"))
         return g;
-    lua_getfield(L, idx, "x");
-    lua_getfield(L, idx, "y");
-    g.hasPos = lua_isnumber(L, -2) && lua_isnumber(L, -1);
-    g.pos = QPoint(int(lua_tointeger(L, -2)), int(lua_tointeger(L, -1)));
-    lua_pop(L, 2);
-    g.row = IntField(L, idx, "row", 0);
-    const QString button = Field(L, idx, "button");
+    g.hasPos = args.HasField(idx, "x") || args.HasField(idx, "y");
+    g.pos = QPoint(args.IntegerField(idx, "x", -kMaxCoord, kMaxCoord, 0),
+                   args.IntegerField(idx, "y", -kMaxCoord, kMaxCoord, 0));
+    g.row = args.IntegerField(idx, "row", 0, kMaxCoord, 0);
+    const QString button = QString::fromUtf8(args.StringField(idx, "button", "left"));
+    if (button != "left" && button != "right" && button != "middle" && button != "none")
+        args.Fail(idx, "button", "expected left, right, middle or none");
     g.button = button == "right" ? Qt::RightButton : button == "middle" ? Qt::MiddleButton : Qt::LeftButton;
-    g.mods = Modifiers(Field(L, idx, "mods"));
+    g.mods = ModifiersArg(args, idx, "mods", args.StringField(idx, "mods", ""));
     return g;
 }
 

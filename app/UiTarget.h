@@ -3,6 +3,8 @@
 #include <QPoint>
 #include <QString>
 
+#include "orbane/LuaArgs.h"
+
 #include <lua.hpp>
 
 class QWidget;
@@ -26,7 +28,7 @@ struct UiTarget
     static UiTarget Resolve(lua_State *L, int idx, MainWindow *window);
 };
 
-// Mouse and keyboard options: { x =, y =, button = "left"|"right"|"middle",
+// Mouse and keyboard options: { x =, y =, button = "left"|"right"|"middle"|"none",
 // mods = "ctrl+shift", row = n (the n-th top-level row of a list or tree) }.
 struct UiGesture
 {
@@ -36,8 +38,14 @@ struct UiGesture
     Qt::MouseButton button = Qt::LeftButton;
     Qt::KeyboardModifiers mods = Qt::NoModifier;
 
-    static UiGesture Read(lua_State *L, int idx);
-    static Qt::KeyboardModifiers Modifiers(const QString &text);
+    // Positions beyond this many pixels are refused: no widget is that big,
+    // and QPoint arithmetic must not overflow.
+    static constexpr int kMaxCoord = 1 << 20;
+
+    static UiGesture Read(const LuaArgs &args, int idx);
+    // "ctrl+shift"; false for a name that is not a modifier.
+    static bool Modifiers(const QString &text, Qt::KeyboardModifiers &mods);
+    static Qt::KeyboardModifiers ModifiersArg(const LuaArgs &args, int idx, const char *name, const char *text);
     QPoint At(const QWidget *w) const;
 };
 

@@ -5,6 +5,7 @@
 #include "UiTarget.h"
 
 #include "orbane/Input.h"
+#include "orbane/LuaArgs.h"
 #include "orbane/LuaRuntime.h"
 #include "orbane/Operator.h"
 #include "orbane/Registry.h"
@@ -27,44 +28,38 @@ using Hands = ScriptHands;
 
 MainWindow *gWindow = nullptr;
 
-bool Number(lua_State *L, int idx, const char *key, double &out)
-{
-    lua_getfield(L, idx, key);
-    const bool found = lua_isnumber(L, -1);
-    if (found)
-        out = lua_tonumber(L, -1);
-    lua_pop(L, 1);
-    return found;
-}
-
 // { ix =, iy = } in image coordinates (0..1, Y up), else { x =, y = } in the
 // viewer's widget pixels (Y down), else the centre; then { dx =, dy = }
 // widget pixels more.
-QPoint Position(lua_State *L, int idx, const ViewerPanel *viewer)
+QPoint Position(const LuaArgs &args, int idx, const ViewerPanel *viewer)
 {
+    constexpr float64 kFar = UiGesture::kMaxCoord;
     QPointF at(viewer->width() / 2.0, viewer->height() / 2.0);
-    double ix = 0, iy = 0, x = 0, y = 0, dx = 0, dy = 0;
-    if (lua_istable(L, idx)) {
-        if (Number(L, idx, "ix", ix) && Number(L, idx, "iy", iy))
-            at = viewer->ImageToWidget({ix, iy});
-        else if (Number(L, idx, "x", x) && Number(L, idx, "y", y))
-            at = QPointF(x, y);
-        Number(L, idx, "dx", dx);
-        Number(L, idx, "dy", dy);
+    if (lua_istable(args.State(), idx)) {
+        // Image coordinates reach far outside the image when zoomed in, but
+        // not past what a widget position can hold.
+        if (args.HasField(idx, "ix") || args.HasField(idx, "iy"))
+            at = viewer->ImageToWidget(
+                {args.NumberField(idx, "ix", -kFar, kFar, 0.0), args.NumberField(idx, "iy", -kFar, kFar, 0.0)});
+        else if (args.HasField(idx, "x") || args.HasField(idx, "y"))
+            at = QPointF(args.NumberField(idx, "x", -kFar, kFar, 0.0), args.NumberField(idx, "y", -kFar, kFar, 0.0));
+        at += QPointF(args.NumberField(idx, "dx", -kFar, kFar, 0.0), args.NumberField(idx, "dy", -kFar, kFar, 0.0));
     }
-    return QPoint(int(std::lround(at.x() + dx)), int(std::lround(at.y() + dy)));
+    if (!(std::fabs(at.x()) <= 2 * kFar && std::fabs(at.y()) <= 2 * kFar))
+        args.Fail(idx, "position", "lies too far outside the viewer");
+    return QPoint(int(std::lround(at.x())), int(std::lround(at.y())));
 }
 
 // { flags = 4 } gives the press that event-flag word (PCA_EventFlags).
 int ViewerPress(lua_State *L)
 {
-    const UiGesture g = UiGesture::Read(L, 1);
-    double flags = 0;
-    if (lua_istable(L, 1))
-        Number(L, 1, "flags", flags);
+    const LuaArgs args(L, "ViewerPress");
+    const UiGesture g = UiGesture::Read(args, 1);
+    const int32 flags = lua_istable(L, 1) ? args.IntegerField(1, "flags", 0, 0x7fffffff, 0) : 0;
     ViewerPanel *viewer = gWindow->Viewer();
+    const QPoint at = Position(args, 1, viewer);
     viewer->SetPressFlags(uint32(flags));
-    Hands::SendMouse(viewer, QEvent::MouseButtonPress, Position(L, 1, viewer), g.button, g.button, g.mods);
+    Hands::SendMouse(viewer, QEvent::MouseButtonPress, at, g.button, g.button, g.mods);
     viewer->SetPressFlags(0);
     return 0;
 }
@@ -72,24 +67,27 @@ int ViewerPress(lua_State *L)
 // A move with the button held: one step of a drag.
 int ViewerMove(lua_State *L)
 {
-    const UiGesture g = UiGesture::Read(L, 1);
-    Hands::SendMouse(gWindow->Viewer(), QEvent::MouseMove, Position(L, 1, gWindow->Viewer()), Qt::NoButton, g.button,
+    const LuaArgs args(L, "ViewerMove");
+    const UiGesture g = UiGesture::Read(args, 1);
+    Hands::SendMouse(gWindow->Viewer(), QEvent::MouseMove, Position(args, 1, gWindow->Viewer()), Qt::NoButton, g.button,
                      g.mods);
     return 0;
 }
 
 int ViewerRelease(lua_State *L)
 {
-    const UiGesture g = UiGesture::Read(L, 1);
-    Hands::SendMouse(gWindow->Viewer(), QEvent::MouseButtonRelease, Position(L, 1, gWindow->Viewer()), g.button,
+    const LuaArgs args(L, "ViewerRelease");
+    const UiGesture g = UiGesture::Read(args, 1);
+    Hands::SendMouse(gWindow->Viewer(), QEvent::MouseButtonRelease, Position(args, 1, gWindow->Viewer()), g.button,
                      Qt::NoButton, g.mods);
     return 0;
 }
 
 int ViewerHover(lua_State *L)
 {
-    const UiGesture g = UiGesture::Read(L, 1);
-    Hands::SendMouse(gWindow->Viewer(), QEvent::MouseMove, Position(L, 1, gWindow->Viewer()), Qt::NoButton,
+    const LuaArgs args(L, "ViewerHover");
+    const UiGesture g = UiGesture::Read(args, 1);
+    Hands::SendMouse(gWindow->Viewer(), QEvent::MouseMove, Position(args, 1, gWindow->Viewer()), Qt::NoButton,
                      Qt::NoButton, g.mods);
     return 0;
 }
@@ -98,13 +96,11 @@ int ViewerHover(lua_State *L)
 // go down before the key and up after it, as a person's hands do.
 int ViewerKey(lua_State *L)
 {
+    const LuaArgs args(L, "ViewerKey");
     ViewerPanel *viewer = gWindow->Viewer();
-    const int key = Hands::KeyCode(L, 1);
-    const Qt::KeyboardModifiers mods = UiGesture::Modifiers(QString::fromUtf8(luaL_optstring(L, 2, "")));
-    const QByteArray phase = luaL_optstring(L, 3, "click");
-    if (phase != "click" && phase != "press" && phase != "release")
-        return Hands::Raise(
-            L, QString("unknown key phase \"%1\"; expected click, press or release").arg(phase.constData()));
+    const int key = Hands::KeyCode(args, 1);
+    const Qt::KeyboardModifiers mods = UiGesture::ModifiersArg(args, 2, "mods", args.OptString(2, "mods", ""));
+    const QByteArray phase = Hands::KeyPhase(args, 3);
     if (phase != "release")
         QTest::keyPress(viewer, Qt::Key(key), mods);
     if (phase != "press")
@@ -114,7 +110,7 @@ int ViewerKey(lua_State *L)
 
 int ViewerGrab(lua_State *L)
 {
-    const char *path = luaL_checkstring(L, 1);
+    const char *path = LuaArgs(L, "ViewerGrab").String(1, "path");
     if (!gWindow->Viewer()->grab().save(QString::fromUtf8(path)))
         return Hands::Raise(L, QString("cannot write %1").arg(path));
     return 0;
@@ -122,7 +118,7 @@ int ViewerGrab(lua_State *L)
 
 int ViewerImage(lua_State *L)
 {
-    const char *path = luaL_checkstring(L, 1);
+    const char *path = LuaArgs(L, "ViewerImage").String(1, "path");
     if (!gWindow->Viewer()->LoadImage(QString::fromUtf8(path)))
         return Hands::Raise(L, QString("cannot read the image %1").arg(path));
     return 0;
@@ -157,9 +153,10 @@ int ViewerInfo(lua_State *L)
 // one or the first of class `cls`; raises where there is none.
 PreviewControl *OverlayOrRaise(lua_State *L)
 {
-    const char *toolName = luaL_checkstring(L, 1);
-    const char *inputID = luaL_checkstring(L, 2);
-    const char *cls = luaL_optstring(L, 3, nullptr);
+    const LuaArgs args(L, "Overlay");
+    const char *toolName = args.String(1, "tool");
+    const char *inputID = args.String(2, "input");
+    const char *cls = args.OptString(3, "class", nullptr);
     const ViewerPanel *viewer = gWindow->Viewer();
     const Operator *tool = viewer->GetTool();
     if (!tool || std::strcmp(tool->GetName(), toolName) != 0)

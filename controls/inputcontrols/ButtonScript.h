@@ -11,9 +11,10 @@ class ScriptObject;
 
 // The script a button runs when pressed, in the host's Lua state. The text
 // is first mapped with the document's path map: where that names a file,
-// the file runs; otherwise the text itself is the chunk. It runs with
-// `tool`, `self` and `modifiers` in view on top of the globals; other
-// names it assigns are globals. Errors come back as "chunk:line: message".
+// the file runs; otherwise the text itself is the chunk. A button script
+// comes with a tool or comp file, so it is content: it runs in the sandbox
+// with `tool`, `self` and `modifiers` in its environment, which is fresh for
+// every press. Errors come back as "chunk:line: message".
 class ButtonScript
 {
 public:

@@ -83,7 +83,7 @@ void ComboControl::FillRows()
         else
             mCombo->AddItem(ToQString(mChoice.Items().Texts[i]), index, ToQString(mChoice.Items().SecondTexts[i]));
     }
-    mCombo->ShowItem(mSelection);
+    ShowSelection();
 }
 
 bool ComboControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
@@ -91,7 +91,7 @@ bool ComboControl::Open(QWidget *host, const QRect &rect, const TagList *tags)
     if (!LabelledInputControl::Open(host, rect, tags))
         return false;
     mSelection = mChoice.SelectionAt(GetCurrentInput(), GetCurrentTime(), mSelection);
-    mCombo->ShowItem(mSelection);
+    ShowSelection();
     ShowChild(Label());
     ShowChild(mCombo);
     // Only a number can come from a typed expression.
@@ -103,6 +103,12 @@ void ComboControl::ShowTexts()
 {
     Label()->setText(ToQString(GetLabelTexts().label));
     Label()->setToolTip(ToQString(GetLabelTexts().second));
+}
+
+// A selected separator has no row text to show: the drop-down shows none.
+void ComboControl::ShowSelection()
+{
+    mCombo->ShowItem(mChoice.Items().IsSeparator(mSelection) ? -1 : mSelection);
 }
 
 bool ComboControl::NotifyChanged(Input *input, Parameter *value, const TagList *tags)
@@ -119,7 +125,7 @@ bool ComboControl::UpdateDisplay(Input *input, const TagList *tags)
     if (mPreviewing)
         return InputControl::UpdateDisplay(input, tags);
     if (IsOpen())
-        mCombo->ShowItem(mSelection);
+        ShowSelection();
     return LabelledInputControl::UpdateDisplay(input, tags);
 }
 

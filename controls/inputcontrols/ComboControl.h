@@ -57,6 +57,7 @@ private slots:
 
 private:
     void FillRows();
+    void ShowSelection();
     void Select(int row, bool final);
     bool Write(int32 index, float64 time);
 

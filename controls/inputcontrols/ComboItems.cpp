@@ -110,12 +110,14 @@ void ComboItems::Read(const TagList &attrs)
 
 int32 ComboItems::Nearest(float64 value) const
 {
+    // Separators take part with their placeholder value: a number within
+    // reach of it selects the separator, whose value is then what closing
+    // the control writes back.
     int32 found = -1;
     float64 best = kNearEnough;
-    // Separators hold a placeholder value, not one the Input can mean.
     for (int32 i = 0; i < mCount; ++i) {
         const float64 distance = std::fabs(value - Values[std::size_t(i)]);
-        if (!mSeparator[std::size_t(i)] && distance < best) {
+        if (distance < best) {
             best = distance;
             found = i;
         }
@@ -125,9 +127,10 @@ int32 ComboItems::Nearest(float64 value) const
 
 int32 ComboItems::FindID(const OrbID &id) const
 {
-    // A separator's empty identifier must not match an empty value.
+    // The first equal identifier, a separator's too: NOID finds the first
+    // separator.
     for (int32 i = 0; i < mCount; ++i)
-        if (!mSeparator[std::size_t(i)] && IDs[std::size_t(i)] == id)
+        if (IDs[std::size_t(i)] == id)
             return i;
     return -1;
 }

@@ -16,6 +16,6 @@ return {
     { id = "Reset", name = "Reset Transform", type = "Number", default = 0,
       control = "ButtonControl",
       tags = { BTNC_Align = "Center",
-               BTNCS_Execute = "tool_pressed = (tool_pressed or 0) + 1" } },
+               BTNCS_Execute = "orbane.SetValue(tool, 'Invert', 0)" } },
   },
 }

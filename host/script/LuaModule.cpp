@@ -122,8 +122,11 @@ bool TagsArg(lua_State *L, int idx, ScriptVal &args, std::string &problem)
         problem = std::string("expected a table of tags, got ") + luaL_typename(L, idx);
         return false;
     }
-    args = LuaRuntime::ToScriptVal(L, idx);
-    return true;
+    std::string why;
+    if (LuaRuntime::ToScriptVal(L, idx, args, why))
+        return true;
+    problem = "the table of tags: " + why;
+    return false;
 }
 
 ScriptObject *SelfArg(lua_State *L, std::string &problem)

@@ -4,14 +4,17 @@
 
 #include "orbane/FFIFunc.h"
 #include "orbane/FFIType.h"
+#include "orbane/LuaSandbox.h"
 #include "orbane/ScriptObject.h"
 #include "orbane/ScriptVal.h"
 
 #include <dlfcn.h>
 
+#include <algorithm>
 #include <cmath>
 #include <cstdio>
 #include <cstring>
+#include <vector>
 
 namespace Orbane {
 
@@ -19,8 +22,11 @@ namespace {
 
 // LuaJIT's type tag of cdata values (not in the Lua 5.1 headers).
 constexpr int kTypeCData = 10;
-// Deeper tables than this are cut off (as nil) instead of overflowing the stack.
+// Deeper tables than this are refused instead of overflowing the stack.
 constexpr int kMaxDepth = 100;
+// A table that shares subtables can stand for more entries than memory holds
+// ({t, t} thirty times over): the walk stops past this many.
+constexpr std::size_t kMaxEntries = std::size_t(1) << 20;
 
 // Registry keys: the addresses are unique.
 char kModuleKey, kWrapKey, kClassifyKey, kCdefKey;
@@ -135,19 +141,51 @@ void PushValue(lua_State *L, const ScriptVal &v, int depth)
     }
 }
 
-ScriptVal ValueAt(lua_State *L, int idx, int depth);
+// One conversion of a Lua value: the tables on the way down, to stop at a
+// table that contains itself (an endless walk otherwise), and the first
+// problem met when the caller wants to hear of it.
+struct Walk
+{
+    std::vector<const void *> path;
+    std::size_t entries = 0; // shared subtables count each time they are met
+    std::string *error = nullptr;
+};
 
-ScriptVal TableAt(lua_State *L, int idx, int depth)
+ScriptVal ValueAt(lua_State *L, int idx, Walk &walk);
+
+bool Refuse(Walk &walk, const char *problem)
+{
+    if (walk.error && walk.error->empty())
+        *walk.error = problem;
+    return false;
+}
+
+bool CanEnter(lua_State *L, int idx, Walk &walk)
+{
+    const void *table = lua_topointer(L, idx);
+    if (std::find(walk.path.begin(), walk.path.end(), table) != walk.path.end())
+        return Refuse(walk, "a table contains itself");
+    if (int(walk.path.size()) >= kMaxDepth || !lua_checkstack(L, 4))
+        return Refuse(walk, "tables are nested too deeply");
+    if (walk.entries > kMaxEntries)
+        return Refuse(walk, "tables hold too many entries");
+    return !walk.error || walk.error->empty();
+}
+
+ScriptVal TableAt(lua_State *L, int idx, Walk &walk)
 {
     ScriptVal table = ScriptVal::NewTable();
-    if (depth > kMaxDepth || !lua_checkstack(L, 4))
+    if (!CanEnter(L, idx, walk))
         return table;
+    walk.path.push_back(lua_topointer(L, idx));
     lua_pushnil(L);
     while (lua_next(L, idx)) {
+        ++walk.entries;
         // Keys from lua_next are unique, so no search is needed.
-        table.InsertNew(ValueAt(L, lua_gettop(L) - 1, depth + 1), ValueAt(L, lua_gettop(L), depth + 1));
+        table.InsertNew(ValueAt(L, lua_gettop(L) - 1, walk), ValueAt(L, lua_gettop(L), walk));
         lua_pop(L, 1);
     }
+    walk.path.pop_back();
     return table;
 }
 
@@ -187,7 +225,7 @@ ScriptVal CDataAt(lua_State *L, int idx)
     return {};
 }
 
-ScriptVal ValueAt(lua_State *L, int idx, int depth)
+ScriptVal ValueAt(lua_State *L, int idx, Walk &walk)
 {
     switch (lua_type(L, idx)) {
     case LUA_TBOOLEAN:
@@ -200,7 +238,7 @@ ScriptVal ValueAt(lua_State *L, int idx, int depth)
         return ScriptVal(std::string(text, length));
     }
     case LUA_TTABLE:
-        return TableAt(L, idx, depth);
+        return TableAt(L, idx, walk);
     case LUA_TLIGHTUSERDATA:
         return ScriptVal::FromPointer(lua_touserdata(L, idx));
     case kTypeCData:
@@ -229,9 +267,8 @@ LuaRuntime::~LuaRuntime()
 
 void LuaRuntime::Open()
 {
-    mState = luaL_newstate();
+    mState = LuaSandbox::NewState();
     lua_State *L = mState;
-    luaL_openlibs(L);
     lua_newtable(L);
     luaL_register(L, nullptr, LuaModule::Functions());
     for (const auto &[name, fn] : mModuleFunctions) {
@@ -260,7 +297,7 @@ void LuaRuntime::Open()
 void LuaRuntime::Close()
 {
     if (mState)
-        lua_close(mState);
+        LuaSandbox::CloseState(mState);
     mState = nullptr;
     mDeclared.clear();
 }
@@ -304,7 +341,18 @@ void LuaRuntime::Push(lua_State *L, const ScriptVal &value)
 
 ScriptVal LuaRuntime::ToScriptVal(lua_State *L, int idx)
 {
-    return ValueAt(L, AbsIndex(L, idx), 0);
+    Walk walk;
+    return ValueAt(L, AbsIndex(L, idx), walk);
+}
+
+bool LuaRuntime::ToScriptVal(lua_State *L, int idx, ScriptVal &out, std::string &error)
+{
+    Walk walk;
+    std::string problem;
+    walk.error = &problem;
+    out = ValueAt(L, AbsIndex(L, idx), walk);
+    error = problem;
+    return problem.empty();
 }
 
 void LuaRuntime::PushObject(lua_State *L, ScriptObject *obj)

@@ -2,6 +2,10 @@
 
 #include "orbane/ScriptObject.h"
 
+#include <cstdint>
+#include <functional>
+#include <unordered_map>
+
 namespace Orbane {
 
 namespace {
@@ -12,18 +16,60 @@ const ScriptVal::Entries &NoEntries()
     return none;
 }
 
-// The index of an integer key 1..limit, else 0.
-std::size_t ArrayIndex(const ScriptVal &key, std::size_t limit)
+// Hashes what operator== compares: equal keys hash alike (0.0 and -0.0 too).
+struct KeyHash
 {
-    if (!key.IsNumber())
-        return 0;
-    const float64 n = key.GetNumber();
-    if (n < 1 || n > float64(limit) || n != float64(int64(n)))
-        return 0;
-    return std::size_t(n);
-}
+    std::size_t operator()(const ScriptVal &key) const noexcept
+    {
+        const std::size_t type = std::size_t(key.GetType()) * 0x9e3779b97f4a7c15u;
+        switch (key.GetType()) {
+        case ScriptVal::Boolean:
+            return type ^ std::size_t(key.GetBool());
+        case ScriptVal::Number:
+            return type ^ std::hash<float64>()(key.GetNumber() == 0.0 ? 0.0 : key.GetNumber());
+        case ScriptVal::String:
+            return type ^ std::hash<std::string>()(key.GetString());
+        case ScriptVal::Table:
+            return type ^ std::hash<const void *>()(&key.GetEntries());
+        case ScriptVal::Object:
+            return type ^ std::hash<const void *>()(key.GetObject());
+        case ScriptVal::Pointer:
+            return type ^ std::hash<const void *>()(key.GetPointer());
+        case ScriptVal::Nil:
+            break;
+        }
+        return type;
+    }
+};
 
 } // namespace
+
+struct ScriptVal::TableBody
+{
+    Entries entries;
+    std::unordered_map<ScriptVal, std::size_t, KeyHash> index; // key -> position in entries
+    mutable int32 length = 0; // of the array part, as far as known (it may reach further)
+
+    // A new key can only lengthen the array part, which Length() finds by
+    // looking on from the known border: appending stays constant time.
+    void Add(const ScriptVal &key, const ScriptVal &value)
+    {
+        index.emplace(key, entries.size());
+        entries.emplace_back(key, value);
+    }
+
+    void Erase(std::size_t at)
+    {
+        const ScriptVal key = entries[at].first;
+        index.erase(key);
+        entries.erase(entries.begin() + std::ptrdiff_t(at));
+        for (std::size_t i = at; i < entries.size(); ++i)
+            index[entries[i].first] = i;
+        // Removing a key within the array part ends the part before it.
+        if (key.IsNumber() && key.GetNumber() >= 1 && key.GetNumber() <= length)
+            length = int32(key.GetNumber()) - 1;
+    }
+};
 
 ScriptVal::ScriptVal(ScriptObject *obj) : mType(obj ? Object : Nil), mObj(obj)
 {
@@ -35,7 +81,7 @@ ScriptVal ScriptVal::NewTable()
 {
     ScriptVal v;
     v.mType = Table;
-    v.mTable = std::make_shared<Entries>();
+    v.mTable = std::make_shared<TableBody>();
     return v;
 }
 
@@ -107,10 +153,10 @@ const char *ScriptVal::TypeName() const noexcept
 
 const ScriptVal *ScriptVal::FindKeyConst(const ScriptVal &key) const
 {
-    for (const Entry &entry : GetEntries())
-        if (entry.first == key)
-            return &entry.second;
-    return nullptr;
+    if (!mTable)
+        return nullptr;
+    const auto it = mTable->index.find(key);
+    return it == mTable->index.end() ? nullptr : &mTable->entries[it->second].second;
 }
 
 ScriptVal *ScriptVal::FindKey(const ScriptVal &key)
@@ -122,23 +168,21 @@ void ScriptVal::SetKey(const ScriptVal &key, const ScriptVal &value)
 {
     if (!mTable || key.IsNil())
         return;
-    for (auto it = mTable->begin(); it != mTable->end(); ++it) {
-        if (it->first == key) {
-            if (value.IsNil())
-                mTable->erase(it);
-            else
-                it->second = value;
-            return;
-        }
+    const auto it = mTable->index.find(key);
+    if (it == mTable->index.end()) {
+        if (!value.IsNil())
+            mTable->Add(key, value);
+    } else if (value.IsNil()) {
+        mTable->Erase(it->second);
+    } else {
+        mTable->entries[it->second].second = value;
     }
-    if (!value.IsNil())
-        mTable->emplace_back(key, value);
 }
 
 void ScriptVal::InsertNew(const ScriptVal &key, const ScriptVal &value)
 {
     if (mTable && !key.IsNil() && !value.IsNil())
-        mTable->emplace_back(key, value);
+        mTable->Add(key, value);
 }
 
 void ScriptVal::Append(const ScriptVal &value)
@@ -148,20 +192,17 @@ void ScriptVal::Append(const ScriptVal &value)
 
 int32 ScriptVal::Length() const
 {
-    // Only keys up to the entry count can belong to an unbroken run 1..n.
-    const Entries &entries = GetEntries();
-    std::vector<bool> present(entries.size() + 1, false);
-    for (const Entry &entry : entries)
-        present[ArrayIndex(entry.first, entries.size())] = true;
-    int32 n = 0;
-    while (std::size_t(n) < entries.size() && present[std::size_t(n) + 1])
-        ++n;
-    return n;
+    if (!mTable)
+        return 0;
+    // Kept between calls: loops ask at every step.
+    while (mTable->length < INT32_MAX && mTable->index.count(ScriptVal(mTable->length + 1)))
+        ++mTable->length;
+    return mTable->length;
 }
 
 const ScriptVal::Entries &ScriptVal::GetEntries() const
 {
-    return mTable ? *mTable : NoEntries();
+    return mTable ? mTable->entries : NoEntries();
 }
 
 bool ScriptVal::operator==(const ScriptVal &o) const

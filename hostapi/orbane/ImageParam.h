@@ -18,6 +18,7 @@ public:
 
     const OrbID &DataType() const noexcept override;
     Parameter *Clone() const override;
+    std::size_t Footprint() const noexcept override;
     // The same file is the same value.
     bool Equals(const Parameter &o) const override;
 

@@ -35,7 +35,10 @@ public:
     // Conversions between Lua values and script values. Lua tables become
     // tables in Lua's iteration order (the array part 1..n first).
     static void Push(lua_State *L, const ScriptVal &value);
+    // A table that contains itself or nests too deeply is cut there.
     static ScriptVal ToScriptVal(lua_State *L, int idx);
+    // The same, but such a table is refused: false and the reason.
+    static bool ToScriptVal(lua_State *L, int idx, ScriptVal &out, std::string &error);
     // Pushes a `ScriptObject *` cdata holding a new reference (nil for null).
     static void PushObject(lua_State *L, ScriptObject *obj);
     // The object of a `ScriptObject *` cdata at idx, else null.

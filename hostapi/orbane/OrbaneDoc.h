@@ -56,6 +56,12 @@ public:
     Operator *FindTool(const char *name) const;
 
     QUndoStack *UndoStack() const noexcept { return mUndoStack.get(); }
+    // The history keeps at most this many steps and about this many bytes of
+    // recorded values; past either bound the oldest steps go first.
+    static constexpr int kMaxUndoSteps = 1000;
+    static constexpr std::size_t kMaxUndoBytes = std::size_t(256) << 20;
+    // Other bounds; the step count can change only while the history is empty.
+    void SetUndoBounds(int steps, std::size_t bytes);
     void StartUndo(const char *name, const TagList *tags = nullptr);
     // Closes one level. At the outermost level `keep` pushes the gesture as
     // one undo step; at any level `keep == false` puts back every value the

@@ -3,6 +3,8 @@
 #include "orbane/OrbID.h"
 #include "orbane/ScriptObject.h"
 
+#include <cstddef>
+
 namespace Orbane {
 
 // A value of an Input. Reference counted: it starts with one reference owned
@@ -22,6 +24,12 @@ public:
     // `t` reaches 1. Numeric kinds blend linearly. A `to` of another kind
     // yields a copy of this value.
     virtual Parameter *Interpolate(const Parameter &to, float64 t) const;
+    // About how many bytes the value holds. The undo history adds these up
+    // to stay within its memory bound; kinds that hold more than a few
+    // numbers say so.
+    virtual std::size_t Footprint() const noexcept;
+    // What a value of a few numbers costs, its object and bookkeeping.
+    static constexpr std::size_t kSmallFootprint = 64;
 
     // Scripts know a value by its data type ("Number", "Point").
     const char *ScriptTypeName() const override { return DataType().c_str(); }

@@ -33,6 +33,8 @@ public:
 
     const OrbID &DataType() const noexcept override;
     Parameter *Clone() const override;
+    // Counted against the undo history's memory bound: every key point.
+    std::size_t Footprint() const noexcept override;
     bool Equals(const Parameter &o) const override;
     // Key points blended one by one (InterpolateWith).
     Parameter *Interpolate(const Parameter &to, float64 t) const override;

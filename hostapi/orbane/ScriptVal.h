@@ -13,11 +13,21 @@ class ScriptObject;
 
 // A script value: nil, boolean, number, string, table, object or pointer.
 // Tables keep their keys in insertion order and are shared on copy (as in
-// Lua, two values may name the same table). Objects hold one reference.
+// Lua, two values may name the same table); a hash index beside the ordered
+// list finds a key in constant time. Objects hold one reference.
 class ScriptVal
 {
 public:
-    enum Type : uint8 { Nil, Boolean, Number, String, Table, Object, Pointer };
+    enum Type : uint8
+    {
+        Nil,
+        Boolean,
+        Number,
+        String,
+        Table,
+        Object,
+        Pointer
+    };
     using Entry = std::pair<ScriptVal, ScriptVal>;
     using Entries = std::vector<Entry>;
 
@@ -74,12 +84,14 @@ public:
     bool operator!=(const ScriptVal &o) const { return !(*this == o); }
 
 private:
+    struct TableBody;
+
     void Release() noexcept;
 
     Type mType = Nil;
     float64 mNum = 0.0;
     OrbString mStr;
-    std::shared_ptr<Entries> mTable;
+    std::shared_ptr<TableBody> mTable;
     ScriptObject *mObj = nullptr;
     void *mPtr = nullptr;
 };

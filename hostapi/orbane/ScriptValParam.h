@@ -15,6 +15,7 @@ public:
 
     const OrbID &DataType() const noexcept override;
     Parameter *Clone() const override;
+    std::size_t Footprint() const noexcept override;
     // Tables compare by content, whatever the order their keys were set in.
     bool Equals(const Parameter &o) const override;
 

@@ -14,6 +14,7 @@ public:
 
     const OrbID &DataType() const noexcept override;
     Parameter *Clone() const override;
+    std::size_t Footprint() const noexcept override;
     bool Equals(const Parameter &o) const override;
 
     OrbString Value;

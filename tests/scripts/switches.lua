@@ -50,7 +50,10 @@ local wrapped = orbane.State({ tool = tool, input = "Clip" })
 local plain = orbane.State({ tool = tool, input = "Invert" })
 check.eq(wrapped.height > plain.height, true, "a long label wraps onto more lines")
 
--- The button runs its script with tool, self and modifiers.
-tool_pressed = nil
+-- The button runs its script with the tool in view; the script's write is
+-- one undo step like any other.
+orbane.SetValue(tool, "Invert", 1)
 orbane.Click({ tool = tool, input = "Reset", child = "button" })
-check.eq(tool_pressed, 1, "the button's script ran")
+check.eq(orbane.GetValue(tool, "Invert"), 0, "the button's script wrote the Input")
+orbane.Undo()
+check.eq(orbane.GetValue(tool, "Invert"), 1, "the script's write is undone")

@@ -44,4 +44,12 @@ void ChangeSet::Reindex()
         mIndex.emplace(Key(mEntries[i].input.get(), mEntries[i].slot), i);
 }
 
+std::size_t ChangeSet::Footprint() const noexcept
+{
+    std::size_t bytes = 0;
+    for (const Entry &e : mEntries)
+        bytes += sizeof(Entry) + sizeof(std::pair<Key, std::size_t>) + (e.held ? e.held->Footprint() : 0);
+    return bytes;
+}
+
 } // namespace Orbane

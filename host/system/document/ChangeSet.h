@@ -25,6 +25,8 @@ public:
     void Prune();
 
     std::size_t Size() const noexcept { return mEntries.size(); }
+    // About how many bytes the held values and their bookkeeping take.
+    std::size_t Footprint() const noexcept;
     bool IsEmpty() const noexcept { return mEntries.empty(); }
 
 private:

@@ -1,13 +1,14 @@
 #include "orbane/ImageParam.h"
 
 #include "orbane/ClassIDs.h"
+#include "orbane/ImageFile.h"
 
 namespace Orbane {
 
 ImageParam::ImageParam(OrbString path) : Path(std::move(path))
 {
     if (!Path.IsEmpty())
-        Image.load(QString::fromUtf8(Path.c_str()));
+        Image = ImageFile::Read(QString::fromUtf8(Path.c_str()));
 }
 
 const OrbID &ImageParam::DataType() const noexcept
@@ -18,6 +19,13 @@ const OrbID &ImageParam::DataType() const noexcept
 Parameter *ImageParam::Clone() const
 {
     return new ImageParam(Path, Image);
+}
+
+// The pixels count in full, though copies share them: the history must not
+// hold more than its bound even when every step holds another image.
+std::size_t ImageParam::Footprint() const noexcept
+{
+    return kSmallFootprint + std::size_t(Image.sizeInBytes()) + Path.str().size();
 }
 
 bool ImageParam::Equals(const Parameter &o) const

@@ -31,6 +31,7 @@ OrbaneDoc::OrbaneDoc(QObject *parent)
     qRegisterMetaType<float64>("float64");
     qRegisterMetaType<uint32>("uint32");
     qRegisterMetaType<Operator *>("Orbane::Operator*");
+    SetUndoBounds(kMaxUndoSteps, kMaxUndoBytes);
     mPrefs.Set(PREF_ExportSplineMode, 0);
     mPrefs.Set(PREF_SelectPointsFromMultiPolies, 0);
 }
@@ -118,11 +119,18 @@ int OrbaneDoc::UndoDepth() const noexcept
     return mRecorder->Depth();
 }
 
+void OrbaneDoc::SetUndoBounds(int steps, std::size_t bytes)
+{
+    mRecorder->SetBounds(steps, bytes);
+}
+
+// Dropped steps are gone from the history as the user sees it.
 QStringList OrbaneDoc::UndoNames() const
 {
     QStringList names;
     for (int i = 0; i < mUndoStack->index(); ++i)
-        names << mUndoStack->text(i);
+        if (mRecorder->StepAt(i))
+            names << mUndoStack->text(i);
     return names;
 }
 
@@ -136,7 +144,7 @@ QStringList OrbaneDoc::RedoNames() const
 
 bool OrbaneDoc::CanUndo() const
 {
-    return UndoDepth() == 0 && mUndoStack->canUndo();
+    return UndoDepth() == 0 && mUndoStack->canUndo() && mRecorder->StepAt(mUndoStack->index() - 1);
 }
 
 bool OrbaneDoc::CanRedo() const

@@ -2,6 +2,8 @@
 
 #include "orbane/ClassIDs.h"
 
+#include <cstring>
+
 namespace Orbane {
 
 namespace {
@@ -42,6 +44,24 @@ const OrbID &ScriptValParam::DataType() const noexcept
 Parameter *ScriptValParam::Clone() const
 {
     return new ScriptValParam(DeepCopy(Value));
+}
+
+namespace {
+
+std::size_t FootprintOf(const ScriptVal &v)
+{
+    std::size_t bytes = sizeof(ScriptVal) + (v.IsString() ? std::strlen(v.GetString()) : 0);
+    if (v.IsTable())
+        for (const ScriptVal::Entry &entry : v.GetEntries())
+            bytes += FootprintOf(entry.first) + FootprintOf(entry.second);
+    return bytes;
+}
+
+} // namespace
+
+std::size_t ScriptValParam::Footprint() const noexcept
+{
+    return kSmallFootprint + FootprintOf(Value);
 }
 
 bool ScriptValParam::Equals(const Parameter &o) const

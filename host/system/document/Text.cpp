@@ -14,6 +14,11 @@ Parameter *Text::Clone() const
     return new Text(Value);
 }
 
+std::size_t Text::Footprint() const noexcept
+{
+    return kSmallFootprint + Value.str().size();
+}
+
 bool Text::Equals(const Parameter &o) const
 {
     const auto *s = dynamic_cast<const Text *>(&o);

@@ -24,6 +24,12 @@ void UndoGesture::redo()
     Replay();
 }
 
+void UndoGesture::Drop()
+{
+    mChanges = ChangeSet();
+    mDropped = true;
+}
+
 void UndoGesture::Replay()
 {
     UndoRecorder::Replay replay(mRecorder);

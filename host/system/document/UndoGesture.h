@@ -21,6 +21,11 @@ public:
 
     // The Input slots the step restores.
     std::size_t ChangeCount() const noexcept { return mChanges.Size(); }
+    std::size_t Footprint() const noexcept { return mChanges.Footprint(); }
+    // Lets go of the held values when the history outgrows its memory bound:
+    // the step stays on the stack as an empty shell that cannot be undone.
+    void Drop();
+    bool IsDropped() const noexcept { return mDropped; }
 
 private:
     void Replay();
@@ -28,6 +33,7 @@ private:
     UndoRecorder &mRecorder;
     ChangeSet mChanges;
     bool mPushed = false;
+    bool mDropped = false;
 };
 
 } // namespace Orbane

@@ -50,6 +50,39 @@ void UndoRecorder::Record(Input *in, const Input::Slot &slot, AutoRef<Parameter>
 void UndoRecorder::Push(const QString &name, ChangeSet changes)
 {
     mStack.push(new UndoGesture(*this, name, std::move(changes)));
+    Trim();
+}
+
+void UndoRecorder::SetBounds(int steps, std::size_t bytes)
+{
+    // QUndoStack drops its oldest steps past the count by itself, but takes
+    // a new count only while it is empty.
+    if (mStack.count() == 0)
+        mStack.setUndoLimit(steps);
+    mMaxBytes = bytes;
+}
+
+const UndoGesture *UndoRecorder::StepAt(int i) const
+{
+    const auto *step = dynamic_cast<const UndoGesture *>(mStack.command(i));
+    return step && !step->IsDropped() ? step : nullptr;
+}
+
+// Past the memory bound the oldest steps let go of their values, never the
+// newest step: a history of one step keeps it, however large.
+void UndoRecorder::Trim()
+{
+    std::size_t total = 0;
+    for (int i = 0; i < mStack.count(); ++i)
+        total += StepAt(i) ? StepAt(i)->Footprint() : 0;
+    for (int i = 0; i + 1 < mStack.count() && total > mMaxBytes; ++i) {
+        // The stack hands out its steps as const; they are ours to change.
+        auto *step = const_cast<UndoGesture *>(StepAt(i));
+        if (!step)
+            continue;
+        total -= step->Footprint();
+        step->Drop();
+    }
 }
 
 } // namespace Orbane

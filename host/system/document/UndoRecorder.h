@@ -10,6 +10,8 @@ class QUndoStack;
 
 namespace Orbane {
 
+class UndoGesture;
+
 // Turns the values Inputs store into undo steps on a QUndoStack. Each open
 // StartUndo level keeps a ChangeSet of the slots it touched; the outermost
 // one becomes the step.
@@ -44,13 +46,20 @@ public:
         bool mWas;
     };
 
+    // The bounds of the history; the count only while the stack is empty.
+    void SetBounds(int steps, std::size_t bytes);
+    // The step at the stack's index i, null where it was dropped.
+    const UndoGesture *StepAt(int i) const;
+
 private:
     void Push(const QString &name, ChangeSet changes);
+    void Trim();
 
     QUndoStack &mStack;
     QString mName;
     std::vector<ChangeSet> mLevels;
     bool mReplaying = false;
+    std::size_t mMaxBytes = 0;
 };
 
 } // namespace Orbane

@@ -5,6 +5,7 @@
 #include <QStringList>
 #include <QtGlobal>
 
+#include <algorithm>
 #include <cmath>
 
 namespace Orbane {
@@ -17,10 +18,27 @@ const ScriptVal *Key(const ScriptVal &node, const char *key)
     return node.IsTable() ? node.FindKeyConst(ScriptVal(key)) : nullptr;
 }
 
-int32 IntKey(const ScriptVal &node, const char *key, int32 def)
+// Layout numbers come from look packs, which may come from outside: a grid
+// cell or a size beyond these is refused (with a warning, the default used),
+// before Qt is asked for two billion rows.
+constexpr int32 kMaxCell = 1000;
+constexpr int32 kMaxPixels = 1 << 20;
+
+// A number of the layout rounded to an integer within lo..hi, else def.
+int32 Bounded(const ScriptVal *v, const char *key, int32 def, int32 lo, int32 hi)
 {
-    const ScriptVal *v = Key(node, key);
-    return v && v->IsNumber() ? int32(std::lround(v->GetNumber())) : def;
+    if (!v || !v->IsNumber())
+        return def;
+    const float64 n = std::round(v->GetNumber());
+    if (n >= lo && n <= hi)
+        return int32(n);
+    qWarning("Layout: %s = %g is outside %d..%d", key, v->GetNumber(), lo, hi);
+    return def;
+}
+
+int32 IntKey(const ScriptVal &node, const char *key, int32 def, int32 lo = -1, int32 hi = kMaxPixels)
+{
+    return Bounded(Key(node, key), key, def, lo, hi);
 }
 
 std::string StrKey(const ScriptVal &node, const char *key)
@@ -54,11 +72,11 @@ Qt::Alignment ParseAlign(const std::string &text)
     return align;
 }
 
-// Entry i of a Lua list as an integer; 0 where it is missing or no number.
+// Entry i of a Lua list as an integer; 0 where it is missing, no number or
+// out of range.
 int32 IntAt(const ScriptVal &list, int32 i)
 {
-    const ScriptVal *v = list.FindKeyConst(ScriptVal(i));
-    return v && v->IsNumber() ? int32(std::lround(v->GetNumber())) : 0;
+    return Bounded(list.FindKeyConst(ScriptVal(i)), "list entry", 0, -kMaxPixels, kMaxPixels);
 }
 
 QMargins ParseMargins(const ScriptVal &node)
@@ -67,7 +85,7 @@ QMargins ParseMargins(const ScriptVal &node)
     if (!m)
         return QMargins();
     if (m->IsNumber()) {
-        const int all = int(std::lround(m->GetNumber()));
+        const int all = Bounded(m, "margins", 0, -kMaxPixels, kMaxPixels);
         return QMargins(all, all, all, all);
     }
     return QMargins(IntAt(*m, 1), IntAt(*m, 2), IntAt(*m, 3), IntAt(*m, 4));
@@ -214,13 +232,14 @@ void LayoutBuilder::AddChild(Container &box, std::unique_ptr<LayoutObj> obj, con
     if (!obj)
         return;
     if (box.GetKind() != Container::Grid) {
-        box.Add(std::move(obj), IntKey(node, "stretch", 0));
+        box.Add(std::move(obj), IntKey(node, "stretch", 0, 0, kMaxCell));
         return;
     }
     // Lua counts from 1, Qt's grid from 0.
-    const int32 row = IntKey(node, "row", 1) - 1;
-    const int32 col = IntKey(node, "col", 1) - 1;
-    box.AddAt(std::move(obj), row, col, IntKey(node, "rowspan", 1), IntKey(node, "colspan", 1));
+    const int32 row = IntKey(node, "row", 1, 1, kMaxCell) - 1;
+    const int32 col = IntKey(node, "col", 1, 1, kMaxCell) - 1;
+    box.AddAt(std::move(obj), row, col, IntKey(node, "rowspan", 1, 1, kMaxCell),
+              IntKey(node, "colspan", 1, 1, kMaxCell));
 }
 
 void LayoutBuilder::ApplySizes(LayoutObj &obj, const ScriptVal &node)
@@ -241,10 +260,10 @@ void LayoutBuilder::ApplyBox(Container &box, const ScriptVal &node)
     box.SetSpacing(IntKey(node, "hspacing", spacing), IntKey(node, "vspacing", spacing));
     box.SetMargins(ParseMargins(node));
     if (const ScriptVal *cols = Key(node, "colstretch"))
-        for (int32 i = 1; i <= cols->Length(); ++i)
+        for (int32 i = 1; i <= std::min(cols->Length(), kMaxCell); ++i)
             box.SetColumnStretch(i - 1, IntAt(*cols, i));
     if (const ScriptVal *rows = Key(node, "rowstretch"))
-        for (int32 i = 1; i <= rows->Length(); ++i)
+        for (int32 i = 1; i <= std::min(rows->Length(), kMaxCell); ++i)
             box.SetRowStretch(i - 1, IntAt(*rows, i));
 }
 

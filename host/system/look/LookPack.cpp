@@ -1,6 +1,7 @@
 #include "orbane/LookPack.h"
 
 #include "orbane/LuaRuntime.h"
+#include "orbane/LuaSandbox.h"
 
 #include <QCoreApplication>
 #include <QDir>
@@ -12,21 +13,6 @@ namespace Orbane {
 namespace {
 
 const ScriptVal kNil;
-
-// Look files are data: they get the libraries that compute, not those that
-// reach files, processes or other modules.
-void OpenDataLibraries(lua_State *L)
-{
-    const lua_CFunction libs[] = {luaopen_base, luaopen_table, luaopen_string, luaopen_math};
-    for (lua_CFunction open : libs) {
-        lua_pushcfunction(L, open);
-        lua_call(L, 0, 0);
-    }
-    for (const char *name : {"dofile", "loadfile", "load", "loadstring", "require", "module", "collectgarbage"}) {
-        lua_pushnil(L);
-        lua_setglobal(L, name);
-    }
-}
 
 QString Existing(const QString &path)
 {
@@ -82,25 +68,27 @@ void LookPack::LoadFolder()
 
 bool LookPack::LoadFile(const QString &path)
 {
-    lua_State *L = luaL_newstate();
+    // A state of its own: the pack loads once, maybe before the runtime,
+    // and a look pack from outside is content like any other.
+    lua_State *L = LuaSandbox::NewState();
     if (!L)
         return false;
-    OpenDataLibraries(L);
     const QByteArray file = QFile::encodeName(path);
-    bool ok = luaL_loadfile(L, file.constData()) == 0 && lua_pcall(L, 0, 1, 0) == 0;
-    if (!ok) {
-        const char *message = lua_tostring(L, -1);
-        qWarning("LookPack: %s", message ? message : file.constData());
-    } else if (!lua_istable(L, -1)) {
-        qWarning("LookPack: %s does not return a table of items", file.constData());
+    std::string why;
+    ScriptVal items;
+    bool ok = LuaSandbox::RunFile(L, file.toStdString(), 1, &why) && LuaRuntime::ToScriptVal(L, -1, items, why);
+    if (ok && !items.IsTable()) {
+        why = file.toStdString() + ": the file does not return a table of items";
         ok = false;
-    } else {
-        const ScriptVal items = LuaRuntime::ToScriptVal(L, -1);
+    }
+    if (ok) {
         for (const ScriptVal::Entry &entry : items.GetEntries())
             if (entry.first.IsString())
                 mItems[OrbID(entry.first.GetString())] = entry.second;
+    } else {
+        qWarning("LookPack: %s", why.c_str());
     }
-    lua_close(L);
+    LuaSandbox::CloseState(L);
     return ok;
 }
 

@@ -2,7 +2,9 @@
 
 #include "orbane/LookPack.h"
 
+#include "orbane/ImageFile.h"
 #include <QFileInfo>
+
 #include <QImageReader>
 #include <QPainter>
 #include <QSvgRenderer>
@@ -124,9 +126,9 @@ QImage ResDIB::LoadRaster(qreal dpr) const
     // other ratio is scaled smoothly from the best source.
     QImage source;
     if (dpr > 1.0)
-        source.load(TwinPath(mPath));
+        source = ImageFile::Read(TwinPath(mPath));
     if (source.isNull())
-        source.load(mPath);
+        source = ImageFile::Read(mPath);
     const QSize want(DeviceSize(mSize.width(), dpr), DeviceSize(mSize.height(), dpr));
     if (source.size() != want)
         source = source.scaled(want, Qt::IgnoreAspectRatio, Qt::SmoothTransformation);

@@ -98,6 +98,11 @@ const OrbID &PolyLine::DataType() const noexcept
     return CLSID_DataType_Polyline;
 }
 
+std::size_t PolyLine::Footprint() const noexcept
+{
+    return kSmallFootprint + mPoints.capacity() * sizeof(PolyPoint);
+}
+
 Parameter *PolyLine::Clone() const
 {
     return new PolyLine(*this);

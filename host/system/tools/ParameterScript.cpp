@@ -1,6 +1,7 @@
 #include "orbane/ParameterScript.h"
 
 #include "orbane/ClassIDs.h"
+#include "orbane/ImageFile.h"
 #include "orbane/ImageParam.h"
 #include "orbane/Number.h"
 #include "orbane/OrbIDParam.h"
@@ -10,6 +11,8 @@
 #include "orbane/ScriptVal.h"
 #include "orbane/ScriptValParam.h"
 #include "orbane/Text.h"
+
+#include <QFileInfo>
 
 namespace Orbane {
 
@@ -66,6 +69,15 @@ Parameter *ParameterScript::FromScript(const OrbID &dataType, const ScriptVal &v
     // A shape says itself what is wrong with it (which point, which field).
     if (IsShape(dataType))
         return PolyLineScript::FromScript(dataType, value, error);
+    // An image file that is there but corrupt or too large is refused with
+    // its reason before it is decoded; a file not there yet keeps its path.
+    QString why;
+    const QString image = dataType == CLSID_DataType_Image ? QString::fromUtf8(value.GetString()) : QString();
+    if (!image.isEmpty() && QFileInfo::exists(image) && !ImageFile::Check(image, &why)) {
+        if (error)
+            *error = why.toStdString();
+        return nullptr;
+    }
     if (Parameter *p = Make(dataType, value))
         return p;
     if (error)

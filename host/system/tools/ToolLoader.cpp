@@ -5,6 +5,7 @@
 #include "orbane/Gradient.h"
 #include "orbane/Input.h"
 #include "orbane/LuaRuntime.h"
+#include "orbane/LuaSandbox.h"
 #include "orbane/Operator.h"
 #include "orbane/OrbaneDoc.h"
 #include "orbane/Parameter.h"
@@ -18,12 +19,19 @@
 #include <QDir>
 #include <QFileInfo>
 
+#include <cmath>
+#include <cstdint>
 #include <set>
+#include <string>
 #include <vector>
 
 namespace Orbane {
 
 namespace {
+
+// A comp lists its tools; more than this is not a comp anyone made by hand
+// or by tool, and each one runs a file.
+constexpr int32 kMaxCompTools = 4096;
 
 const char *Str(const ScriptVal &table, const char *key, const char *def)
 {
@@ -44,14 +52,20 @@ std::vector<std::string> Names(const ScriptVal &table, const char *key)
     return names;
 }
 
-// Runs a description file and takes the table it returns.
+// Runs a description file as content (whoever asked for it: tool and comp
+// files come from outside) and takes the table it returns.
 bool RunDescription(const std::string &path, ScriptVal &out, std::string *error)
 {
-    LuaRuntime &lua = LuaRuntime::Instance();
-    if (!lua.RunFile(path, error, 1))
+    lua_State *L = LuaRuntime::Instance().State();
+    if (!LuaSandbox::RunFile(L, path, 1, error))
         return false;
-    out = LuaRuntime::ToScriptVal(lua.State(), -1);
-    lua_pop(lua.State(), 1);
+    std::string why;
+    const bool ok = LuaRuntime::ToScriptVal(L, -1, out, why);
+    lua_pop(L, 1);
+    if (!ok) {
+        *error = path + ": the returned table: " + why;
+        return false;
+    }
     if (!out.IsTable()) {
         *error = path + ": the file must return a table";
         return false;
@@ -80,22 +94,35 @@ bool AddGradientAttr(Tag tag, const ScriptVal &stops, TagList &tags, std::string
     return true;
 }
 
+// A key that is a whole number a tag id can hold, as that tag id; else 0.
+Tag TagOf(const ScriptVal &key)
+{
+    const float64 n = key.GetNumber(-1);
+    return n >= 0 && n <= float64(UINT32_MAX) && n == std::floor(n) ? Tag(n) : 0;
+}
+
 bool AddNumberedAttr(const ScriptVal &key, const ScriptVal &value, TagList &tags, std::string *error)
 {
-    const Tag tag = Tag(key.GetNumber());
+    const Tag tag = TagOf(key);
     const uint32 type = TagTypeOf(tag);
-    if (!key.IsNumber() || type == 0) {
+    if (type == 0) {
         *error = std::string("attrs: keys are tag ids, got ") + key.TypeName();
         return false;
     }
     if (type == TAGTYPE_Object && value.IsTable())
         return AddGradientAttr(tag, value, tags, error);
+    // An integer tag holds what an int64 can; NaN and infinities are no value.
+    const float64 number = value.IsBool() ? float64(value.GetBool()) : value.GetNumber();
+    if (!value.IsString() && !(std::fabs(number) < (type == TAGTYPE_Double ? HUGE_VAL : 9.2e18))) {
+        *error = "attrs: the value of tag " + std::to_string(tag) + " is out of range";
+        return false;
+    }
     if (value.IsString())
         type == TAGTYPE_ID ? tags.Add(tag, OrbID(value.GetString())) : tags.Add(tag, value.GetString());
     else if (type == TAGTYPE_Double)
         tags.Add(tag, value.GetNumber());
     else
-        tags.Add(tag, int64(value.IsBool() ? value.GetBool() : value.GetNumber()));
+        tags.Add(tag, int64(number));
     return true;
 }
 
@@ -104,7 +131,7 @@ bool AddNumberedAttr(const ScriptVal &key, const ScriptVal &value, TagList &tags
 bool AddNumberedAttrs(const ScriptVal &attrs, TagList &tags, std::string *error)
 {
     for (const auto &[key, value] : attrs.GetEntries()) {
-        const bool pair = key.IsNumber() && TagTypeOf(Tag(key.GetNumber())) == 0 && value.IsTable();
+        const bool pair = key.IsNumber() && TagTypeOf(TagOf(key)) == 0 && value.IsTable();
         const ScriptVal *pairTag = pair ? value.FindKeyConst(ScriptVal(1)) : nullptr;
         const ScriptVal *pairValue = pair ? value.FindKeyConst(ScriptVal(2)) : nullptr;
         if (pair && (!pairTag || !pairValue)) {
@@ -260,6 +287,96 @@ bool AddInputFrom(Operator &tool, const ScriptVal &decl, ToolContext &ctx, std::
     return true;
 }
 
+// What a comp file asks of the document, read and checked in full before
+// any of it is applied, so that a comp that fails leaves the document as it
+// was.
+struct CompPlan
+{
+    std::vector<AutoRef<Operator>> tools;
+    const ScriptVal *time = nullptr;
+    const ScriptVal *aspect = nullptr;
+    std::string image;
+    ScriptVal comp;
+};
+
+bool Refuse(std::string *error, const std::string &path, const std::string &why)
+{
+    *error = path + ": " + why;
+    return false;
+}
+
+bool IsFiniteNumber(const ScriptVal *v)
+{
+    return v && v->IsNumber() && std::isfinite(v->GetNumber());
+}
+
+bool ReadCompTools(const OrbaneDoc &doc, const std::string &path, CompPlan &plan, std::string *error)
+{
+    const QDir base = QFileInfo(QString::fromStdString(path)).absoluteDir();
+    const ScriptVal *tools = plan.comp.FindKeyConst(ScriptVal("tools"));
+    if (tools && !tools->IsTable())
+        return Refuse(error, path, "tools must be a list");
+    if (tools && tools->Length() > kMaxCompTools)
+        return Refuse(error, path, "more than " + std::to_string(kMaxCompTools) + " tools");
+    std::set<std::string> names;
+    for (int32 i = 1; tools && i <= tools->Length(); ++i) {
+        const ScriptVal &entry = *tools->FindKeyConst(ScriptVal(i));
+        const char *file = Str(entry, "file", nullptr);
+        if (!file)
+            return Refuse(error, path, "tool " + std::to_string(i) + " names no file");
+        const std::string name = Str(entry, "name", "Tool");
+        if (doc.FindTool(name.c_str()) || !names.insert(name).second)
+            return Refuse(error, path, "cannot add tool \"" + name + "\" (is the name taken?)");
+        AutoRef<Operator> tool(
+            ToolLoader::LoadTool(base.filePath(QString::fromUtf8(file)).toStdString(), name.c_str(), error));
+        if (!tool)
+            return false;
+        plan.tools.push_back(std::move(tool));
+    }
+    return true;
+}
+
+bool ReadComp(const OrbaneDoc &doc, const std::string &path, CompPlan &plan, std::string *error)
+{
+    if (!RunDescription(path, plan.comp, error) || !ReadCompTools(doc, path, plan, error))
+        return false;
+    plan.time = plan.comp.FindKeyConst(ScriptVal("time"));
+    if (plan.time && !IsFiniteNumber(plan.time))
+        return Refuse(error, path, "time must be a finite number");
+    plan.aspect = plan.comp.FindKeyConst(ScriptVal("pixelAspect"));
+    if (plan.aspect && !(IsFiniteNumber(plan.aspect) && plan.aspect->GetNumber() > 0))
+        return Refuse(error, path, "pixelAspect must be a finite number above 0");
+    if (const ScriptVal *image = plan.comp.FindKeyConst(ScriptVal("image"))) {
+        if (!image->IsString())
+            return Refuse(error, path, "image must be a file name");
+        const QDir base = QFileInfo(QString::fromStdString(path)).absoluteDir();
+        plan.image = base.filePath(QString::fromUtf8(image->GetString())).toStdString();
+    }
+    return true;
+}
+
+bool ApplyComp(OrbaneDoc &doc, const std::string &path, const CompPlan &plan, std::string *error)
+{
+    for (std::size_t i = 0; i < plan.tools.size(); ++i) {
+        if (doc.AddTool(plan.tools[i].get()))
+            continue;
+        // Checked before, so only a watcher of the document can get here.
+        const std::string name = plan.tools[i]->GetName();
+        while (i > 0)
+            doc.RemoveTool(plan.tools[--i].get());
+        return Refuse(error, path, "cannot add tool \"" + name + "\"");
+    }
+    doc.SetPref(PREF_CompFolder, QFileInfo(QString::fromStdString(path)).absolutePath().toStdString());
+    if (plan.time)
+        doc.SetCurrentTime(plan.time->GetNumber());
+    // The pixel aspect first, so the image is fitted with it.
+    if (plan.aspect)
+        doc.SetPref(PREF_ViewerPixelAspect, plan.aspect->GetNumber());
+    if (!plan.image.empty())
+        doc.SetPref(PREF_ViewerImage, plan.image);
+    return true;
+}
+
 } // namespace
 
 Operator *ToolLoader::FromTable(const ScriptVal &desc, const char *name, std::string *error, const std::string &dir)
@@ -299,31 +416,10 @@ Operator *ToolLoader::LoadTool(const std::string &path, const char *name, std::s
 
 bool ToolLoader::LoadComp(OrbaneDoc &doc, const std::string &path, std::string *error)
 {
-    ScriptVal comp;
-    if (!RunDescription(path, comp, error))
+    CompPlan plan;
+    if (!ReadComp(doc, path, plan, error))
         return false;
-    const QDir base = QFileInfo(QString::fromStdString(path)).absoluteDir();
-    const ScriptVal *tools = comp.FindKeyConst(ScriptVal("tools"));
-    for (int32 i = 1; tools && i <= tools->Length(); ++i) {
-        const ScriptVal &entry = *tools->FindKeyConst(ScriptVal(i));
-        const std::string file = base.filePath(QString::fromUtf8(Str(entry, "file", ""))).toStdString();
-        AutoRef<Operator> tool(LoadTool(file, Str(entry, "name", "Tool"), error));
-        if (!tool)
-            return false;
-        if (!doc.AddTool(tool.get())) {
-            *error = path + ": cannot add tool \"" + tool->GetName() + "\" (is the name taken?)";
-            return false;
-        }
-    }
-    doc.SetPref(PREF_CompFolder, base.absolutePath().toStdString());
-    if (const ScriptVal *time = comp.FindKeyConst(ScriptVal("time")))
-        doc.SetCurrentTime(time->GetNumber());
-    // The pixel aspect first, so the image is fitted with it.
-    if (const ScriptVal *aspect = comp.FindKeyConst(ScriptVal("pixelAspect")); aspect && aspect->IsNumber())
-        doc.SetPref(PREF_ViewerPixelAspect, aspect->GetNumber());
-    if (const char *image = Str(comp, "image", nullptr))
-        doc.SetPref(PREF_ViewerImage, base.filePath(QString::fromUtf8(image)).toStdString());
-    return true;
+    return ApplyComp(doc, path, plan, error);
 }
 
 } // namespace Orbane

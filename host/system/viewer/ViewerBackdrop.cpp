@@ -1,5 +1,6 @@
 #include "ViewerBackdrop.h"
 
+#include "orbane/ImageFile.h"
 #include <QPainter>
 
 #include <cmath>
@@ -26,7 +27,7 @@ QPixmap CheckerTile()
 
 bool ViewerBackdrop::Load(const QString &path)
 {
-    QImage image(path);
+    const QImage image = ImageFile::Read(path);
     if (image.isNull())
         return false;
     SetImage(image);

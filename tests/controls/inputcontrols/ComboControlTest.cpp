@@ -148,7 +148,7 @@ void ComboControlTest::itemValues()
     QCOMPARE(combo->currentIndex(), -1);
     for (int row = 0; row < values.size(); ++row) {
         if (rows[row] == "-") {
-            // A separator's value is never shown as chosen.
+            // A separator's value selects it, though no row text is shown.
             QVERIFY(in->SetValue(AutoNumber(values[row]), f.doc.GetCurrentTime()));
             QCOMPARE(combo->currentIndex(), -1);
             continue;
@@ -172,6 +172,12 @@ void ComboControlTest::nearestItem_data()
     QTest::newRow("1.6 past the last") << TagList{{kAddString, "A"}, {kAddString, "B"}} << 1.6 << "" << 0.0;
     QTest::newRow("equal distances: the first")
         << TagList{{kAddString, "A"}, {kItemValue, 1.25}, {kAddString, "B"}, {kItemValue, 0.75}} << 1.0 << "A" << 1.25;
+    // A separator is an item of value -1000000: a number within reach of it
+    // selects it, and closing writes that value back.
+    QTest::newRow("near a separator picks it")
+        << TagList{{kAddString, "A"}, {kAddSeparator, ""}, {kAddString, "B"}} << -999999.6 << "" << -1000000.0;
+    QTest::newRow("beyond reach of a separator")
+        << TagList{{kAddString, "A"}, {kAddSeparator, ""}, {kAddString, "B"}} << -999999.4 << "" << 0.0;
     QTest::newRow("nearest of two within reach")
         << TagList{{kAddString, "A"}, {kItemValue, 1.4}, {kAddString, "B"}, {kItemValue, 1.0}} << 1.1 << "B" << 1.0;
 }

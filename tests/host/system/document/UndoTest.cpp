@@ -253,5 +253,53 @@ TEST(UndoLifetimeTest, DocumentGoesWithAnOpenGestureAndSteps)
     EXPECT_EQ(AutoNumber(in, 0.0)->Value, 2.0);
 }
 
+// The history stays within its bounds by dropping its oldest steps: undo
+// then reaches back as far as the newest steps that were kept, never further,
+// and a single step larger than the memory bound is still kept.
+struct BoundCase
+{
+    const char *name;
+    int steps;
+    std::size_t bytes;
+    int textLength; // of each write
+    int writes;     // texts "1", "2", ... repeated to textLength
+    int kept;       // steps left to undo
+};
+
+class UndoBoundTest : public testing::TestWithParam<BoundCase>
+{
+};
+
+TEST_P(UndoBoundTest, DropsTheOldestSteps)
+{
+    const BoundCase &c = GetParam();
+    const auto text = [&c](int i) { return std::string(std::size_t(c.textLength), char('0' + i)); };
+    OrbaneDoc doc;
+    doc.SetUndoBounds(c.steps, c.bytes);
+    AutoRef<Operator> tool(new Operator("Tool1", "Tool"));
+    Input *in = tool->AddInput("Label", "Label", CLSID_DataType_Text, {}, AutoText(text(0).c_str()));
+    doc.AddTool(tool);
+    for (int i = 1; i <= c.writes; ++i)
+        ASSERT_TRUE(in->SetValue(AutoText(text(i).c_str()), 0.0));
+    EXPECT_EQ(doc.UndoNames().size(), c.kept);
+    while (doc.Undo()) {
+    }
+    EXPECT_EQ(AutoText(in, 0.0)->Value.str(), text(c.writes - c.kept)) << "undone to the oldest kept step";
+    for (int i = 0; i < c.kept; ++i)
+        EXPECT_TRUE(doc.Redo());
+    EXPECT_EQ(AutoText(in, 0.0)->Value.str(), text(c.writes)) << "and redone to the newest";
+}
+
+// A step holding a 1000-character text costs somewhat over 1000 bytes.
+const BoundCase kBounds[] = {
+    {"within_both", 100, 1 << 20, 10, 5, 5},
+    {"count", 3, 1 << 20, 10, 5, 3},
+    {"memory", 100, 3500, 1000, 6, 3},
+    {"newest_always_kept", 100, 100, 1000, 3, 1},
+};
+
+INSTANTIATE_TEST_SUITE_P(Bounds, UndoBoundTest, testing::ValuesIn(kBounds),
+                         [](const auto &info) { return std::string(info.param.name); });
+
 } // namespace
 } // namespace Orbane

@@ -171,6 +171,17 @@ private slots:
             { name = "a", row = 1, col = 1 }, { name = "b", row = 1, col = 2 },
             { name = "c", row = 2, col = 1, colspan = 2 } })"
                                    << 200 << "c" << QRect(0, 15, 200, 10);
+        // Numbers out of range are refused (the default taken), not handed
+        // to Qt: a grid of two billion rows, a width past any screen.
+        QTest::newRow("row of 2^31") << R"({ kind = "grid", hspacing = 0, vspacing = 0,
+            { name = "a", row = 2^31, col = 1 }, { name = "b", row = 2, col = 1 } })"
+                                     << 100 << "b" << QRect(0, 10, 100, 10);
+        QTest::newRow("column and span out of range") << R"({ kind = "grid", hspacing = 0, vspacing = 0,
+            { name = "a", row = 1, col = -2^31, colspan = 1e300 }, { name = "b", row = 2, col = 0/0 } })"
+                                                      << 100 << "b" << QRect(0, 10, 100, 10);
+        QTest::newRow("width and margins out of range")
+            << R"({ kind = "hbox", spacing = 0, margins = 1e300, { name = "a", width = 2^40 }, "b" })" << 100 << "a"
+            << QRect(0, 0, 50, 10);
         QTest::newRow("unregistered name left out")
             << R"({ kind = "hbox", spacing = 0, "nosuch", "a" })" << 100 << "a" << QRect(0, 0, 100, 10);
         QTest::newRow("rest in registration order")

@@ -1,0 +1,1 @@
+local ok = pcall(function() return io.open("/etc/passwd") end) return { time = ok and 1 or 0/0 }

@@ -1,0 +1,1 @@
+local c = { tools = {} } c.tools[1] = c return c

@@ -1,0 +1,1 @@
+return { [1] = 2, Nope = 1, [true] = false }
