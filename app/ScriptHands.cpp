@@ -1,6 +1,7 @@
 #include "ScriptHands.h"
 
 #include "orbane/Input.h"
+#include "orbane/LuaRuntime.h"
 #include "orbane/Operator.h"
 #include "orbane/OrbaneDoc.h"
 
@@ -46,25 +47,34 @@ QByteArray ScriptHands::KeyPhase(const LuaArgs &args, int idx)
     return phase;
 }
 
-Operator *ScriptHands::ToolOrRaise(lua_State *L, OrbaneDoc *doc, int idx)
+Operator *ScriptHands::ToolArg(const LuaArgs &args, OrbaneDoc *doc, int idx)
 {
-    Operator *tool = doc->FindTool(luaL_checkstring(L, idx));
+    if (ScriptObject *obj = LuaRuntime::ToObject(args.State(), idx)) {
+        auto *tool = dynamic_cast<Operator *>(obj);
+        if (!tool || doc->FindTool(tool->GetName()) != tool)
+            args.Fail(idx, "tool", "not a tool of the document");
+        return tool;
+    }
+    const char *name = args.String(idx, "tool");
+    Operator *tool = doc->FindTool(name);
     if (!tool)
-        Raise(L, QString("no tool \"%1\"").arg(lua_tostring(L, idx)));
+        args.Fail(idx, "tool", std::string("no tool \"") + name + "\"");
     return tool;
 }
 
-Input *ScriptHands::InputOrRaise(lua_State *L, OrbaneDoc *doc)
+Input *ScriptHands::InputArg(const LuaArgs &args, OrbaneDoc *doc)
 {
-    Input *input = ToolOrRaise(L, doc)->FindInput(OrbID(luaL_checkstring(L, 2)));
+    Operator *tool = ToolArg(args, doc, 1);
+    const char *id = args.String(2, "input");
+    Input *input = tool->FindInput(OrbID(id));
     if (!input)
-        Raise(L, QString("tool \"%1\" has no Input \"%2\"").arg(lua_tostring(L, 1), lua_tostring(L, 2)));
+        args.Fail(2, "input", std::string("tool \"") + tool->GetName() + "\" has no Input \"" + id + "\"");
     return input;
 }
 
-double ScriptHands::TimeArg(lua_State *L, OrbaneDoc *doc, int idx)
+float64 ScriptHands::TimeArg(const LuaArgs &args, OrbaneDoc *doc, int idx)
 {
-    return lua_isnumber(L, idx) ? lua_tonumber(L, idx) : doc->GetCurrentTime();
+    return args.OptNumber(idx, "time", doc->GetCurrentTime());
 }
 
 } // namespace Orbane

@@ -29,13 +29,13 @@ public:
     static int KeyCode(const LuaArgs &args, int idx);
     // "click" (the default), "press" or "release".
     static QByteArray KeyPhase(const LuaArgs &args, int idx);
-    // The tool named by argument `idx`; raises where there is none.
-    static Operator *ToolOrRaise(lua_State *L, OrbaneDoc *doc, int idx = 1);
-    // The Input named by arguments 1 (tool) and 2 (Input id); raises where
-    // either is missing.
-    static Input *InputOrRaise(lua_State *L, OrbaneDoc *doc);
+    // A tool by name, or the tool object a button script is given, if it is
+    // one of the document's; raises naming the argument otherwise.
+    static Operator *ToolArg(const LuaArgs &args, OrbaneDoc *doc, int idx);
+    // The Input named by arguments 1 (tool) and 2 (Input id).
+    static Input *InputArg(const LuaArgs &args, OrbaneDoc *doc);
     // The time at argument `idx`, the document's current time where absent.
-    static double TimeArg(lua_State *L, OrbaneDoc *doc, int idx);
+    static float64 TimeArg(const LuaArgs &args, OrbaneDoc *doc, int idx);
 };
 
 } // namespace Orbane

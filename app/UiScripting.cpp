@@ -55,36 +55,14 @@ QWidget *TargetOrRaise(lua_State *L, int idx, InputControl **control = nullptr)
     return t.widget;
 }
 
-// A tool by name, or the tool object a button script is given, if it is
-// one of the document's.
-Operator *ToolArg(const LuaArgs &args, int idx)
-{
-    if (ScriptObject *obj = LuaRuntime::ToObject(args.State(), idx)) {
-        auto *tool = dynamic_cast<Operator *>(obj);
-        if (!tool || gDoc->FindTool(tool->GetName()) != tool)
-            args.Fail(idx, "tool", "not a tool of the document");
-        return tool;
-    }
-    const char *name = args.String(idx, "tool");
-    Operator *tool = gDoc->FindTool(name);
-    if (!tool)
-        args.Fail(idx, "tool", std::string("no tool \"") + name + "\"");
-    return tool;
-}
-
 Input *InputArg(const LuaArgs &args)
 {
-    Operator *tool = ToolArg(args, 1);
-    const char *id = args.String(2, "input");
-    Input *input = tool->FindInput(OrbID(id));
-    if (!input)
-        args.Fail(2, "input", std::string("tool \"") + tool->GetName() + "\" has no Input \"" + id + "\"");
-    return input;
+    return Hands::InputArg(args, gDoc);
 }
 
 float64 TimeArg(const LuaArgs &args, int idx)
 {
-    return args.OptNumber(idx, "time", gDoc->GetCurrentTime());
+    return Hands::TimeArg(args, gDoc, idx);
 }
 
 void PushNames(lua_State *L, const QStringList &names)

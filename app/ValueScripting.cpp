@@ -4,6 +4,7 @@
 
 #include "orbane/AutoParam.h"
 #include "orbane/Input.h"
+#include "orbane/LuaArgs.h"
 #include "orbane/LuaRuntime.h"
 #include "orbane/Operator.h"
 #include "orbane/OrbaneDoc.h"
@@ -35,8 +36,9 @@ int RaiseStoreError(lua_State *L, Input *input)
 // yet (keeping its value as a key at the current time) and stores the key.
 int SetKey(lua_State *L)
 {
-    Input *input = Hands::InputOrRaise(L, gDoc);
-    const float64 time = luaL_checknumber(L, 4);
+    const LuaArgs args(L, "SetKey");
+    Input *input = Hands::InputArg(args, gDoc);
+    const float64 time = args.Number(4, "time");
     std::string why;
     AutoParameter value(ParameterScript::FromScript(input->GetDataType(), LuaRuntime::ToScriptVal(L, 3), &why));
     if (!value)
@@ -51,7 +53,7 @@ int SetKey(lua_State *L)
 
 int Keys(lua_State *L)
 {
-    const std::vector<float64> times = Hands::InputOrRaise(L, gDoc)->KeyTimes();
+    const std::vector<float64> times = Hands::InputArg(LuaArgs(L, "Keys"), gDoc)->KeyTimes();
     lua_createtable(L, int(times.size()), 0);
     for (std::size_t i = 0; i < times.size(); ++i) {
         lua_pushnumber(L, times[i]);
@@ -62,8 +64,9 @@ int Keys(lua_State *L)
 
 int RemoveKey(lua_State *L)
 {
-    Input *input = Hands::InputOrRaise(L, gDoc);
-    lua_pushboolean(L, input->RemoveKey(luaL_checknumber(L, 3)));
+    const LuaArgs args(L, "RemoveKey");
+    Input *input = Hands::InputArg(args, gDoc);
+    lua_pushboolean(L, input->RemoveKey(args.Number(3, "time")));
     return 1;
 }
 
@@ -71,7 +74,7 @@ int RemoveKey(lua_State *L)
 // control shows the lock at once.
 int SetToolLocked(lua_State *L)
 {
-    Operator *tool = Hands::ToolOrRaise(L, gDoc);
+    Operator *tool = Hands::ToolArg(LuaArgs(L, "SetToolLocked"), gDoc, 1);
     tool->SetLocked(lua_toboolean(L, 2));
     for (Input *in : tool->Inputs())
         in->Notify();
@@ -82,28 +85,30 @@ int SetToolLocked(lua_State *L)
 // does not read changes nothing.
 int ImportShape(lua_State *L)
 {
-    Input *input = Hands::InputOrRaise(L, gDoc);
+    const LuaArgs args(L, "ImportShape");
+    Input *input = Hands::InputArg(args, gDoc);
     std::string why;
-    AutoRef<PolyLine> read(ShapeFile::Import(luaL_checkstring(L, 3), &why));
+    AutoRef<PolyLine> read(ShapeFile::Import(args.String(3, "path"), &why));
     if (!read)
         return Hands::Raise(L, QString::fromStdString(why));
     AutoRef<PolyLine> shape(read->Convert(input->GetDataType()));
     if (!shape)
         return Hands::Raise(
             L, QString("Input \"%1\" takes %2, not a shape").arg(input->GetName(), input->GetDataType().c_str()));
-    if (!input->SetValue(shape.get(), Hands::TimeArg(L, gDoc, 4)))
+    if (!input->SetValue(shape.get(), Hands::TimeArg(args, gDoc, 4)))
         return RaiseStoreError(L, input);
     return 0;
 }
 
 int ExportShape(lua_State *L)
 {
-    Input *input = Hands::InputOrRaise(L, gDoc);
-    AutoParam<PolyLine> shape(input, Hands::TimeArg(L, gDoc, 4));
+    const LuaArgs args(L, "ExportShape");
+    Input *input = Hands::InputArg(args, gDoc);
+    AutoParam<PolyLine> shape(input, Hands::TimeArg(args, gDoc, 4));
     if (!shape)
         return Hands::Raise(L, QString("Input \"%1\" holds no shape").arg(input->GetName()));
     std::string why;
-    if (!ShapeFile::Export(luaL_checkstring(L, 3), *shape, kSvgUnits, kSvgUnits, &why))
+    if (!ShapeFile::Export(args.String(3, "path"), *shape, kSvgUnits, kSvgUnits, &why))
         return Hands::Raise(L, QString::fromStdString(why));
     return 0;
 }

@@ -1,5 +1,7 @@
 #include "polyline/PolyLineControl.h"
 
+#include "framework/OverlayValue.h"
+
 #include "polyline/PolyLineTags.h"
 #include "polyline/ShapeBox.h"
 

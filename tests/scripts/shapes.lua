@@ -27,7 +27,7 @@ check.eq(orbane.UndoNames()[#orbane.UndoNames()], "Change Mask", "one undo step"
 
 check.fails(function()
   orbane.SetValue("Roto1", "Mask", { points = { { x = 0 / 0, y = 0.5 } } })
-end, "point 1: x must be a finite number", "NaN refused")
+end, "NaN and infinities are not values", "NaN refused")
 check.fails(function()
   orbane.SetValue("Roto1", "Mask", { kind = "bspline", points = {} })
 end, "does not suit", "the kind must fit the Input")
