@@ -140,9 +140,11 @@ void ParameterPanel::PredictWidth()
     if (mControls.empty() || verticalScrollBarPolicy() != Qt::ScrollBarAsNeeded)
         return;
     const int32 height = (mBuiltBottom - kSideMargin) * int32(mSlots.size()) + 2 * kSideMargin;
-    const bool shown = !bar->isHidden(), needed = height > viewport()->height();
-    const int32 extent = bar->sizeHint().width();
-    const int32 width = viewport()->width() + (shown ? extent : 0) - (needed ? extent : 0);
+    // The viewport as it would be without scroll bars: whether the bar shows
+    // just now says nothing (the last tool's, or none before the first show).
+    const QSize full = maximumViewportSize();
+    const bool needed = height > full.height();
+    const int32 width = full.width() - (needed ? bar->sizeHint().width() : 0);
     if (width == mLaidOutWidth || width < 1)
         return;
     mLaidOutWidth = width;

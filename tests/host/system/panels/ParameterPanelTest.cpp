@@ -118,6 +118,42 @@ private slots:
         }
     }
 
+    // However the panel came to show a tool, every control fits the view:
+    // shown before the panel itself is, in a panel without a scroll bar
+    // (Qt hides the bar's container, never the bar: the bar says nothing),
+    // or after a tool long enough to need the bar that this one does not.
+    void controlsFitTheViewAfterAnyPath_data()
+    {
+        QTest::addColumn<bool>("showPanelFirst");
+        QTest::addColumn<int>("before");
+        QTest::newRow("tool before the panel shows") << false << 0;
+        QTest::newRow("short tool in a shown panel") << true << 0;
+        QTest::newRow("short tool after a long one") << true << 200;
+        QTest::newRow("long tool after a short one") << true << 3;
+    }
+
+    void controlsFitTheViewAfterAnyPath()
+    {
+        QFETCH(bool, showPanelFirst);
+        QFETCH(int, before);
+        OrbaneDoc doc;
+        Operator *previous = before ? AddCheckBoxTool(doc, "Before1", before) : nullptr;
+        Operator *tool = AddCheckBoxTool(doc, "Shown1", before == 3 ? 200 : 3);
+        ParameterPanel panel(&doc);
+        panel.resize(300, 400);
+        if (showPanelFirst)
+            panel.show();
+        panel.ShowTool(previous);
+        QCoreApplication::processEvents();
+        panel.ShowTool(tool);
+        panel.show();
+        QCoreApplication::processEvents();
+        for (InputControl *c : panel.Controls())
+            QVERIFY2(
+                c->geometry().right() < panel.viewport()->width() && c->width() > panel.viewport()->width() - 20,
+                qPrintable(QString("control %1 wide in a view of %2").arg(c->width()).arg(panel.viewport()->width())));
+    }
+
     // An unknown class gets the fallback and a warning; a registered class
     // whose control is not written yet shows its Input read-only, unwarned.
     void fallbackShowsTheValueReadOnly_data()
