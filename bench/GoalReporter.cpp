@@ -41,10 +41,10 @@ int GoalReporter::PrintGoals(const std::vector<Goal> &goals, std::FILE *out) con
         const bool met = figure <= goal.limit;
         missed += met ? 0 : 1;
         if (ratio && goal.shared)
-            std::fprintf(out, "%s %s: %.2fx %s, after the %.2f us both spend in Qt's dispatch (goal at most %.1f)%s\n",
+            std::fprintf(out, "%s %s: %.2fx %s, after the %.2f us both spend in Qt's dispatch (goal at most %g)%s\n",
                          goal.id, goal.label, figure, goal.against, common * 1e6, goal.limit, met ? "" : "  NOT MET");
         else if (ratio)
-            std::fprintf(out, "%s %s: %.2fx %s (goal at most %.1f)%s\n", goal.id, goal.label, figure, goal.against,
+            std::fprintf(out, "%s %s: %.2fx %s (goal at most %g)%s\n", goal.id, goal.label, figure, goal.against,
                          goal.limit, met ? "" : "  NOT MET");
         else
             std::fprintf(out, "%s %s: %.2f ms (goal under %g ms)%s\n", goal.id, goal.label, figure, goal.limit,

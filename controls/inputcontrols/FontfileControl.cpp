@@ -13,7 +13,7 @@
 #include <QLabel>
 #include <QSet>
 
-#include <memory>
+#include <utility>
 
 namespace Orbane {
 
@@ -23,12 +23,11 @@ constexpr const char *kLayoutItem = "Controls.Fontfile.Layout";
 constexpr const char *kDefaultPreview = "AaBbCc 0123";
 constexpr int kPreviewPointSize = 13;
 
-// The installed families, read when first asked for and freed at unload.
-std::unique_ptr<QSet<QString>> &InstalledFamilies()
-{
-    static std::unique_ptr<QSet<QString>> families;
-    return families;
-}
+// The installed families, read when first asked for and freed by the
+// registration's clean-up, as the angle and ellipse overlays keep their
+// shapes: a plain pointer, because the clean-up may run at exit after the
+// library's own statics are gone.
+QSet<QString> *gFamilies = nullptr;
 
 QString ToQString(const OrbString &s)
 {
@@ -70,18 +69,17 @@ FontfileControl::~FontfileControl() = default;
 
 bool FontfileControl::RegCleanup(Registry *reg)
 {
-    InstalledFamilies().reset();
+    delete std::exchange(gFamilies, nullptr);
     return InputControl::RegCleanup(reg);
 }
 
 bool FontfileControl::IsInstalled(const QString &family)
 {
-    std::unique_ptr<QSet<QString>> &families = InstalledFamilies();
-    if (!families) {
+    if (!gFamilies) {
         const QStringList all = QFontDatabase().families();
-        families = std::make_unique<QSet<QString>>(all.begin(), all.end());
+        gFamilies = new QSet<QString>(all.begin(), all.end());
     }
-    return families->contains(family);
+    return gFamilies->contains(family);
 }
 
 QString FontfileControl::StyleFor(const QString &family, const QString &style)
