@@ -2,6 +2,8 @@
 
 #include "framework/HandleSet.h"
 
+#include "orbane/AutoParam.h"
+#include "orbane/Input.h"
 #include "orbane/PreviewControl.h"
 
 namespace Orbane {
@@ -113,6 +115,19 @@ protected:
     // index `indexes[role]` gives: true where that Input is there (not the
     // main one) and no earlier role names it, for an Input holds one role.
     bool HoldsRole(const int32 *indexes, int32 role) const;
+
+    // AddInput for an overlay that keeps copies of its Inputs' values: binds
+    // `input` as the base does, then hands its value now to `store(index,
+    // value, moved)`, so the Input shows from the moment it is bound.
+    template <class Store> bool AddInputTaking(Input *input, const TagList *tags, Store store)
+    {
+        if (!Base::AddInput(input, tags))
+            return false;
+        const AutoParameter value(input->GetValue(this->GetCurrentTime()));
+        bool moved = false;
+        store(this->IndexOf(input), value.get(), moved);
+        return true;
+    }
 
     // Takes the grab offset a tool or script gives (PCA_GrabOffsetX/Y).
     void ReadGrabOffset(const TagList &tags);

@@ -73,12 +73,8 @@ OrbPoint CropControl::High() const
 // The crop's Inputs show their values from the moment they are bound.
 bool CropControl::AddInput(Input *input, const TagList *tags)
 {
-    if (!HandleOverlay::AddInput(input, tags))
-        return false;
-    const AutoParameter value(input->GetValue(GetCurrentTime()));
-    bool moved = false;
-    Store(IndexOf(input), value.get(), moved);
-    return true;
+    return AddInputTaking(input, tags,
+                          [this](int32 index, const Parameter *value, bool &moved) { Store(index, value, moved); });
 }
 
 void CropControl::Store(int32 index, const Parameter *value, bool &moved)

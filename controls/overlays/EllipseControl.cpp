@@ -198,12 +198,8 @@ void EllipseControl::ReadAttrs(const TagList &tags)
 
 bool EllipseControl::AddInput(Input *input, const TagList *tags)
 {
-    if (!HandleOverlay::AddInput(input, tags))
-        return false;
-    const AutoParameter value(input->GetValue(GetCurrentTime()));
-    bool moved = false;
-    Store(IndexOf(input), value.get(), moved);
-    return true;
+    return AddInputTaking(input, tags,
+                          [this](int32 index, const Parameter *value, bool &moved) { Store(index, value, moved); });
 }
 
 bool EllipseControl::RemoveInput(Input *input, const TagList *tags)

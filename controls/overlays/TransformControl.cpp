@@ -100,12 +100,8 @@ bool TransformControl::SetAttrsTagList(Input *input, const TagList &tags)
 
 bool TransformControl::AddInput(Input *input, const TagList *tags)
 {
-    if (!HandleOverlay::AddInput(input, tags))
-        return false;
-    const AutoParameter value(input->GetValue(GetCurrentTime()));
-    bool moved = false;
-    Store(IndexOf(input), value.get(), moved);
-    return true;
+    return AddInputTaking(input, tags,
+                          [this](int32 index, const Parameter *value, bool &moved) { Store(index, value, moved); });
 }
 
 void TransformControl::ReadInputs()
