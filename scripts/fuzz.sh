@@ -18,7 +18,7 @@ elif [ -n "${1:-}" ]; then
     seconds=$1
     only=${2:-}
 fi
-targets=(tagmap comp expression)
+targets=(tagmap comp expression layout shape)
 [ -n "$only" ] && targets=("$only")
 
 jobs=${JOBS:-$(nproc)}
