@@ -29,6 +29,8 @@ const std::vector<Goal> &Goals()
          "a scan of every point"},
         {"V2", "hover over 100 each of six layer overlays (transform to image), one mouse event",
          "BM_Viewer_HoverLayers/100", nullptr, 0.5, ""},
+        {"T1", "fill a script table of 50,000 keys and find each", "BM_ScriptVal_FillAndFind/50000",
+         "BM_ScriptVal_FillAndFind/500", 200.0, "the time for 500 (100x is linear)"},
     };
     return goals;
 }

@@ -76,6 +76,8 @@ public:
     // passing `tags` on. A value equal to the stored one changes nothing and
     // tells nobody. A value of another data type is refused: false, with a
     // script error naming the Input, its tool and both types.
+    // A Number outside the Input's INPA_MinAllowed..INPA_MaxAllowed is stored
+    // clamped, whoever writes it: a script, a comp or a control.
     // A time at or below TIME_UNDEFINED is an unset or disconnect time; on an
     // animated Input it sets nothing (a sentinel must never become a key),
     // on a plain one it sets the plain value.
@@ -113,6 +115,8 @@ private:
     friend class UndoRecorder;
 
     bool Accepts(const Parameter *value) const;
+    // A copy of `value` as it is stored: Numbers clamped to the allowed range.
+    AutoRef<Parameter> Bounded(const Parameter &value) const;
     bool SlotFor(float64 time, Slot &slot) const;
     const Parameter *Peek(const Slot &slot) const;
     // Puts `value` into `slot` (null removes a key) and returns what was

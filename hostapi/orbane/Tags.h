@@ -87,6 +87,8 @@ enum InputTag : Tag
     INPA_LayoutHeight = 0x10020007,   // a layout object's height
     INPA_ReadOnly = 0x10020032,       // 1: the tool file declared the Input readOnly; its controls
                                       // show the value but do not edit it
+    INPA_MinAllowed = 0x20030000,     // a Number Input's least value: every write is clamped to it
+    INPA_MaxAllowed = 0x20030001,     // a Number Input's greatest value (the slider's allowed range)
     LINKS_Name = 0x30040000,          // label text
     LINKS_SecondName = 0x30040001,    // second label text
 };

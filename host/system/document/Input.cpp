@@ -2,13 +2,17 @@
 
 #include "UndoRecorder.h"
 
+#include "orbane/ClassIDs.h"
 #include "orbane/InputWatcher.h"
+#include "orbane/Number.h"
 #include "orbane/Operator.h"
 #include "orbane/OrbaneDoc.h"
 #include "orbane/ScriptError.h"
+#include "orbane/Tags.h"
 
 #include <algorithm>
 #include <iterator>
+#include <limits>
 
 namespace Orbane {
 
@@ -53,12 +57,12 @@ bool Input::SetValue(Parameter *value, float64 time, uint32 flags, const TagList
     Slot slot;
     if (!SlotFor(time, slot))
         return true;
+    AutoRef<Parameter> copy = Bounded(*value);
     const Parameter *stored = Peek(slot);
-    if (stored && stored->Equals(*value))
+    if (stored && stored->Equals(*copy))
         return true;
     // A watcher may drop the last other reference to this Input.
     const AutoRef<Input> self = AutoRef<Input>::Share(this);
-    AutoRef<Parameter> copy(value->Clone());
     OrbaneDoc *doc = GetDoc();
     if (doc && !(flags & SETVALUE_NoUndo))
         doc->Recorder().Record(this, slot, std::move(copy));
@@ -163,6 +167,20 @@ bool Input::Accepts(const Parameter *value) const
         message += std::string(" of tool \"") + mOperator->GetName() + "\"";
     SetScriptError(message + " takes " + mDataType.str() + ", not " + (value ? value->DataType().str() : "nil"));
     return false;
+}
+
+AutoRef<Parameter> Input::Bounded(const Parameter &value) const
+{
+    AutoRef<Parameter> copy(value.Clone());
+    if (value.DataType() != CLSID_DataType_Number)
+        return copy;
+    float64 &v = static_cast<Number &>(*copy).Value;
+    // An absent bound does not bound; a reversed pair is ordered, as the
+    // slider orders it.
+    constexpr float64 kNone = std::numeric_limits<float64>::infinity();
+    const float64 a = mAttrs.GetDouble(INPA_MinAllowed, -kNone), b = mAttrs.GetDouble(INPA_MaxAllowed, kNone);
+    v = std::clamp(v, std::min(a, b), std::max(a, b));
+    return copy;
 }
 
 bool Input::SlotFor(float64 time, Slot &slot) const

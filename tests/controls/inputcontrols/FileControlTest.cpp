@@ -152,8 +152,8 @@ void FileControlTest::missingMark()
     QCOMPARE(EditOf(c)->toolTip().startsWith("No such"), missing);
 }
 
-// A file chosen inside the comp's folder is written relative to it, and
-// read back from there.
+// A file chosen inside the comp's folder is written relative to it, read
+// back from there, and kept so when the control is unbound.
 void FileControlTest::relativeToComp()
 {
     Disk disk;
@@ -167,6 +167,11 @@ void FileControlTest::relativeToComp()
     QVERIFY(Drop(c, disk.Path("../elsewhere.exr")));
     QCOMPARE(TextOf(f, in), QString("../elsewhere.exr"));
     QCOMPARE(EditOf(c)->property("missing").toBool(), true);
+    // Unbinding writes back what the control holds: still relative, no step.
+    const int steps = f.doc.UndoNames().size();
+    f.Destroy(c);
+    QCOMPARE(TextOf(f, in), QString("../elsewhere.exr"));
+    QCOMPARE(f.doc.UndoNames().size(), steps);
 }
 
 QTEST_MAIN(FileControlTest)

@@ -4,6 +4,7 @@
 #include "orbane/Operator.h"
 #include "orbane/OrbaneDoc.h"
 #include "orbane/ScriptError.h"
+#include "orbane/Tags.h"
 
 #include <QUndoStack>
 
@@ -75,6 +76,24 @@ TEST_F(InputTest, AnimationKeepsTheCurrentValueAsFirstKey)
     blend->SetAnimated(false);
     EXPECT_TRUE(blend->KeyTimes().empty());
     EXPECT_DOUBLE_EQ(NumberAt(blend, 100.0), 2.0);
+}
+
+TEST_F(InputTest, NumbersAreStoredWithinTheAllowedRangeAsKeysToo)
+{
+    Input *mix = tool->AddInput("Mix", "Mix", CLSID_DataType_Number, {{INPA_MinAllowed, 0.0}, {INPA_MaxAllowed, 2.0}},
+                                AutoNumber(1.0));
+    const std::pair<float64, float64> written[] = {{-3.0, 0.0}, {0.5, 0.5}, {2.0, 2.0}, {1e300, 2.0}};
+    for (const auto &[value, stored] : written) {
+        ASSERT_TRUE(mix->SetValue(AutoNumber(value), 0.0));
+        EXPECT_EQ(NumberAt(mix, 0.0), stored) << "written " << value;
+    }
+    mix->SetAnimated(true);
+    ASSERT_TRUE(mix->SetValue(AutoNumber(7.0), 5.0));
+    EXPECT_EQ(NumberAt(mix, 5.0), 2.0);
+    // A value that clamps to the stored one changes nothing: no undo step.
+    const int steps = doc.UndoStack()->count();
+    ASSERT_TRUE(mix->SetValue(AutoNumber(9.0), 5.0));
+    EXPECT_EQ(doc.UndoStack()->count(), steps);
 }
 
 TEST_F(InputTest, WrongTypeIsRefusedAndAnEqualValueWritesNothing)
