@@ -4,6 +4,7 @@
 
 #include <cstdint>
 #include <functional>
+#include <string_view>
 #include <unordered_map>
 
 namespace Orbane {
@@ -28,7 +29,7 @@ struct KeyHash
         case ScriptVal::Number:
             return type ^ std::hash<float64>()(key.GetNumber() == 0.0 ? 0.0 : key.GetNumber());
         case ScriptVal::String:
-            return type ^ std::hash<std::string>()(key.GetString());
+            return type ^ std::hash<std::string_view>()(key.GetString());
         case ScriptVal::Table:
             return type ^ std::hash<const void *>()(&key.GetEntries());
         case ScriptVal::Object:
