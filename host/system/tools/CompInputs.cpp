@@ -19,21 +19,12 @@ namespace Orbane {
 
 namespace {
 
-// Expression hook: the text of a live expression kept on the Input. Inputs
-// keep none yet, so there is nothing to write.
+// Expression hook: the text of the live expression kept on the Input ("" for
+// none). Inputs keep none yet, so there is nothing to write; with them:
+//   return in.HasExpression() ? in.GetExpression() : "";
 std::string ExpressionOf(const Input &)
 {
     return std::string();
-}
-
-// Expression hook: gives the Input its expression back. Until Inputs keep
-// expressions, a comp that has one is refused rather than losing it quietly.
-bool RestoreExpression(Input &in, const std::string &expression, std::string *error)
-{
-    if (expression.empty())
-        return true;
-    *error = std::string("Input \"") + in.GetID().c_str() + "\": this build keeps no expressions";
-    return false;
 }
 
 const char *ModeName(Interpolation mode)
@@ -171,7 +162,7 @@ bool Reader::ReadKeys(const ScriptVal &keys)
 }
 
 // The tool is in no document: these writes record nothing and tell no one.
-bool Apply(InputPlan &plan, std::string *error)
+void Apply(InputPlan &plan, std::vector<CompExpression> &expressions)
 {
     Input &in = *plan.in;
     if (plan.value)
@@ -188,7 +179,8 @@ bool Apply(InputPlan &plan, std::string *error)
                 in.RemoveKey(time, SETVALUE_NoUndo);
     }
     in.SetInterpolation(plan.mode);
-    return RestoreExpression(in, plan.expression, error);
+    if (!plan.expression.empty())
+        expressions.push_back({AutoRef<Input>::Share(&in), plan.expression});
 }
 
 } // namespace
@@ -210,7 +202,8 @@ ScriptVal CompInputs::Save(const Operator &tool, const QDir &base)
     return out;
 }
 
-bool CompInputs::Restore(Operator &tool, const ScriptVal &inputs, const QDir &base, std::string *error)
+bool CompInputs::Restore(Operator &tool, const ScriptVal &inputs, const QDir &base,
+                         std::vector<CompExpression> &expressions, std::string *error)
 {
     if (!inputs.IsTable()) {
         *error = std::string("tool \"") + tool.GetName() + "\": inputs must be a table";
@@ -224,9 +217,22 @@ bool CompInputs::Restore(Operator &tool, const ScriptVal &inputs, const QDir &ba
             return false;
     }
     for (InputPlan &plan : plans)
-        if (!Apply(plan, error))
-            return false;
+        Apply(plan, expressions);
     return true;
+}
+
+// Expression hook: gives the Inputs their expressions once every tool of the
+// comp is in the document (an expression may name a tool later in the file).
+// Until Inputs keep expressions a comp with one is refused rather than quietly
+// losing it; with them, per expression:
+//   if (!e.input->SetExpression(e.text.c_str(), SETVALUE_NoUndo, &why)) -> refuse with `why`
+bool CompInputs::RestoreExpressions(const std::vector<CompExpression> &expressions, std::string *error)
+{
+    if (expressions.empty())
+        return true;
+    *error =
+        std::string("Input \"") + expressions.front().input->GetID().c_str() + "\": this build keeps no expressions";
+    return false;
 }
 
 } // namespace Orbane

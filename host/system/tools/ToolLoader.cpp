@@ -301,6 +301,7 @@ struct CompPlan
     const ScriptVal *aspect = nullptr;
     std::string image;
     ScriptVal comp;
+    std::vector<CompExpression> expressions;
 };
 
 bool Refuse(std::string *error, const std::string &path, const std::string &why)
@@ -315,12 +316,12 @@ bool IsFiniteNumber(const ScriptVal *v)
 }
 
 // A tool entry's Inputs and lock, given to its fresh tool.
-bool RestoreTool(Operator &tool, const ScriptVal &entry, const QDir &base, std::string *error)
+bool RestoreTool(Operator &tool, const ScriptVal &entry, const QDir &base, CompPlan &plan, std::string *error)
 {
     if (const ScriptVal *locked = entry.FindKeyConst(ScriptVal("locked")))
         tool.SetLocked(locked->GetBool());
     const ScriptVal *inputs = entry.FindKeyConst(ScriptVal("inputs"));
-    return !inputs || CompInputs::Restore(tool, *inputs, base, error);
+    return !inputs || CompInputs::Restore(tool, *inputs, base, plan.expressions, error);
 }
 
 // `doc` is the document the tools join, whose names they must not take;
@@ -347,7 +348,7 @@ bool ReadCompTools(const OrbaneDoc *doc, const std::string &path, CompPlan &plan
         if (!tool)
             return false;
         std::string why;
-        if (!RestoreTool(*tool, entry, base, &why))
+        if (!RestoreTool(*tool, entry, base, plan, &why))
             return Refuse(error, path, why);
         plan.tools.push_back(std::move(tool));
     }
@@ -401,6 +402,11 @@ bool ApplyComp(OrbaneDoc &doc, const std::string &path, const CompPlan &plan, st
         while (i > 0)
             doc.RemoveTool(plan.tools[--i].get());
         return Refuse(error, path, "cannot add tool \"" + name + "\"");
+    }
+    if (std::string why; !CompInputs::RestoreExpressions(plan.expressions, &why)) {
+        for (const AutoRef<Operator> &tool : plan.tools)
+            doc.RemoveTool(tool.get());
+        return Refuse(error, path, why);
     }
     doc.SetPref(PREF_CompFolder, QFileInfo(QString::fromStdString(path)).absolutePath().toStdString());
     if (plan.time)
