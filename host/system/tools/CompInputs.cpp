@@ -12,6 +12,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstring>
 #include <utility>
 #include <vector>
 
@@ -32,10 +33,34 @@ const char *ModeName(Interpolation mode)
     return mode == Interpolation::Smooth ? "smooth" : "linear";
 }
 
+// A script table's keys in a fixed order (numbers, then texts, then the
+// rest), since Lua hands them out in no order: saving the same work twice
+// writes the same text, and comps compare line by line.
+ScriptVal Sorted(const ScriptVal &v, int depth = 0)
+{
+    if (!v.IsTable() || depth > 64)
+        return v;
+    ScriptVal::Entries entries = v.GetEntries();
+    std::stable_sort(entries.begin(), entries.end(), [](const ScriptVal::Entry &a, const ScriptVal::Entry &b) {
+        const int ra = a.first.IsNumber() ? 0 : a.first.IsString() ? 1 : 2;
+        const int rb = b.first.IsNumber() ? 0 : b.first.IsString() ? 1 : 2;
+        if (ra != rb || ra == 2)
+            return ra < rb;
+        return ra == 0 ? a.first.GetNumber() < b.first.GetNumber()
+                       : std::strcmp(a.first.GetString(), b.first.GetString()) < 0;
+    });
+    ScriptVal out = ScriptVal::NewTable();
+    for (const ScriptVal::Entry &e : entries)
+        out.InsertNew(e.first, Sorted(e.second, depth + 1));
+    return out;
+}
+
 // Image paths relative to the comp, so a comp moves with its folder.
 ScriptVal ValueOut(const Input &in, const Parameter *value, const QDir &base)
 {
     ScriptVal v = ParameterScript::ToScript(value);
+    if (in.GetDataType() == CLSID_DataType_ScriptVal)
+        return Sorted(v);
     if (in.GetDataType() == CLSID_DataType_Image && v.IsString() && *v.GetString())
         v = ScriptVal(CompInputs::PathFrom(base, v.GetString()));
     return v;

@@ -68,10 +68,18 @@ bool CompWriter::Write(const OrbaneDoc &doc, const std::string &path, std::strin
         return false;
     }
     QSaveFile out(file);
-    const bool ok = out.open(QIODevice::WriteOnly) &&
-                    out.write(text.data(), qint64(text.size())) == qint64(text.size()) && out.commit();
+    const qint64 size = qint64(text.size());
+    // A disk that takes part of a write (full, or past a size limit) shows
+    // only in the size of what landed, so that is checked before the rename.
+    const bool written =
+        out.open(QIODevice::WriteOnly) && out.write(text.data(), size) == size && out.flush() && out.size() == size;
+    if (!written)
+        out.cancelWriting();
+    const bool ok = written && out.commit();
     if (!ok)
-        *error = path + ": cannot write: " + out.errorString().toStdString();
+        *error =
+            path + ": cannot write: " +
+            (out.error() != QFileDevice::NoError ? out.errorString().toStdString() : "the disk took only part of it");
     return ok;
 }
 
