@@ -15,8 +15,6 @@
 #include "orbane/ScriptVal.h"
 #include "orbane/ShapeFile.h"
 
-#include <cmath>
-
 namespace Orbane {
 
 namespace {
@@ -42,8 +40,6 @@ int SetKey(lua_State *L)
     const LuaArgs args(L, "SetKey");
     Input *input = Hands::InputArg(args, gDoc);
     const float64 time = args.Number(4, "time");
-    if (!std::isfinite(time))
-        return Hands::Raise(L, QString("Input \"%1\": a key needs a finite time").arg(input->GetName()));
     const ScriptVal given = LuaRuntime::ToScriptVal(L, 3);
     // Script tables may hold what they like; the values that blend may not.
     if (input->GetDataType() != CLSID_DataType_ScriptVal && !ParameterScript::IsFinite(given))
