@@ -10,6 +10,7 @@
 #include <QTemporaryDir>
 
 #include <cstdio>
+#include <cstdlib>
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t *data, std::size_t size)
 {
@@ -23,8 +24,15 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t *data, std::size_t size)
     }
     std::string error;
     {
+        // What loads must save, and what it saves must load again.
         OrbaneDoc doc;
-        ToolLoader::LoadComp(doc, path, &error);
+        const std::string saved = dir.filePath("saved.lua").toStdString();
+        OrbaneDoc again;
+        if (ToolLoader::LoadComp(doc, path, &error) &&
+            !(ToolLoader::WriteComp(doc, saved, &error) && ToolLoader::OpenComp(again, saved, &error))) {
+            std::fprintf(stderr, "a loaded comp did not save and load again: %s\n", error.c_str());
+            std::abort();
+        }
     }
     AutoRef<Operator> tool(ToolLoader::LoadTool(path, "Fuzz1", &error));
     return 0;

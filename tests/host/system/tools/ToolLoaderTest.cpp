@@ -114,6 +114,34 @@ const CompCase kBadComps[] = {
      "local t = {} for i = 1, 5000 do t[i] = { file = 'tool.lua', name = 'T' .. i } end "
      "return { tools = t }",
      "", "more than 4096 tools"},
+    // saved work
+    {"newer_version", "return { version = 99, tools = {} }", "", "written by a newer Orbane (comp version 99;"},
+    {"version_text", "return { version = 'two' }", "", "version must be a whole number"},
+    {"truncated", "return { version = 2, tools = { { file = 'tool.lua', name = 'A1', inputs = { Size = { value = 1", "",
+     "near '<eof>'"},
+    {"key_at_nan",
+     "return { tools = { { file = 'tool.lua', name = 'A1', inputs = { Size = { keys = { { 0/0, 1 } } } } } } }", "",
+     "Input \"Size\": key 1 is not at a finite time"},
+    {"key_value_infinite",
+     "return { tools = { { file = 'tool.lua', name = 'A1', inputs = { Size = { keys = { { 0, 1 }, { 2, 1/0 } } } } } } "
+     "}",
+     "", "Input \"Size\": key 2 holds a number that is not finite"},
+    {"missing_input",
+     "return { tools = { { file = 'tool.lua', name = 'A1' }, "
+     "{ file = 'tool.lua', name = 'B1', inputs = { Width = { value = 1 } } } } }",
+     "", "Input \"Width\": tool \"B1\" has no such Input"},
+    {"value_of_another_type",
+     "return { tools = { { file = 'tool.lua', name = 'A1', inputs = { Size = { value = 'big' } } } } }", "",
+     "Input \"Size\": value: expected a value of type Number, got string"},
+    {"unknown_interpolation",
+     "return { tools = { { file = 'tool.lua', name = 'A1', inputs = { Size = { keys = {}, interpolation = 'cubic' } } "
+     "} } }",
+     "", "interpolation is \"linear\" or \"smooth\""},
+    // Given back once the tools are in the document, and taken out with them.
+    {"expression_refused",
+     "return { tools = { { file = 'tool.lua', name = 'A1', inputs = { Size = { value = 1, expression = 'Nope * 2' } } "
+     "} } }",
+     "", "Input \"Size\""},
 };
 
 INSTANTIATE_TEST_SUITE_P(Comps, BadComp, testing::ValuesIn(kBadComps),
