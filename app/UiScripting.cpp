@@ -3,6 +3,7 @@
 #include "MainWindow.h"
 #include "ScriptHands.h"
 #include "UiTarget.h"
+#include "ExpressionScripting.h"
 #include "ValueScripting.h"
 #include "ViewerScripting.h"
 
@@ -367,6 +368,7 @@ void UiScripting::Install(OrbaneDoc *doc, MainWindow *window)
         LuaSandbox::AllowCall(name);
     ViewerScripting::Install(window);
     ValueScripting::Install(doc);
+    ExpressionScripting::Install(doc);
 }
 
 } // namespace Orbane

@@ -46,7 +46,7 @@ Parameter *Input::GetValue(float64 time) const
     return before->second->Interpolate(*after->second, t);
 }
 
-bool Input::SetValue(Parameter *value, float64 time, uint32 flags, const TagList *tags)
+bool Input::StoreValue(Parameter *value, float64 time, uint32 flags, const TagList *tags)
 {
     if (!Accepts(value))
         return false;
@@ -65,6 +65,7 @@ bool Input::SetValue(Parameter *value, float64 time, uint32 flags, const TagList
     else
         Exchange(slot, std::move(copy));
     Notify(tags);
+    ValueChanged();
     return true;
 }
 
@@ -179,6 +180,8 @@ bool Input::SlotFor(float64 time, Slot &slot) const
 
 const Parameter *Input::Peek(const Slot &slot) const
 {
+    if (slot.expression)
+        return mExpression.get();
     if (!slot.keyed)
         return mValue.get();
     const auto it = mKeys.find(slot.time);
@@ -187,6 +190,8 @@ const Parameter *Input::Peek(const Slot &slot) const
 
 AutoRef<Parameter> Input::Exchange(const Slot &slot, AutoRef<Parameter> value)
 {
+    if (slot.expression)
+        return ExchangeExpression(std::move(value));
     if (!slot.keyed) {
         mValue.Swap(value);
         return value;
