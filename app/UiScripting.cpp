@@ -305,7 +305,7 @@ QString TextOf(QWidget *w)
     return QString();
 }
 
-// State(target) -> { visible, enabled, x, y, width, height, text, check }.
+// State(target) -> { visible, enabled, x, y, width, height, text, tip, check }.
 int State(lua_State *L)
 {
     QWidget *w = TargetOrRaise(L, 1);
@@ -321,6 +321,8 @@ int State(lua_State *L)
     }
     lua_pushstring(L, TextOf(w).toUtf8().constData());
     lua_setfield(L, -2, "text");
+    lua_pushstring(L, w->toolTip().toUtf8().constData());
+    lua_setfield(L, -2, "tip");
     if (auto *button = qobject_cast<CustomButton *>(w)) {
         lua_pushinteger(L, button->GetCheck());
         lua_setfield(L, -2, "check");

@@ -29,6 +29,8 @@ const std::vector<Goal> &Goals()
          "a scan of every point"},
         {"V2", "hover over 100 each of six layer overlays (transform to image), one mouse event",
          "BM_Viewer_HoverLayers/100", nullptr, 0.5, ""},
+        {"X1", "time change re-evaluating 1000 expression Inputs", "BM_Expressions_TimeChange/1000",
+         "BM_PlainSetValue_TimeChange/1000", 2.0, "1000 plain SetValue calls"},
     };
     return goals;
 }

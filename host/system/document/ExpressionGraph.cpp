@@ -184,6 +184,14 @@ void ExpressionGraph::Rebuild()
     for (const auto &entry : mNodes)
         if (!entry.second->fixedError.empty())
             SetError(*entry.second, entry.second->fixedError);
+    // Expressions healed by this change (their cycle broken, the Input they
+    // named back) follow at once; their readers follow them.
+    std::vector<Node *> healed;
+    for (Node *node : mOrder)
+        if (node->fixedError.empty() && *node->input->GetExpressionError())
+            healed.push_back(node);
+    for (Node *node : healed)
+        Evaluate(*node);
 }
 
 // Kahn's algorithm: a node is placed once every expression it reads is.

@@ -40,6 +40,9 @@ public:
     // An expression was set, removed or swapped by undo: the order is built
     // again before the next evaluation.
     void Invalidate() noexcept { mDirty = true; }
+    // Builds the order where it changed; expressions that could not be
+    // evaluated before and can now are evaluated.
+    void Settle() { EnsureBuilt(); }
     // Tools came or went: names resolve anew, and every expression follows.
     void ToolsChanged();
     // The time changed: every expression is evaluated in order.

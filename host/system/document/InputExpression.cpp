@@ -67,6 +67,8 @@ bool Input::SetExpression(const char *text, uint32 flags, std::string *why)
     Notify();
     if (undo)
         doc->EndUndo(true);
+    if (doc)
+        doc->Expressions().Settle();
     return true;
 }
 
