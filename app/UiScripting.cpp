@@ -1,9 +1,9 @@
 #include "UiScripting.h"
 
+#include "ExpressionScripting.h"
 #include "MainWindow.h"
 #include "ScriptHands.h"
 #include "UiTarget.h"
-#include "ExpressionScripting.h"
 #include "ValueScripting.h"
 #include "ViewerScripting.h"
 

@@ -92,8 +92,8 @@ void ExpressionGraph::Resolve(Node &node) const
         Input *source = Find(node.input, node.names[i]);
         if (!source || source->GetDataType() != CLSID_DataType_Number) {
             if (node.fixedError.empty())
-                node.fixedError = (source ? "Input \"" + node.names[i] + "\" holds no number"
-                                          : "no Input \"" + node.names[i] + "\"");
+                node.fixedError =
+                    (source ? "Input \"" + node.names[i] + "\" holds no number" : "no Input \"" + node.names[i] + "\"");
             continue;
         }
         node.sources[i] = source;
@@ -246,7 +246,8 @@ void ExpressionGraph::MarkCycles(std::vector<Node *> &left)
         for (;;) {
             Node *next = nullptr;
             for (Input *source : path.back()->sources)
-                if (const auto found = mNodes.find(source); found != mNodes.end() && unplaced.count(found->second.get()))
+                if (const auto found = mNodes.find(source);
+                    found != mNodes.end() && unplaced.count(found->second.get()))
                     next = found->second.get();
             if (!next) // cannot happen: an unplaced node always reads one
                 break;

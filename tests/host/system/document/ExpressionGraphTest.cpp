@@ -81,7 +81,8 @@ TEST(ExpressionGraphTest, ReadersFollowTheInputsTheyNameInDependencyOrder)
          {{"Merge1.Angle", "Mix / 2"}, {"Merge1.Mix", "Blur1.Gain * 10"}, {"Blur1.Gain", "Size + 1"}},
          {"Blur1.Size", 2.0},
          {{"Blur1.Gain", 3.0}, {"Merge1.Mix", 30.0}, {"Merge1.Angle", 15.0}}},
-        {"diamond", {{"Blur1.Gain", "Size * 2"}, {"Merge1.Mix", "Blur1.Size + 1"}, {"Merge1.Angle", "Mix + Blur1.Gain"}},
+        {"diamond",
+         {{"Blur1.Gain", "Size * 2"}, {"Merge1.Mix", "Blur1.Size + 1"}, {"Merge1.Angle", "Mix + Blur1.Gain"}},
          {"Blur1.Size", 5.0},
          {{"Merge1.Angle", 16.0}}},
         {"unrelated write", {{"Merge1.Mix", "Blur1.Size * 2"}}, {"Blur1.Gain", 9.0}, {{"Merge1.Mix", 2.0}}},
@@ -132,7 +133,10 @@ TEST(ExpressionGraphTest, RefusedExpressionsSayWhyAndChangeNothing)
 {
     const RefusedCase cases[] = {
         {"reads itself", {}, {"Blur1.Size", "Size + 1"}, "cycle: Blur1.Size -> Blur1.Size"},
-        {"two Inputs", {{"Blur1.Size", "Gain"}}, {"Blur1.Gain", "Size"}, "cycle: Blur1.Gain -> Blur1.Size -> Blur1.Gain"},
+        {"two Inputs",
+         {{"Blur1.Size", "Gain"}},
+         {"Blur1.Gain", "Size"},
+         "cycle: Blur1.Gain -> Blur1.Size -> Blur1.Gain"},
         {"through three tools' Inputs",
          {{"Blur1.Size", "Merge1.Mix"}, {"Merge1.Mix", "Angle * 2"}},
          {"Merge1.Angle", "Blur1.Size - 1"},
