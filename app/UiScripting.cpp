@@ -1,6 +1,7 @@
 #include "UiScripting.h"
 
 #include "CompScripting.h"
+#include "ExpressionScripting.h"
 #include "MainWindow.h"
 #include "ScriptHands.h"
 #include "UiTarget.h"
@@ -305,7 +306,7 @@ QString TextOf(QWidget *w)
     return QString();
 }
 
-// State(target) -> { visible, enabled, x, y, width, height, text, check }.
+// State(target) -> { visible, enabled, x, y, width, height, text, tip, check }.
 int State(lua_State *L)
 {
     QWidget *w = TargetOrRaise(L, 1);
@@ -321,6 +322,8 @@ int State(lua_State *L)
     }
     lua_pushstring(L, TextOf(w).toUtf8().constData());
     lua_setfield(L, -2, "text");
+    lua_pushstring(L, w->toolTip().toUtf8().constData());
+    lua_setfield(L, -2, "tip");
     if (auto *button = qobject_cast<CustomButton *>(w)) {
         lua_pushinteger(L, button->GetCheck());
         lua_setfield(L, -2, "check");
@@ -369,6 +372,7 @@ void UiScripting::Install(OrbaneDoc *doc, MainWindow *window)
     ViewerScripting::Install(window);
     ValueScripting::Install(doc);
     CompScripting::Install(doc, window);
+    ExpressionScripting::Install(doc);
 }
 
 } // namespace Orbane

@@ -31,6 +31,8 @@ const std::vector<Goal> &Goals()
          "BM_Viewer_HoverLayers/100", nullptr, 0.5, ""},
         {"T1", "fill a script table of 50,000 keys and find each", "BM_ScriptVal_FillAndFind/50000",
          "BM_StdMap_FillAndFind/50000", 3.0, "a std::unordered_map of the same strings"},
+        {"X1", "time change re-evaluating 1000 expression Inputs", "BM_Expressions_TimeChange/1000",
+         "BM_PlainSetValue_TimeChange/1000", 2.0, "1000 plain SetValue calls"},
     };
     return goals;
 }

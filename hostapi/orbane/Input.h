@@ -9,6 +9,7 @@
 #include "orbane/TagList.h"
 
 #include <map>
+#include <string>
 #include <vector>
 
 namespace Orbane {
@@ -46,14 +47,22 @@ class Input : public RefObject, public LockableObject
 {
 public:
     // Where a value lives: the plain value, or the keyframe at `time`.
+    // The expression slot holds the expression's text (a Text), so undo
+    // keeps an expression and the value it wrote in one step.
     struct Slot
     {
         bool keyed = false;
         float64 time = 0.0;
+        bool expression = false;
 
-        bool operator==(const Slot &o) const noexcept { return keyed == o.keyed && (!keyed || time == o.time); }
+        bool operator==(const Slot &o) const noexcept
+        {
+            return expression == o.expression && keyed == o.keyed && (!keyed || time == o.time);
+        }
         bool operator<(const Slot &o) const noexcept
         {
+            if (expression != o.expression)
+                return expression < o.expression;
             return keyed != o.keyed ? keyed < o.keyed : keyed && time < o.time;
         }
     };
@@ -115,6 +124,25 @@ public:
     Interpolation GetInterpolation() const noexcept { return mInterpolation; }
     void SetInterpolation(Interpolation mode);
 
+    // Live expressions. An expression keeps a number Input's value computed
+    // from the time and other Inputs ("Blur1.Size * 2 + time"); the document
+    // evaluates it again when the time or an Input it names changes. A write
+    // with undo (a user's or a script's edit) makes the Input plain again, in
+    // the same undo step; writes without undo leave the expression in place.
+    // The text, or "" where the value is plain.
+    const char *GetExpression() const noexcept;
+    bool HasExpression() const noexcept;
+    // Sets the expression and stores its value at once (null or "" removes
+    // it, keeping the value). With undo unless `flags` has SETVALUE_NoUndo:
+    // expression and value are one step. Refused (false, `why` filled,
+    // nothing changed) where the text does not parse, names no number Input,
+    // would close a cycle, or this Input is animated or holds no number.
+    bool SetExpression(const char *text, uint32 flags = 0, std::string *why = nullptr);
+    // Why a kept expression is not evaluated now ("" where it is): an Input
+    // it names was removed, a cycle came in through loading, the Input was
+    // animated since, or the result is not a number.
+    const char *GetExpressionError() const noexcept { return mExpressionError.c_str(); }
+
     // Watchers are told in the order they were attached. Returns false for a
     // null watcher or one already attached (or, on detach, not attached).
     bool AttachWatcher(InputWatcher *w);
@@ -129,6 +157,7 @@ private:
     friend class Operator;
     friend class ChangeSet;
     friend class UndoRecorder;
+    friend class ExpressionGraph;
 
     bool Accepts(const Parameter *value) const;
     // A copy of `value` as it is stored: Numbers clamped to the allowed range.
@@ -139,6 +168,13 @@ private:
     // there, without undo or notification.
     AutoRef<Parameter> Exchange(const Slot &slot, AutoRef<Parameter> value);
     bool IsWatching(InputWatcher *w) const;
+    // SetValue without the hand-over from an expression to the plain value.
+    bool StoreValue(Parameter *value, float64 time, uint32 flags, const TagList *tags);
+    // Stores the expression slot, with undo unless `flags` has SETVALUE_NoUndo.
+    void StoreExpression(const char *text, uint32 flags);
+    // Tells the document's expressions that this Input's value changed.
+    void ValueChanged();
+    AutoRef<Parameter> ExchangeExpression(AutoRef<Parameter> text);
     void ForgetOperator() noexcept { mOperator = nullptr; }
 
     OrbID mID;
@@ -151,6 +187,8 @@ private:
     std::map<float64, AutoRef<Parameter>> mKeys;
     bool mAnimated = false;
     Interpolation mInterpolation = Interpolation::Linear;
+    AutoRef<Parameter> mExpression; // a Text, or null: the value is plain
+    std::string mExpressionError;
     std::vector<InputWatcher *> mWatchers;
 };
 

@@ -55,10 +55,13 @@ public:
 // Expressions: each bound Input may have an expression field, a one-line
 // edit placed in the layout's "expression" container. It stays hidden until
 // the user asks for it (the context menu's "Expression") or an expression
-// was entered. Return evaluates the text once with the host Parser (the
-// variables `value`, the Input's number now, and `time`) and writes the
-// result as one undo step; the text stays in the field for the next edit.
-// Expressions are not re-evaluated when the time or other values change.
+// was entered, and it shows the Input's live expression whenever it has one
+// (red, with the reason as its tip, where that cannot be evaluated). Return
+// hands the text to the Input as its live expression (Input::SetExpression:
+// `time`, `Size`, `Blur1.Size`), one undo step; a refused text stays in the
+// red field with the reason as tip. A text naming `value` (the Input's number
+// now) is a one-off calculation instead: evaluated once and written, the
+// Input stays plain; the text stays in the field for the next edit.
 class InputControl : public _InputControl, public InputWatcher
 {
     Q_OBJECT
@@ -221,6 +224,15 @@ private:
     QLineEdit *MakeExpressionEdit(int32 index);
     void Relayout();
     bool WriteExpression(int32 index, float64 value);
+    bool EvaluateOnce(int32 index, const char *text);
+    // The field of Input `index`, made and placed where there was none.
+    QLineEdit *EnsureExpressionEdit(int32 index);
+    // Shows `text` in the field (unless the user is typing there), red with
+    // `error` as tip where that is not empty.
+    void ShowExpression(int32 index, const char *text, const QString &error);
+    void HideExpressionField(int32 index);
+    // Follows the live expression of `input` and its error into the fields.
+    void SyncExpression(Input *input);
 
     std::vector<Input *> mInputs; // one reference each
     bool mOpen = false;
@@ -236,6 +248,13 @@ private:
     std::unique_ptr<Layout::Container> mLayout;
     std::vector<QPointer<QLineEdit>> mExpressionEdits; // by Input index
     std::vector<OrbString> mExpressions;               // by Input index
+    // By Input index: the live expression and error of the Input last shown.
+    struct ShownExpression
+    {
+        OrbString text;
+        OrbString error;
+    };
+    std::vector<ShownExpression> mShown;
 };
 
 } // namespace Orbane

@@ -17,6 +17,7 @@ class QUndoStack;
 
 namespace Orbane {
 
+class ExpressionGraph;
 class Input;
 class UndoRecorder;
 
@@ -116,15 +117,19 @@ signals:
 
 private:
     friend class Input;
+    friend class ChangeSet;
     // Where Input::SetValue stores values that are recorded for undo.
     UndoRecorder &Recorder() const noexcept { return *mRecorder; }
     void TellModified();
+    // The live expressions of the Inputs, evaluated in dependency order.
+    ExpressionGraph &Expressions() const noexcept { return *mExpressions; }
 
     float64 mCurrentTime = 0.0;
     TagList mPrefs;
     std::vector<Operator *> mTools; // one reference each
     std::unique_ptr<QUndoStack> mUndoStack;
     std::unique_ptr<UndoRecorder> mRecorder;
+    std::unique_ptr<ExpressionGraph> mExpressions;
     bool mAutoProxy = false;
     std::map<std::string, std::string> mPathMap; // lower-case prefix -> folder
     std::string mCompPath;

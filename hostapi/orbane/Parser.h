@@ -3,6 +3,8 @@
 #include "orbane/Types.h"
 
 #include <memory>
+#include <string>
+#include <vector>
 
 namespace Orbane {
 
@@ -31,6 +33,10 @@ public:
     bool SetExpression(const char *text);
     const char *GetExpression() const;
     bool IsValid() const noexcept;
+    // The variable names `text` uses (defined or not), sorted, without
+    // compiling it; false (GetError set) where it does not parse. Names may
+    // hold dots ("Blur1.Size"), so an expression can name another tool's Input.
+    bool UsedNames(const char *text, std::vector<std::string> &names);
 
     // The value with the variables as they are now. Where there is no valid
     // expression or evaluation fails: NaN, and *ok set false.

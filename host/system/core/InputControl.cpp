@@ -144,6 +144,7 @@ bool InputControl::AddInput(Input *input, const TagList *tags)
     input->IncRef();
     mInputs.push_back(input);
     AttachInput(input, tags);
+    SyncExpression(input);
     return true;
 }
 
@@ -161,6 +162,8 @@ bool InputControl::RemoveInput(Input *input, const TagList *tags)
         delete mExpressionEdits[index].data();
         mExpressionEdits.erase(mExpressionEdits.begin() + std::ptrdiff_t(index));
     }
+    if (index < mShown.size())
+        mShown.erase(mShown.begin() + std::ptrdiff_t(index));
     input->DecRef();
     return true;
 }
@@ -242,6 +245,7 @@ bool InputControl::UpdateDisplay(Input *, const TagList *)
 
 void InputControl::OnInputChanged(Input *input, Parameter *value, const TagList *tags)
 {
+    SyncExpression(input);
     if (!mQuietWrite)
         NotifyChanged(input, value, tags);
 }

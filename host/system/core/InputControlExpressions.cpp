@@ -13,11 +13,41 @@
 #include <QLineEdit>
 #include <QMenu>
 
+#include <algorithm>
+#include <cstring>
+#include <string>
+#include <utility>
+#include <vector>
+
 namespace Orbane {
 
 namespace {
 
 const char kExpressionAction[] = "Expression";
+// The field of an expression that is refused or cannot be evaluated.
+const QColor kErrorBase(0x8a, 0x2c, 0x2c);
+
+// A text naming `value` computes from the number the Input holds now: that
+// is a one-off calculation ("value * 2"); kept live, it would read itself.
+bool NamesValue(const char *text)
+{
+    Parser parser;
+    std::vector<std::string> names;
+    return parser.UsedNames(text, names) && std::find(names.begin(), names.end(), "value") != names.end();
+}
+
+// Red with the reason as tip, or back to the control's own colours.
+void MarkError(QLineEdit *edit, const QString &error)
+{
+    edit->setToolTip(error);
+    edit->setProperty("expressionError", !error.isEmpty());
+    QPalette palette = edit->parentWidget() ? edit->parentWidget()->palette() : QPalette();
+    if (!error.isEmpty()) {
+        palette.setColor(QPalette::Base, kErrorBase);
+        palette.setColor(QPalette::Text, Qt::white);
+    }
+    edit->setPalette(palette);
+}
 
 } // namespace
 
@@ -78,14 +108,18 @@ QLineEdit *InputControl::CreateExpressionEdit(Layout::Container *where, int32 in
     return edit;
 }
 
+QLineEdit *InputControl::EnsureExpressionEdit(int32 index)
+{
+    if (QLineEdit *edit = GetExpressionEdit(index))
+        return edit;
+    Layout::LayoutObj *where = FindLayoutObj("expression");
+    return where && where->AsContainer() ? CreateExpressionEdit(where->AsContainer(), index)
+                                         : CreateExpressionEdit(QRect(), index);
+}
+
 bool InputControl::AddExpressionEdit(int32 index, const TagList *)
 {
-    QLineEdit *edit = GetExpressionEdit(index);
-    if (!edit) {
-        Layout::LayoutObj *where = FindLayoutObj("expression");
-        edit = where && where->AsContainer() ? CreateExpressionEdit(where->AsContainer(), index)
-                                             : CreateExpressionEdit(QRect(), index);
-    }
+    QLineEdit *edit = EnsureExpressionEdit(index);
     if (!edit)
         return false;
     edit->show();
@@ -111,14 +145,26 @@ bool InputControl::RemoveExpressionAt(int32 index)
 {
     if (index < 0 || std::size_t(index) >= mInputs.size())
         return false;
+    Input *in = mInputs[std::size_t(index)];
+    if (in->HasExpression() && !IsLocked()) {
+        OpenUndo();
+        AutoRef<Input>::Share(in)->SetExpression(nullptr);
+        ResetUndo(nullptr);
+    }
+    HideExpressionField(index);
+    return true;
+}
+
+void InputControl::HideExpressionField(int32 index)
+{
     if (std::size_t(index) < mExpressions.size())
         mExpressions[std::size_t(index)] = OrbString();
     if (QLineEdit *edit = GetExpressionEdit(index)) {
         edit->clear();
+        MarkError(edit, QString());
         edit->hide();
     }
     Relayout();
-    return true;
 }
 
 bool InputControl::ExpressionChanged(int32 index, const char *text)
@@ -130,6 +176,64 @@ bool InputControl::ExpressionChanged(int32 index, const char *text)
     Input *in = mInputs[std::size_t(index)];
     if (in->GetDataType() != CLSID_DataType_Number)
         return false;
+    if (NamesValue(text))
+        return EvaluateOnce(index, text);
+    if (IsLocked())
+        return false;
+    std::string why;
+    OpenUndo();
+    const bool ok = AutoRef<Input>::Share(in)->SetExpression(text, 0, &why);
+    ResetUndo(nullptr);
+    if (ok) {
+        mExpressions.resize(mInputs.size());
+        mExpressions[std::size_t(index)] = OrbString(text);
+    }
+    ShowExpression(index, text, QString::fromStdString(why));
+    return ok;
+}
+
+void InputControl::ShowExpression(int32 index, const char *text, const QString &error)
+{
+    QLineEdit *edit = EnsureExpressionEdit(index);
+    if (!edit)
+        return;
+    if (!edit->hasFocus())
+        edit->setText(QString::fromUtf8(text));
+    MarkError(edit, error);
+    if (edit->isHidden()) {
+        edit->show();
+        Relayout();
+    }
+}
+
+void InputControl::SyncExpression(Input *input)
+{
+    for (std::size_t i = 0; i < mInputs.size(); ++i) {
+        if (mInputs[i] != input)
+            continue;
+        const char *text = input->GetExpression();
+        const char *error = input->GetExpressionError();
+        const bool same = i < mShown.size() ? std::strcmp(mShown[i].text.c_str(), text) == 0 &&
+                                                  std::strcmp(mShown[i].error.c_str(), error) == 0
+                                            : !*text && !*error;
+        if (same)
+            continue;
+        mShown.resize(mInputs.size());
+        const OrbString was = std::exchange(mShown[i].text, OrbString(text));
+        mShown[i].error = OrbString(error);
+        mExpressions.resize(mInputs.size());
+        if (*text) {
+            mExpressions[i] = OrbString(text);
+            ShowExpression(int32(i), text, QString::fromUtf8(error));
+        } else if (mExpressions[i] == was) {
+            HideExpressionField(int32(i));
+        }
+    }
+}
+
+bool InputControl::EvaluateOnce(int32 index, const char *text)
+{
+    Input *in = mInputs[std::size_t(index)];
     Parser parser;
     const AutoNumber now(in, GetCurrentTime());
     parser.SetVar("value", now ? now->Value : 0.0);
@@ -137,7 +241,7 @@ bool InputControl::ExpressionChanged(int32 index, const char *text)
     bool ok = parser.SetExpression(text);
     const float64 value = ok ? parser.Evaluate(&ok) : 0.0;
     if (QLineEdit *edit = GetExpressionEdit(index))
-        edit->setToolTip(ok ? QString() : QString::fromUtf8(parser.GetError()));
+        MarkError(edit, ok ? QString() : QString::fromUtf8(parser.GetError()));
     if (!ok)
         return false;
     mExpressions.resize(mInputs.size());

@@ -1,5 +1,9 @@
 #include "ChangeSet.h"
 
+#include "ExpressionGraph.h"
+
+#include "orbane/OrbaneDoc.h"
+
 #include <algorithm>
 
 namespace Orbane {
@@ -28,6 +32,10 @@ void ChangeSet::Swap()
     }
     for (Input *in : touched)
         in->Notify();
+    // Expressions may have come or gone, and what they read has changed.
+    if (!touched.empty())
+        if (OrbaneDoc *doc = touched.front()->GetDoc())
+            doc->Expressions().EvaluateAll();
 }
 
 void ChangeSet::Prune()

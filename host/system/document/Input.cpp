@@ -50,7 +50,7 @@ Parameter *Input::GetValue(float64 time) const
     return KeyBlend::Between(mKeys, after, time, mInterpolation);
 }
 
-bool Input::SetValue(Parameter *value, float64 time, uint32 flags, const TagList *tags)
+bool Input::StoreValue(Parameter *value, float64 time, uint32 flags, const TagList *tags)
 {
     if (!Accepts(value))
         return false;
@@ -75,6 +75,7 @@ bool Input::SetValue(Parameter *value, float64 time, uint32 flags, const TagList
     else
         Exchange(slot, std::move(copy));
     Notify(tags);
+    ValueChanged();
     return true;
 }
 
@@ -214,6 +215,8 @@ bool Input::SlotFor(float64 time, Slot &slot) const
 
 const Parameter *Input::Peek(const Slot &slot) const
 {
+    if (slot.expression)
+        return mExpression.get();
     if (!slot.keyed)
         return mValue.get();
     const auto it = mKeys.find(slot.time);
@@ -222,6 +225,8 @@ const Parameter *Input::Peek(const Slot &slot) const
 
 AutoRef<Parameter> Input::Exchange(const Slot &slot, AutoRef<Parameter> value)
 {
+    if (slot.expression)
+        return ExchangeExpression(std::move(value));
     if (!slot.keyed) {
         mValue.Swap(value);
         return value;

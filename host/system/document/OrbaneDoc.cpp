@@ -1,5 +1,6 @@
 #include "orbane/OrbaneDoc.h"
 
+#include "ExpressionGraph.h"
 #include "UndoRecorder.h"
 
 #include "orbane/AutoRef.h"
@@ -24,7 +25,7 @@ std::string Lower(std::string text)
 
 OrbaneDoc::OrbaneDoc(QObject *parent)
     : QObject(parent), mUndoStack(std::make_unique<QUndoStack>()),
-      mRecorder(std::make_unique<UndoRecorder>(*mUndoStack))
+      mRecorder(std::make_unique<UndoRecorder>(*mUndoStack)), mExpressions(std::make_unique<ExpressionGraph>(*this))
 {
     // Signals carry these by their contract names; queued connections and
     // spies need to know them.
@@ -53,6 +54,7 @@ void OrbaneDoc::SetCurrentTime(float64 time)
     if (time == mCurrentTime)
         return;
     mCurrentTime = time;
+    mExpressions->TimeChanged();
     // Watchers may remove tools while they are told.
     std::vector<AutoRef<Operator>> tools;
     for (Operator *tool : mTools)
@@ -76,6 +78,7 @@ bool OrbaneDoc::AddTool(Operator *tool)
     tool->IncRef();
     tool->SetDoc(this);
     mTools.push_back(tool);
+    mExpressions->ToolsChanged();
     emit toolAdded(tool);
     MarkModified();
     return true;
@@ -92,6 +95,7 @@ bool OrbaneDoc::RemoveTool(Operator *tool)
         return true;
     mTools.erase(it);
     tool->SetDoc(nullptr);
+    mExpressions->ToolsChanged();
     tool->DecRef();
     MarkModified();
     return true;

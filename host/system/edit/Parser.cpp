@@ -43,6 +43,8 @@ struct Parser::Impl
 Parser::Parser() : mImpl(std::make_unique<Impl>())
 {
     mImpl->parser.DefineConst("pi", M_PI);
+    // muParser's own name characters plus the dot of "Tool.Input".
+    mImpl->parser.DefineNameChars("0123456789_.abcdefghijklmnopqrstuvwxyzABCDEFGHIJKLMNOPQRSTUVWXYZ");
 }
 
 Parser::~Parser() = default;
@@ -94,6 +96,28 @@ bool Parser::SetExpression(const char *text)
 {
     mImpl->text = text ? text : "";
     return mImpl->Compile();
+}
+
+bool Parser::UsedNames(const char *text, std::vector<std::string> &names)
+{
+    names.clear();
+    mImpl->valid = false;
+    mImpl->text = text ? text : "";
+    if (mImpl->text.empty()) {
+        mImpl->error = "empty expression";
+        return false;
+    }
+    try {
+        mImpl->parser.SetExpr(mImpl->text);
+        for (const auto &used : mImpl->parser.GetUsedVar())
+            names.push_back(used.first);
+        mImpl->error.clear();
+        return true;
+    } catch (const mu::Parser::exception_type &e) {
+        mImpl->error = e.GetMsg();
+        mImpl->text.clear();
+        return false;
+    }
 }
 
 const char *Parser::GetExpression() const

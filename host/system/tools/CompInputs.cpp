@@ -20,12 +20,10 @@ namespace Orbane {
 
 namespace {
 
-// Expression hook: the text of the live expression kept on the Input ("" for
-// none). Inputs keep none yet, so there is nothing to write; with them:
-//   return in.HasExpression() ? in.GetExpression() : "";
-std::string ExpressionOf(const Input &)
+// The text of the live expression kept on the Input ("" for none).
+std::string ExpressionOf(const Input &in)
 {
-    return std::string();
+    return in.HasExpression() ? in.GetExpression() : "";
 }
 
 const char *ModeName(Interpolation mode)
@@ -246,18 +244,19 @@ bool CompInputs::Restore(Operator &tool, const ScriptVal &inputs, const QDir &ba
     return true;
 }
 
-// Expression hook: gives the Inputs their expressions once every tool of the
-// comp is in the document (an expression may name a tool later in the file).
-// Until Inputs keep expressions a comp with one is refused rather than quietly
-// losing it; with them, per expression:
-//   if (!e.input->SetExpression(e.text.c_str(), SETVALUE_NoUndo, &why)) -> refuse with `why`
+// Gives the Inputs their expressions once every tool of the comp is in the
+// document, since an expression may name a tool later in the file. The
+// values were restored before, so the expressions are no undo steps.
 bool CompInputs::RestoreExpressions(const std::vector<CompExpression> &expressions, std::string *error)
 {
-    if (expressions.empty())
-        return true;
-    *error =
-        std::string("Input \"") + expressions.front().input->GetID().c_str() + "\": this build keeps no expressions";
-    return false;
+    for (const CompExpression &e : expressions) {
+        std::string why;
+        if (!e.input->SetExpression(e.text.c_str(), SETVALUE_NoUndo, &why)) {
+            *error = std::string("Input \"") + e.input->GetID().c_str() + "\": " + why;
+            return false;
+        }
+    }
+    return true;
 }
 
 } // namespace Orbane

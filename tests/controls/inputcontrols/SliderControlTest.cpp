@@ -120,6 +120,8 @@ private slots:
     void typedValues_data();
     void typedValues();
     void typingKeepsEditBox();
+    void liveExpressions_data();
+    void liveExpressions();
     void gradientTrack();
 };
 
@@ -288,6 +290,57 @@ void SliderControlTest::typedValues()
     f.doc.Undo();
     QCOMPARE(f.NumberOf(in), 0.5);
     QCOMPARE(EditOf(c)->text(), before);
+}
+
+void SliderControlTest::liveExpressions_data()
+{
+    QTest::addColumn<QString>("typed");
+    QTest::addColumn<bool>("kept");
+    QTest::addColumn<double>("now");      // Blend after Enter (Size 2, time 5)
+    QTest::addColumn<double>("followed"); // Blend after Size 4 and time 10
+    QTest::addColumn<QString>("tip");
+    QTest::newRow("another Input") << "=Size / 4" << true << 0.5 << 1.0 << "";
+    QTest::newRow("the time") << "= time / 10" << true << 0.5 << 1.0 << "";
+    QTest::newRow("both, other tool's name") << "=Tool1.Size * time / 20" << true << 0.5 << 2.0 << "";
+    QTest::newRow("itself") << "=Blend + 1" << false << 0.25 << 0.25 << "cycle: Tool1.Blend -> Tool1.Blend";
+    QTest::newRow("a missing Input") << "=Blur1.Size" << false << 0.25 << 0.25 << "no Input \"Blur1.Size\"";
+}
+
+// Typed with "=", an expression stays on the Input: the field under the
+// slider shows it and the value follows; a refused one shows red with the
+// reason as tip. Undo takes the expression and its value back.
+void SliderControlTest::liveExpressions()
+{
+    QFETCH(QString, typed);
+    QFETCH(bool, kept);
+    QFETCH(double, now);
+    QFETCH(double, followed);
+    QFETCH(QString, tip);
+    ToolFixture f;
+    f.doc.SetCurrentTime(5.0);
+    Input *size = f.AddNumber("Size", 2.0, Range(0, 100));
+    Input *blend = f.AddNumber("Blend", 0.25, Range(0, 2, {{kPlaces, 3}}));
+    InputControl *c = Slider(f, blend);
+    Type(EditOf(c), typed);
+    QTest::keyClick(EditOf(c), Qt::Key_Return);
+    QCOMPARE(QString(blend->GetExpression()), kept ? typed.mid(1).trimmed() : QString());
+    QCOMPARE(f.NumberOf(blend), now);
+    const QLineEdit *field = c->GetExpressionEdit(0);
+    QVERIFY(field && field->isVisible());
+    QCOMPARE(field->text(), typed.mid(1).trimmed());
+    QCOMPARE(field->toolTip().isEmpty(), tip.isEmpty());
+    QVERIFY2(field->toolTip().contains(tip), qPrintable(field->toolTip()));
+    QCOMPARE(field->palette().color(QPalette::Base) != c->palette().color(QPalette::Base), !tip.isEmpty());
+    QVERIFY(size->SetValue(AutoNumber(4.0), 0.0));
+    f.doc.SetCurrentTime(10.0);
+    QCOMPARE(f.NumberOf(blend), followed);
+    QCOMPARE(EditOf(c)->text(), QString::number(followed, 'f', 3));
+    QCOMPARE(f.doc.UndoNames().size(), kept ? 2 : 1);
+    f.doc.Undo();
+    f.doc.Undo();
+    QCOMPARE(QString(blend->GetExpression()), QString());
+    QCOMPARE(f.NumberOf(blend), 0.25);
+    QCOMPARE(field->isVisible(), !kept); // a refused text stays for the user to mend
 }
 
 // A value that arrives while the user types leaves the text alone; Enter

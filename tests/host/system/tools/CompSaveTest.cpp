@@ -88,6 +88,7 @@ struct RoundTrip
     const char *value; // Lua: the plain value, or null
     const char *keys;  // Lua: { { time, value }, ... } of an animated Input, or null
     Interpolation mode;
+    const char *expression = nullptr; // a live expression kept on the Input
 };
 
 // Every kind of value, plain and animated, with numbers and texts that a
@@ -118,6 +119,7 @@ const RoundTrip kTrips[] = {
      "{ kind = 'bspline', points = { { x = 0.1, y = 0.1 }, { x = 0.5, y = 0.9, weight = 3 }, { x = 0.9, y = 0.1 } } }",
      nullptr, Interpolation::Linear},
     {"image", "Plate", "'%DIR%/plates/grade.png'", nullptr, Interpolation::Linear},
+    {"expression", "Size", "1", nullptr, Interpolation::Linear, "time / 2 + 1"},
 };
 
 class CompRoundTrip : public CompFiles, public testing::WithParamInterface<RoundTrip>
@@ -139,6 +141,8 @@ protected:
             ASSERT_TRUE(v) << why;
             ASSERT_TRUE(in.SetValue(v.get(), 0.0));
         }
+        if (c.expression)
+            ASSERT_TRUE(in.SetExpression(c.expression, 0, &why)) << why;
         if (!c.keys)
             return;
         in.SetAnimated(true);
@@ -158,6 +162,7 @@ void ExpectSame(const Input &a, const Input &b)
 {
     ASSERT_EQ(a.IsAnimated(), b.IsAnimated()) << a.GetID().c_str();
     EXPECT_EQ(a.GetInterpolation(), b.GetInterpolation()) << a.GetID().c_str();
+    EXPECT_STREQ(a.GetExpression(), b.GetExpression()) << a.GetID().c_str();
     ASSERT_EQ(a.KeyTimes(), b.KeyTimes()) << a.GetID().c_str();
     for (const float64 time : a.KeyTimes())
         EXPECT_TRUE(AutoParameter(a.GetKey(time))->Equals(*AutoParameter(b.GetKey(time))))
