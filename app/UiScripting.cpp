@@ -1,5 +1,6 @@
 #include "UiScripting.h"
 
+#include "ImageScripting.h"
 #include "MainWindow.h"
 #include "ScriptHands.h"
 #include "UiTarget.h"
@@ -366,6 +367,7 @@ void UiScripting::Install(OrbaneDoc *doc, MainWindow *window)
     for (const char *name : {"Tools", "GetValue", "SetValue", "GetTime", "SetTime", "UndoNames", "RedoNames"})
         LuaSandbox::AllowCall(name);
     ViewerScripting::Install(window);
+    ImageScripting::Install(doc, window);
     ValueScripting::Install(doc);
 }
 

@@ -20,8 +20,8 @@ struct ClipSequence
     QString pattern; // the path with the frame as '#'s; a still image's path as given
     int32 first = 0; // the first and last frame found
     int32 last = -1;
-    int32 count = 0;   // files found
-    int32 padding = 0; // digits of the frame; 0: a still image
+    int32 count = 0;           // files found
+    int32 padding = 0;         // digits of the frame; 0: a still image
     std::vector<int32> frames; // the frames found, in order
 
     bool IsSequence() const { return padding > 0; }

@@ -26,7 +26,7 @@ public:
     struct Header
     {
         int32 width = 0, height = 0;
-        int32 channels = 0; // in the file; at most four are read
+        int32 channels = 0;   // in the file; at most four are read
         bool isFloat = false; // half or float samples: linear light
         QString format;       // "openexr", "png" ...
     };

@@ -159,9 +159,9 @@ FloatImage ImageFile::ReadLinear(const QString &path, QString *error, const Prog
     const int channels = std::min(spec.nchannels, 4);
     std::vector<float> pixels(std::size_t(spec.width) * std::size_t(spec.height) * std::size_t(channels));
     ProgressRelay relay{progress ? &progress : nullptr};
-    const bool read = in->read_image(0, 0, 0, channels, OIIO::TypeDesc::FLOAT, pixels.data(), OIIO::AutoStride,
-                                     OIIO::AutoStride, OIIO::AutoStride, progress ? RelayProgress : nullptr,
-                                     progress ? &relay : nullptr);
+    const bool read =
+        in->read_image(0, 0, 0, channels, OIIO::TypeDesc::FLOAT, pixels.data(), OIIO::AutoStride, OIIO::AutoStride,
+                       OIIO::AutoStride, progress ? RelayProgress : nullptr, progress ? &relay : nullptr);
     if (relay.stopped)
         return Fail(error, QString("%1: reading stopped").arg(path)), FloatImage();
     if (!read) {
