@@ -98,18 +98,28 @@ void MakeLinear(std::vector<float> &pixels, int channels, bool encoded, bool str
     }
 }
 
-struct ProgressRelay
-{
-    const ImageFile::Progress *progress;
-    bool stopped = false;
-};
+// Rows read between progress reports: small enough for a smooth bar, large
+// enough to cost nothing.
+constexpr int kBandRows = 64;
 
-// OpenImageIO's callback: true stops the read.
-bool RelayProgress(void *opaque, float done)
+// Scanline files are read in bands, with a report after each: OpenImageIO
+// reports the progress of a whole-image read for some formats only. Tiled
+// files are read whole.
+bool ReadPixels(OIIO::ImageInput &in, int channels, float *data, const ImageFile::Progress &progress, bool *stopped)
 {
-    auto *relay = static_cast<ProgressRelay *>(opaque);
-    relay->stopped = relay->stopped || !(*relay->progress)(done);
-    return relay->stopped;
+    const OIIO::ImageSpec &spec = in.spec();
+    if (spec.tile_width > 0)
+        return in.read_image(0, 0, 0, channels, OIIO::TypeDesc::FLOAT, data);
+    const std::size_t rowValues = std::size_t(spec.width) * std::size_t(channels);
+    for (int y = 0; y < spec.height; y += kBandRows) {
+        const int end = std::min(spec.height, y + kBandRows);
+        if (!in.read_scanlines(0, 0, spec.y + y, spec.y + end, 0, 0, channels, OIIO::TypeDesc::FLOAT,
+                               data + std::size_t(y) * rowValues))
+            return false;
+        if (progress && !progress(float(end) / float(spec.height)))
+            return !(*stopped = true);
+    }
+    return true;
 }
 
 } // namespace
@@ -158,11 +168,9 @@ FloatImage ImageFile::ReadLinear(const QString &path, QString *error, const Prog
     const OIIO::ImageSpec &spec = in->spec();
     const int channels = std::min(spec.nchannels, 4);
     std::vector<float> pixels(std::size_t(spec.width) * std::size_t(spec.height) * std::size_t(channels));
-    ProgressRelay relay{progress ? &progress : nullptr};
-    const bool read =
-        in->read_image(0, 0, 0, channels, OIIO::TypeDesc::FLOAT, pixels.data(), OIIO::AutoStride, OIIO::AutoStride,
-                       OIIO::AutoStride, progress ? RelayProgress : nullptr, progress ? &relay : nullptr);
-    if (relay.stopped)
+    bool stopped = false;
+    const bool read = ReadPixels(*in, channels, pixels.data(), progress, &stopped);
+    if (stopped)
         return Fail(error, QString("%1: reading stopped").arg(path)), FloatImage();
     if (!read) {
         const QString why = QString::fromStdString(in->geterror()).trimmed();

@@ -34,8 +34,8 @@ struct FormatRow
     const char *ext;
     OIIO::TypeDesc type;
     int channels;
-    int bits;    // 0: all of the type's
-    float range; // of the written values
+    int bits;     // 0: all of the type's
+    float range;  // of the written values
     bool encoded; // integer samples hold sRGB codes: read back through the curve
 };
 
@@ -60,7 +60,8 @@ float Tolerance(const FormatRow &row, float written)
     if (!row.encoded)
         return 1e-6f;
     const float code = 1.0f / TopCode(row);
-    return FloatImage::SrgbToLinear(std::min(1.0f, written + code)) - FloatImage::SrgbToLinear(std::max(0.0f, written - code));
+    return FloatImage::SrgbToLinear(std::min(1.0f, written + code)) -
+           FloatImage::SrgbToLinear(std::max(0.0f, written - code));
 }
 
 class ImageFormats : public ::testing::TestWithParam<FormatRow>
@@ -103,16 +104,15 @@ TEST_P(ImageFormats, ReadsBackWithinPrecision)
         }
 }
 
-INSTANTIATE_TEST_SUITE_P(
-    Files, ImageFormats,
-    ::testing::Values(FormatRow{"ExrHalf", "exr", OIIO::TypeDesc::HALF, 3, 0, 4.0f, false},
-                      FormatRow{"ExrFloat", "exr", OIIO::TypeDesc::FLOAT, 3, 0, 4.0f, false},
-                      FormatRow{"TiffFloat", "tif", OIIO::TypeDesc::FLOAT, 3, 0, 2.0f, false},
-                      FormatRow{"Tiff16", "tif", OIIO::TypeDesc::UINT16, 3, 0, 1.0f, true},
-                      FormatRow{"Dpx10", "dpx", OIIO::TypeDesc::UINT16, 3, 10, 1.0f, true},
-                      FormatRow{"Png8", "png", OIIO::TypeDesc::UINT8, 3, 0, 1.0f, true},
-                      FormatRow{"Png8Alpha", "png", OIIO::TypeDesc::UINT8, 4, 0, 1.0f, true}),
-    [](const ::testing::TestParamInfo<FormatRow> &info) { return std::string(info.param.name); });
+INSTANTIATE_TEST_SUITE_P(Files, ImageFormats,
+                         ::testing::Values(FormatRow{"ExrHalf", "exr", OIIO::TypeDesc::HALF, 3, 0, 4.0f, false},
+                                           FormatRow{"ExrFloat", "exr", OIIO::TypeDesc::FLOAT, 3, 0, 4.0f, false},
+                                           FormatRow{"TiffFloat", "tif", OIIO::TypeDesc::FLOAT, 3, 0, 2.0f, false},
+                                           FormatRow{"Tiff16", "tif", OIIO::TypeDesc::UINT16, 3, 0, 1.0f, true},
+                                           FormatRow{"Dpx10", "dpx", OIIO::TypeDesc::UINT16, 3, 10, 1.0f, true},
+                                           FormatRow{"Png8", "png", OIIO::TypeDesc::UINT8, 3, 0, 1.0f, true},
+                                           FormatRow{"Png8Alpha", "png", OIIO::TypeDesc::UINT8, 4, 0, 1.0f, true}),
+                         [](const ::testing::TestParamInfo<FormatRow> &info) { return std::string(info.param.name); });
 
 // An 8-bit file shows exactly as it was: the screen's codes are the file's.
 TEST(ImageDisplay, EightBitCodesSurviveTheLinearRoundTrip)
@@ -182,8 +182,7 @@ INSTANTIATE_TEST_SUITE_P(
     Files, BadFiles,
     ::testing::Values(BadRow{"OverTheLimit", "dpx",
                              [](const QString &path) {
-                                 return WriteFlatImage(path.toStdString(), 4, 4, 0.5f) &&
-                                        ClaimSize(path, 9000, 9000);
+                                 return WriteFlatImage(path.toStdString(), 4, 4, 0.5f) && ClaimSize(path, 9000, 9000);
                              },
                              "9000 x 9000 pixels is more than the limit"},
                       BadRow{"Truncated", "exr",
