@@ -240,14 +240,17 @@ void ViewerPanel::SetImage(const QImage &image)
 // through a sequence does not flash.
 void ViewerPanel::OnSizeKnown(QSize size)
 {
-    if (size == ImageSize() && HasImage())
+    const bool sameSize = size == ImageSize();
+    if (sameSize && HasImage())
         return;
     mBackdrop->SetImage(QImage());
     mBackdrop->SetPlaceholderSize(size);
     mLinear = FloatImage();
     mLinearStale = false;
-    FitImage();
+    if (!sameSize)
+        FitImage();
     SendAll(CCMD_ImageChanged, 0);
+    RequestRedraw();
 }
 
 // The view is kept where the size is (a frame of the same sequence).
