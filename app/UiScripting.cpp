@@ -2,6 +2,7 @@
 
 #include "CompScripting.h"
 #include "ExpressionScripting.h"
+#include "ImageScripting.h"
 #include "MainWindow.h"
 #include "ScriptHands.h"
 #include "UiTarget.h"
@@ -370,6 +371,7 @@ void UiScripting::Install(OrbaneDoc *doc, MainWindow *window)
     for (const char *name : {"Tools", "GetValue", "SetValue", "GetTime", "SetTime", "UndoNames", "RedoNames"})
         LuaSandbox::AllowCall(name);
     ViewerScripting::Install(window);
+    ImageScripting::Install(doc, window);
     ValueScripting::Install(doc);
     CompScripting::Install(doc, window);
     ExpressionScripting::Install(doc);

@@ -59,6 +59,9 @@ bool Shoot(QWidget *widget, const QString &dir, const QString &name, QTextStream
 int WriteScreenshots(MainWindow &window, const OrbaneDoc &doc, const QString &dir, QTextStream &out)
 {
     QDir().mkpath(dir);
+    // The comp's picture is read in the background: shoot it, not its placeholder.
+    constexpr int32 kImageWaitMs = 60000;
+    window.Viewer()->WaitForImage(kImageWaitMs);
     const std::pair<const char *, QWidget *> shots[] = {
         {"window", &window}, {"inspector", window.Inspector()}, {"viewer", window.Viewer()}};
     for (const auto &[name, widget] : shots)

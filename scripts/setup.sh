@@ -7,6 +7,7 @@ packages=(
     build-essential cmake pkg-config git
     qtbase5-dev libqt5svg5-dev
     libluajit-5.1-dev luajit libmuparser-dev libpolyclipping-dev libpugixml-dev
+    libopenimageio-dev
     googletest libgtest-dev libbenchmark-dev
     fonts-dejavu-core
     clang libclang-rt-14-dev

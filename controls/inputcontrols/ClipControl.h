@@ -2,7 +2,7 @@
 
 #include "framework/InputGesture.h"
 #include "framework/LabelledInputControl.h"
-#include "inputcontrols/ClipSequence.h"
+#include "orbane/ClipSequence.h"
 
 #include "orbane/OrbString.h"
 

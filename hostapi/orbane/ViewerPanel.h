@@ -1,9 +1,11 @@
 #pragma once
 
+#include "orbane/FloatImage.h"
 #include "orbane/PreviewControl.h"
 #include "orbane/PreviewInfo.h"
 #include "orbane/TagList.h"
 #include "orbane/ViewMapping.h"
+#include "orbane/ViewerImageState.h"
 
 #include <QImage>
 #include <QPointer>
@@ -25,6 +27,7 @@ class Input;
 class Operator;
 class OrbaneDoc;
 class ViewerBackdrop;
+class ViewerImageFeed;
 
 // Shows an image (or a checkerboard) with the overlays of one tool over it.
 //
@@ -65,7 +68,23 @@ public:
     std::vector<PreviewControl *> OverlaysOf(const Input *input) const;
 
     // --- the image ---
-    // False where the file cannot be read; what was shown stays.
+    // Shows a file, or a sequence by a pattern ("plate.####.exr",
+    // "plate.%04d.exr") at the frame of the document's time, read on a
+    // worker thread: the size is known at once, the pixels follow, and the
+    // viewer says how far the read has come and what went wrong (a missing
+    // frame, a corrupt file, one over the pixel limit). Empty: none. The
+    // document's PREF_ViewerImage drives this.
+    void ViewImage(const QString &pathOrPattern);
+    const ViewerImageState &ImageState() const;
+    // Runs the event loop until the read under way ends or `timeoutMs`
+    // passes; true where no read is under way any more. For headless runs
+    // and tests: a window never needs to wait.
+    bool WaitForImage(int32 timeoutMs);
+    // The pixels shown, as linear light (colour pickers, histograms); null
+    // with no image.
+    const FloatImage &LinearImage() const;
+    // Reads the file now, on this thread. False where it cannot be read;
+    // what was shown stays.
     bool LoadImage(const QString &path);
     // A null image shows the checkerboard.
     void SetImage(const QImage &image);
@@ -124,6 +143,8 @@ public:
 
 signals:
     void toolShown(Orbane::Operator *tool);
+    // The image's state changed: a read began, progressed or ended.
+    void imageStateChanged();
 
 protected:
     void paintEvent(QPaintEvent *event) override;
@@ -149,6 +170,9 @@ private:
     void Clear();
     void BuildToolBar();
     void SetMapping(const ViewMapping &mapping);
+    void OnSizeKnown(QSize size);
+    void OnImageReady(const QImage &display, const FloatImage &linear);
+    void OnImageCleared();
     void SendAll(const OrbID &command, uint64 data);
     void RequestRedraw();
     void DrawPass(int32 pass, bool active);
@@ -168,6 +192,9 @@ private:
     Operator *mTool = nullptr;
     std::vector<PreviewControl *> mOverlays; // one reference each
     std::unique_ptr<ViewerBackdrop> mBackdrop;
+    ViewerImageFeed *mFeed;     // a child
+    mutable FloatImage mLinear; // made from the shown image when it came from Qt
+    mutable bool mLinearStale = false;
     std::unique_ptr<HoverIndex> mHoverIndex;
     bool mPlainHover = false;
     int32 mHoverAsked = 0;

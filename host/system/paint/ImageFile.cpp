@@ -1,6 +1,11 @@
 #include "orbane/ImageFile.h"
 
+#include <OpenImageIO/imageio.h>
+
+#include <QFileInfo>
 #include <QImageReader>
+
+#include <algorithm>
 
 namespace Orbane {
 
@@ -13,17 +18,107 @@ bool Fail(QString *error, const QString &why)
     return false;
 }
 
+bool CheckSize(const QString &path, qint64 width, qint64 height, QString *error)
+{
+    if (width * height <= ImageFile::kMaxPixels)
+        return true;
+    return Fail(error, QString("%1: %2 x %3 pixels is more than the limit of %4")
+                           .arg(path)
+                           .arg(width)
+                           .arg(height)
+                           .arg(ImageFile::kMaxPixels));
+}
+
 bool CheckReader(QImageReader &reader, const QString &path, QString *error)
 {
     const QSize size = reader.size();
     if (!reader.canRead() || !size.isValid())
         return Fail(error, QString("%1: not a readable image").arg(path));
-    if (qint64(size.width()) * size.height() > ImageFile::kMaxPixels)
-        return Fail(error, QString("%1: %2 x %3 pixels is more than the limit of %4")
-                               .arg(path)
-                               .arg(size.width())
-                               .arg(size.height())
-                               .arg(ImageFile::kMaxPixels));
+    return CheckSize(path, size.width(), size.height(), error);
+}
+
+// Straight alpha from PNG and TIFF, so the sRGB curve is undone on the
+// colour alone; premultiplied here afterwards.
+OIIO::ImageSpec OpenConfig()
+{
+    OIIO::ImageSpec config;
+    config.attribute("oiio:UnassociatedAlpha", 1);
+    return config;
+}
+
+std::unique_ptr<OIIO::ImageInput> Open(const QString &path, QString *error)
+{
+    if (!QFileInfo(path).isFile())
+        return Fail(error, QString("%1: no such file").arg(path)), nullptr;
+    const OIIO::ImageSpec config = OpenConfig();
+    auto in = OIIO::ImageInput::open(path.toStdString(), &config);
+    if (!in) {
+        const QString why = QString::fromStdString(OIIO::geterror());
+        return Fail(error, QString("%1: not a readable image (%2)").arg(path, why.trimmed())), nullptr;
+    }
+    return in;
+}
+
+bool CheckSpec(const QString &path, const OIIO::ImageSpec &spec, QString *error)
+{
+    if (spec.width <= 0 || spec.height <= 0 || spec.depth > 1 || spec.nchannels <= 0)
+        return Fail(error, QString("%1: not a flat image of at least one pixel").arg(path));
+    return CheckSize(path, spec.width, spec.height, error);
+}
+
+// Does the file hold sRGB-encoded values (rather than linear light)?
+bool IsEncoded(const OIIO::ImageSpec &spec)
+{
+    const QString space = QString::fromStdString(spec.get_string_attribute("oiio:ColorSpace")).toLower();
+    if (space.contains("linear"))
+        return false;
+    if (space.contains("srgb"))
+        return true;
+    return !spec.format.is_floating_point();
+}
+
+// Read values to premultiplied linear light, in place.
+void MakeLinear(std::vector<float> &pixels, int channels, bool encoded, bool straight)
+{
+    const bool alpha = channels == 2 || channels == 4;
+    const int colours = alpha ? channels - 1 : channels;
+    for (std::size_t i = 0; i < pixels.size(); i += std::size_t(channels)) {
+        float *p = &pixels[i];
+        const float a = alpha ? p[channels - 1] : 1.0f;
+        for (int c = 0; c < colours; ++c) {
+            float v = p[c];
+            if (encoded && !straight)
+                v = a > 0.0f ? v / a : 0.0f;
+            if (encoded)
+                v = FloatImage::SrgbToLinear(v);
+            if (encoded || straight)
+                v *= a;
+            p[c] = v;
+        }
+    }
+}
+
+// Rows read between progress reports: small enough for a smooth bar, large
+// enough to cost nothing.
+constexpr int kBandRows = 64;
+
+// Scanline files are read in bands, with a report after each: OpenImageIO
+// reports the progress of a whole-image read for some formats only. Tiled
+// files are read whole.
+bool ReadPixels(OIIO::ImageInput &in, int channels, float *data, const ImageFile::Progress &progress, bool *stopped)
+{
+    const OIIO::ImageSpec &spec = in.spec();
+    if (spec.tile_width > 0)
+        return in.read_image(0, 0, 0, channels, OIIO::TypeDesc::FLOAT, data);
+    const std::size_t rowValues = std::size_t(spec.width) * std::size_t(channels);
+    for (int y = 0; y < spec.height; y += kBandRows) {
+        const int end = std::min(spec.height, y + kBandRows);
+        if (!in.read_scanlines(0, 0, spec.y + y, spec.y + end, 0, 0, channels, OIIO::TypeDesc::FLOAT,
+                               data + std::size_t(y) * rowValues))
+            return false;
+        if (progress && !progress(float(end) / float(spec.height)))
+            return !(*stopped = true);
+    }
     return true;
 }
 
@@ -32,18 +127,60 @@ bool CheckReader(QImageReader &reader, const QString &path, QString *error)
 bool ImageFile::Check(const QString &path, QString *error)
 {
     QImageReader reader(path);
-    return CheckReader(reader, path, error);
+    if (reader.canRead())
+        return CheckReader(reader, path, error);
+    Header header;
+    return ReadHeader(path, &header, error);
 }
 
 QImage ImageFile::Read(const QString &path, QString *error)
 {
     QImageReader reader(path);
+    if (!reader.canRead())
+        return ReadLinear(path, error).ToDisplay();
     if (!CheckReader(reader, path, error))
         return QImage();
     const QImage image = reader.read();
     if (image.isNull())
         Fail(error, QString("%1: %2").arg(path, reader.errorString()));
     return image;
+}
+
+bool ImageFile::ReadHeader(const QString &path, Header *header, QString *error)
+{
+    const auto in = Open(path, error);
+    if (!in || !CheckSpec(path, in->spec(), error))
+        return false;
+    const OIIO::ImageSpec &spec = in->spec();
+    header->width = spec.width;
+    header->height = spec.height;
+    header->channels = spec.nchannels;
+    header->isFloat = spec.format.is_floating_point();
+    header->format = QString::fromUtf8(in->format_name());
+    return true;
+}
+
+FloatImage ImageFile::ReadLinear(const QString &path, QString *error, const Progress &progress)
+{
+    const auto in = Open(path, error);
+    if (!in || !CheckSpec(path, in->spec(), error))
+        return FloatImage();
+    const OIIO::ImageSpec &spec = in->spec();
+    const int channels = std::min(spec.nchannels, 4);
+    std::vector<float> pixels(std::size_t(spec.width) * std::size_t(spec.height) * std::size_t(channels));
+    bool stopped = false;
+    const bool read = ReadPixels(*in, channels, pixels.data(), progress, &stopped);
+    if (stopped)
+        return Fail(error, QString("%1: reading stopped").arg(path)), FloatImage();
+    if (!read) {
+        const QString why = QString::fromStdString(in->geterror()).trimmed();
+        return Fail(error, QString("%1: cannot read the pixels (%2)").arg(path, why)), FloatImage();
+    }
+    // Of two or four channels the last is taken as alpha, as the files
+    // these readers see order them.
+    const bool straight = spec.get_int_attribute("oiio:UnassociatedAlpha", 0) != 0;
+    MakeLinear(pixels, channels, IsEncoded(spec), straight);
+    return FloatImage(spec.width, spec.height, channels, std::move(pixels));
 }
 
 } // namespace Orbane

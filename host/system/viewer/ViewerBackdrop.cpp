@@ -1,6 +1,5 @@
 #include "ViewerBackdrop.h"
 
-#include "orbane/ImageFile.h"
 #include <QPainter>
 
 #include <cmath>
@@ -24,15 +23,6 @@ QPixmap CheckerTile()
 }
 
 } // namespace
-
-bool ViewerBackdrop::Load(const QString &path)
-{
-    const QImage image = ImageFile::Read(path);
-    if (image.isNull())
-        return false;
-    SetImage(image);
-    return true;
-}
 
 void ViewerBackdrop::SetImage(const QImage &image)
 {

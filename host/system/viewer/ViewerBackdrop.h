@@ -6,7 +6,6 @@
 #include <QPixmap>
 
 class QPainter;
-class QString;
 
 namespace Orbane {
 
@@ -23,14 +22,21 @@ public:
     // Checkerboard cells, in image pixels.
     static constexpr int32 CellSize = 32;
 
-    // False where the file cannot be read; the backdrop is then unchanged.
-    bool Load(const QString &path);
     // A null image means "none": the checkerboard.
     void SetImage(const QImage &image);
     bool HasImage() const { return !mImage.isNull(); }
     const QImage &Image() const { return mImage; }
-    int32 Width() const { return HasImage() ? mImage.width() : DefaultWidth; }
-    int32 Height() const { return HasImage() ? mImage.height() : DefaultHeight; }
+    // The checkerboard's size while there is no image: that of a picture on
+    // its way, or of one that could not be read. Empty: the default.
+    void SetPlaceholderSize(QSize size) { mPlaceholder = size; }
+    int32 Width() const
+    {
+        return HasImage() ? mImage.width() : mPlaceholder.isEmpty() ? DefaultWidth : mPlaceholder.width();
+    }
+    int32 Height() const
+    {
+        return HasImage() ? mImage.height() : mPlaceholder.isEmpty() ? DefaultHeight : mPlaceholder.height();
+    }
 
     // Where the image lies in widget pixels (Y down).
     static QRectF WidgetRect(const ViewMapping &m);
@@ -41,6 +47,7 @@ private:
     void PaintImage(QPainter &p, const QRectF &target, const ViewMapping &m, qreal dpr) const;
 
     QImage mImage;
+    QSize mPlaceholder;
     mutable QPixmap mScaled; // the image at the last zoom below 1
     mutable float64 mScaledZoom = 0.0;
     mutable qreal mScaledDpr = 0.0;

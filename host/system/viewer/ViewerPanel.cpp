@@ -3,6 +3,8 @@
 #include "HoverIndex.h"
 #include "QtGPainter.h"
 #include "ViewerBackdrop.h"
+#include "ViewerImageFeed.h"
+#include "ViewerStatusLine.h"
 
 #include "orbane/AutoParam.h"
 #include "orbane/ControlCommands.h"
@@ -14,7 +16,9 @@
 #include "orbane/ScriptVal.h"
 
 #include <QAction>
+#include <QEventLoop>
 #include <QPainter>
+#include <QTimer>
 #include <QToolBar>
 
 #include <algorithm>
@@ -32,7 +36,7 @@ constexpr float64 kNotch = 120.0, kNotchFactor = 1.25;
 } // namespace
 
 ViewerPanel::ViewerPanel(OrbaneDoc *doc, QWidget *parent)
-    : QWidget(parent), mDoc(doc), mBackdrop(std::make_unique<ViewerBackdrop>()),
+    : QWidget(parent), mDoc(doc), mBackdrop(std::make_unique<ViewerBackdrop>()), mFeed(new ViewerImageFeed(this)),
       mHoverIndex(std::make_unique<HoverIndex>())
 {
     setMouseTracking(true);
@@ -49,6 +53,13 @@ ViewerPanel::ViewerPanel(OrbaneDoc *doc, QWidget *parent)
     connect(doc, SIGNAL(toolRemoving(Orbane::Operator *)), this, SLOT(OnToolRemoving(Orbane::Operator *)));
     connect(doc, SIGNAL(prefChanged(uint32)), this, SLOT(OnPrefChanged(uint32)));
     connect(doc, SIGNAL(currentTimeChanged(float64)), this, SLOT(OnTimeChanged(float64)));
+    connect(mFeed, &ViewerImageFeed::sizeKnown, this, &ViewerPanel::OnSizeKnown);
+    connect(mFeed, &ViewerImageFeed::imageReady, this, &ViewerPanel::OnImageReady);
+    connect(mFeed, &ViewerImageFeed::cleared, this, &ViewerPanel::OnImageCleared);
+    connect(mFeed, &ViewerImageFeed::stateChanged, this, [this] {
+        update();
+        emit imageStateChanged();
+    });
     mPixelAspect = doc->GetPrefs().GetDouble(PREF_ViewerPixelAspect, 1.0);
     if (!(mPixelAspect > 0.0) || !std::isfinite(mPixelAspect))
         mPixelAspect = 1.0;
@@ -174,20 +185,100 @@ void ViewerPanel::OnToolRemoving(Operator *tool)
 
 // --- the image ---
 
+void ViewerPanel::ViewImage(const QString &pathOrPattern)
+{
+    mFeed->SetSource(pathOrPattern, mDoc->GetCurrentTime());
+}
+
+const ViewerImageState &ViewerPanel::ImageState() const
+{
+    return mFeed->State();
+}
+
+bool ViewerPanel::WaitForImage(int32 timeoutMs)
+{
+    if (!ImageState().loading)
+        return true;
+    QEventLoop loop;
+    QTimer::singleShot(std::max(timeoutMs, 0), &loop, &QEventLoop::quit);
+    connect(this, &ViewerPanel::imageStateChanged, &loop, [this, &loop] {
+        if (!ImageState().loading)
+            loop.quit();
+    });
+    loop.exec();
+    return !ImageState().loading;
+}
+
+const FloatImage &ViewerPanel::LinearImage() const
+{
+    if (mLinearStale) {
+        mLinear = FloatImage::FromDisplay(mBackdrop->Image());
+        mLinearStale = false;
+    }
+    return mLinear;
+}
+
 bool ViewerPanel::LoadImage(const QString &path)
 {
-    if (!mBackdrop->Load(path))
-        return false;
-    SetImage(mBackdrop->Image());
-    return true;
+    return mFeed->LoadNow(path, nullptr);
 }
 
 void ViewerPanel::SetImage(const QImage &image)
 {
+    mFeed->Forget();
+    mBackdrop->SetPlaceholderSize(QSize());
     mBackdrop->SetImage(image);
+    mLinear = FloatImage();
+    mLinearStale = !image.isNull();
     mUserView = false;
     FitImage();
     SendAll(CCMD_ImageChanged, 0);
+}
+
+// The next picture's size: a new size shows the checkerboard at it until
+// the pixels come; the same size keeps the picture shown, so stepping
+// through a sequence does not flash.
+void ViewerPanel::OnSizeKnown(QSize size)
+{
+    const bool sameSize = size == ImageSize();
+    if (sameSize && HasImage())
+        return;
+    mBackdrop->SetImage(QImage());
+    mBackdrop->SetPlaceholderSize(size);
+    mLinear = FloatImage();
+    mLinearStale = false;
+    if (!sameSize)
+        FitImage();
+    SendAll(CCMD_ImageChanged, 0);
+    RequestRedraw();
+}
+
+// The view is kept where the size is (a frame of the same sequence).
+void ViewerPanel::OnImageReady(const QImage &display, const FloatImage &linear)
+{
+    const bool refit = display.size() != ImageSize();
+    mBackdrop->SetImage(display);
+    mLinear = linear;
+    mLinearStale = false;
+    if (refit)
+        FitImage();
+    SendAll(CCMD_ImageChanged, 0);
+    RequestRedraw();
+}
+
+// Nothing to show: the checkerboard, at the size the picture had, unless
+// there is no source at all.
+void ViewerPanel::OnImageCleared()
+{
+    const QSize size = ImageState().source.isEmpty() ? QSize() : ImageSize();
+    mBackdrop->SetImage(QImage());
+    mBackdrop->SetPlaceholderSize(size);
+    mLinear = FloatImage();
+    mLinearStale = false;
+    if (ImageSize() != QSize(Mapping().ImageWidth(), Mapping().ImageHeight()))
+        FitImage();
+    SendAll(CCMD_ImageChanged, 0);
+    RequestRedraw();
 }
 
 bool ViewerPanel::HasImage() const
@@ -213,13 +304,12 @@ void ViewerPanel::OnPrefChanged(uint32 pref)
         SetPixelAspect(mDoc->GetPrefs().GetDouble(PREF_ViewerPixelAspect, 1.0));
     if (pref != PREF_ViewerImage)
         return;
-    const char *path = mDoc->GetPrefs().GetString(PREF_ViewerImage, "");
-    if (*path && !LoadImage(QString::fromUtf8(path)))
-        qWarning("viewer: cannot read the image \"%s\"", path);
+    ViewImage(QString::fromUtf8(mDoc->GetPrefs().GetString(PREF_ViewerImage, "")));
 }
 
-void ViewerPanel::OnTimeChanged(float64)
+void ViewerPanel::OnTimeChanged(float64 time)
 {
+    mFeed->SetTime(time);
     SendAll(CCMD_TimeChanged, 0);
 }
 
@@ -319,6 +409,8 @@ void ViewerPanel::paintEvent(QPaintEvent *)
         DrawPass(2, true);
         mInfo.SetPainter(nullptr);
     }
+    qp.translate(-0.5, -0.5);
+    ViewerStatusLine::Paint(qp, rect(), ImageState());
     mDirty = false;
     ++mPaintCount;
 }

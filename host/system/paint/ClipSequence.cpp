@@ -1,4 +1,4 @@
-#include "inputcontrols/ClipSequence.h"
+#include "orbane/ClipSequence.h"
 
 #include <QDir>
 #include <QFileInfo>
@@ -22,6 +22,18 @@ bool FindFrameRun(const QString &name, int *start, int *length)
     return true;
 }
 
+// "plate.%04d.exr" -> "plate.####.exr", "plate.%d.exr" -> "plate.#.exr": the
+// last printf field of the name as '#'s, so one frame finder serves both.
+QString HashesForPrintf(const QString &name)
+{
+    static const QRegularExpression field("%0?(\\d*)d(?!.*%0?\\d*d)");
+    const QRegularExpressionMatch m = field.match(name);
+    if (!m.hasMatch())
+        return name;
+    const int width = std::clamp(m.captured(1).toInt(), 1, 10); // an int32 frame has at most 10 digits
+    return QString(name).replace(m.capturedStart(0), m.capturedLength(0), QString(width, '#'));
+}
+
 // Does a run of digits stand for a frame of `padding` digits?
 bool FitsPadding(const QString &digits, int padding)
 {
@@ -29,6 +41,19 @@ bool FitsPadding(const QString &digits, int padding)
 }
 
 } // namespace
+
+bool ClipSequence::HasFrame(int32 frame) const
+{
+    return std::binary_search(frames.begin(), frames.end(), frame);
+}
+
+int32 ClipSequence::HeldFrame(int32 frame) const
+{
+    if (frames.empty())
+        return frame;
+    const auto after = std::upper_bound(frames.begin(), frames.end(), frame);
+    return after == frames.begin() ? frames.front() : *(after - 1);
+}
 
 QString ClipSequence::FrameFile(int32 frame) const
 {
@@ -60,7 +85,7 @@ ClipSequence ClipSequence::Detect(const QString &path)
     ClipSequence clip;
     clip.pattern = path;
     const QFileInfo info(path);
-    const QString name = info.fileName();
+    const QString name = HashesForPrintf(info.fileName());
     int start = 0, length = 0;
     if (!FindFrameRun(name, &start, &length)) {
         clip.count = info.isFile() ? 1 : 0;
@@ -78,11 +103,22 @@ ClipSequence ClipSequence::Detect(const QString &path)
         const int32 frame = digits.toInt(&ok);
         if (!ok || !FitsPadding(digits, length) || digits.contains(QRegularExpression("\\D")))
             continue;
-        clip.first = clip.count ? std::min(clip.first, frame) : frame;
-        clip.last = clip.count ? std::max(clip.last, frame) : frame;
-        ++clip.count;
+        clip.frames.push_back(frame);
+    }
+    // The folder lists names in text order: "10" before "9" where unpadded.
+    std::sort(clip.frames.begin(), clip.frames.end());
+    clip.count = int32(clip.frames.size());
+    if (clip.count) {
+        clip.first = clip.frames.front();
+        clip.last = clip.frames.back();
     }
     return clip;
+}
+
+bool ClipSequence::IsPattern(const QString &path)
+{
+    const QString name = QFileInfo(path).fileName();
+    return name.contains('#') || HashesForPrintf(name) != name;
 }
 
 } // namespace Orbane
