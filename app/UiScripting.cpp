@@ -1,5 +1,6 @@
 #include "UiScripting.h"
 
+#include "CompScripting.h"
 #include "MainWindow.h"
 #include "ScriptHands.h"
 #include "UiTarget.h"
@@ -367,6 +368,7 @@ void UiScripting::Install(OrbaneDoc *doc, MainWindow *window)
         LuaSandbox::AllowCall(name);
     ViewerScripting::Install(window);
     ValueScripting::Install(doc);
+    CompScripting::Install(doc, window);
 }
 
 } // namespace Orbane

@@ -3,6 +3,7 @@
 #include "ScriptHands.h"
 
 #include "orbane/AutoParam.h"
+#include "orbane/ClassIDs.h"
 #include "orbane/Input.h"
 #include "orbane/LuaArgs.h"
 #include "orbane/LuaRuntime.h"
@@ -13,6 +14,8 @@
 #include "orbane/ScriptError.h"
 #include "orbane/ScriptVal.h"
 #include "orbane/ShapeFile.h"
+
+#include <cmath>
 
 namespace Orbane {
 
@@ -39,8 +42,14 @@ int SetKey(lua_State *L)
     const LuaArgs args(L, "SetKey");
     Input *input = Hands::InputArg(args, gDoc);
     const float64 time = args.Number(4, "time");
+    if (!std::isfinite(time))
+        return Hands::Raise(L, QString("Input \"%1\": a key needs a finite time").arg(input->GetName()));
+    const ScriptVal given = LuaRuntime::ToScriptVal(L, 3);
+    // Script tables may hold what they like; the values that blend may not.
+    if (input->GetDataType() != CLSID_DataType_ScriptVal && !ParameterScript::IsFinite(given))
+        return Hands::Raise(L, QString("Input \"%1\": a key's value must be finite numbers").arg(input->GetName()));
     std::string why;
-    AutoParameter value(ParameterScript::FromScript(input->GetDataType(), LuaRuntime::ToScriptVal(L, 3), &why));
+    AutoParameter value(ParameterScript::FromScript(input->GetDataType(), given, &why));
     if (!value)
         return Hands::Raise(L, QString("Input \"%1\": %2").arg(input->GetName(), QString::fromStdString(why)));
     if (time <= TIME_UNDEFINED)

@@ -17,6 +17,18 @@ class InputWatcher;
 class Operator;
 class OrbaneDoc;
 
+// How an animated Input blends between its keys. Smooth is a cubic through
+// the keys whose slope at a key comes from its neighbours (non-uniform
+// Catmull-Rom) and is flat at the first and last key, so the value neither
+// overshoots past the ends nor jumps in speed at a key. Numbers and Points
+// blend by their components; other kinds that blend (shapes) ease the blend
+// factor between two keys instead (slow out of one, slow into the next).
+enum class Interpolation : uint8
+{
+    Linear,
+    Smooth,
+};
+
 // Flags of Input::SetValue.
 enum SetValueFlags : uint32
 {
@@ -102,6 +114,10 @@ public:
     // Removes the key at `time`, with undo unless `flags` has
     // SETVALUE_NoUndo, and tells the watchers. False where there is none.
     bool RemoveKey(float64 time, uint32 flags = 0);
+    // How keys blend (Linear until set). Set-up like SetAnimated, no undo
+    // step; the document counts it as a change (OrbaneDoc::IsModified).
+    Interpolation GetInterpolation() const noexcept { return mInterpolation; }
+    void SetInterpolation(Interpolation mode);
 
     // Watchers are told in the order they were attached. Returns false for a
     // null watcher or one already attached (or, on detach, not attached).
@@ -136,6 +152,7 @@ private:
     AutoRef<Parameter> mValue;
     std::map<float64, AutoRef<Parameter>> mKeys;
     bool mAnimated = false;
+    Interpolation mInterpolation = Interpolation::Linear;
     std::vector<InputWatcher *> mWatchers;
 };
 

@@ -5,6 +5,7 @@
 #include "orbane/ScriptObject.h"
 #include "orbane/TagList.h"
 
+#include <string>
 #include <vector>
 
 namespace Orbane {
@@ -33,6 +34,11 @@ public:
     bool IsLocked() const noexcept { return mLocked; }
     void SetLocked(bool locked) noexcept { mLocked = locked; }
 
+    // The tool file the tool was built from (absolute; empty for a tool made
+    // from a table): a saved comp names it, so only such tools can be saved.
+    const std::string &GetSourceFile() const noexcept { return mSourceFile; }
+    void SetSourceFile(const std::string &path) { mSourceFile = path; }
+
     // Declares the next Input. Returns it (owned by the tool), or null with a
     // script error where the id is empty or taken, or where `def` is not of
     // `dataType`. `def` is copied; it may be null.
@@ -53,6 +59,7 @@ private:
     TagList mAttrs;
     OrbaneDoc *mDoc = nullptr;
     bool mLocked = false;
+    std::string mSourceFile;
     std::vector<Input *> mInputs; // one reference each
 };
 

@@ -55,6 +55,19 @@ public:
     const std::vector<Operator *> &Tools() const noexcept { return mTools; }
     Operator *FindTool(const char *name) const;
 
+    // Saved work: the comp file the document was last saved to or opened
+    // from (empty for new work), and whether it changed since. A change is an
+    // undo step away from the saved one, or a change outside undo that its
+    // maker marks (a tool added or removed, an interpolation switched).
+    const std::string &CompPath() const noexcept { return mCompPath; }
+    bool IsModified() const;
+    void MarkModified();
+    // After a save (or an open): the document is `path` and unmodified.
+    void MarkSaved(const std::string &path);
+    // New work: removes every tool (toolRemoving first), empties the undo
+    // history, time 0, no viewer image, no comp path, unmodified.
+    void Clear();
+
     QUndoStack *UndoStack() const noexcept { return mUndoStack.get(); }
     // The history keeps at most this many steps and about this many bytes of
     // recorded values; past either bound the oldest steps go first.
@@ -98,11 +111,14 @@ signals:
     void syncRenderRequested();
     void interactiveRenderRequested();
     void scriptingUpdateRequested();
+    void modifiedChanged(bool modified);
+    void compPathChanged(const QString &path);
 
 private:
     friend class Input;
     // Where Input::SetValue stores values that are recorded for undo.
     UndoRecorder &Recorder() const noexcept { return *mRecorder; }
+    void TellModified();
 
     float64 mCurrentTime = 0.0;
     TagList mPrefs;
@@ -111,6 +127,9 @@ private:
     std::unique_ptr<UndoRecorder> mRecorder;
     bool mAutoProxy = false;
     std::map<std::string, std::string> mPathMap; // lower-case prefix -> folder
+    std::string mCompPath;
+    bool mChangedOutsideUndo = false;
+    bool mToldModified = false;
 };
 
 } // namespace Orbane

@@ -19,6 +19,9 @@ public:
     // where the value does not suit the type.
     static Parameter *FromScript(const OrbID &dataType, const ScriptVal &value, std::string *error);
     static ScriptVal ToScript(const Parameter *value);
+    // Whether every number in `value` (and in its tables) is finite: a key
+    // or a saved value of NaN or infinity is refused before it is stored.
+    static bool IsFinite(const ScriptVal &value);
 };
 
 } // namespace Orbane

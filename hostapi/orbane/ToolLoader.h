@@ -36,6 +36,13 @@ class ScriptVal;
 // file names are relative to the comp file. An optional `image = "images/x.png"`
 // names the image the viewer shows (PREF_ViewerImage), and `pixelAspect = 2` the width of
 // one of its pixels over its height (PREF_ViewerPixelAspect).
+// A saved comp also says `version = 2` (a later version is refused) and holds each tool's
+// work: `locked = true`, and `inputs = { <id> = <state>, ... }` where a state is
+// { value = v } for a plain value, or { keys = { { time, v }, ... }, interpolation = "smooth" }
+// for an animated one (interpolation "linear" where it is left out), plus an optional
+// `expression = "..."`. Values are written as orbane.GetValue gives them. An Input the
+// tool does not have, a key at a time that is not a finite number, a value of the wrong
+// type: the comp is refused with a message naming the tool and Input, the document untouched.
 class ToolLoader
 {
 public:
@@ -44,8 +51,20 @@ public:
     static Operator *FromTable(const ScriptVal &desc, const char *name, std::string *error,
                                const std::string &dir = std::string());
     static Operator *LoadTool(const std::string &path, const char *name, std::string *error);
-    // Adds every tool of the comp to the document and sets its time.
+    // Adds every tool of the comp, with its Inputs' state, to the document
+    // and sets its time and image; all or nothing. Into a document without
+    // tools the comp becomes the document: its path, unmodified.
     static bool LoadComp(OrbaneDoc &doc, const std::string &path, std::string *error);
+    // Reads and checks the comp in full, and only then clears the document
+    // (OrbaneDoc::Clear) and loads it: File > Open. A refused comp leaves
+    // the document as it was.
+    static bool OpenComp(OrbaneDoc &doc, const std::string &path, std::string *error);
+    // Writes the document as a comp, atomically (a temporary file renamed
+    // over `path` once complete; a failed write leaves the old file). Leaves
+    // the document's path and modified state alone: for autosave.
+    static bool WriteComp(const OrbaneDoc &doc, const std::string &path, std::string *error);
+    // WriteComp, then the document is `path` and unmodified: File > Save.
+    static bool SaveComp(OrbaneDoc &doc, const std::string &path, std::string *error);
 };
 
 } // namespace Orbane

@@ -1,5 +1,6 @@
 #include "orbane/Input.h"
 
+#include "KeyBlend.h"
 #include "UndoRecorder.h"
 
 #include "orbane/InputWatcher.h"
@@ -8,6 +9,7 @@
 #include "orbane/ScriptError.h"
 
 #include <algorithm>
+#include <cmath>
 #include <iterator>
 
 namespace Orbane {
@@ -41,15 +43,19 @@ Parameter *Input::GetValue(float64 time) const
         return std::prev(after)->second->Clone();
     if (after == mKeys.begin() || after->first == time)
         return after->second->Clone();
-    const auto before = std::prev(after);
-    const float64 t = (time - before->first) / (after->first - before->first);
-    return before->second->Interpolate(*after->second, t);
+    return KeyBlend::Between(mKeys, after, time, mInterpolation);
 }
 
 bool Input::SetValue(Parameter *value, float64 time, uint32 flags, const TagList *tags)
 {
     if (!Accepts(value))
         return false;
+    // A key at NaN would break the order of the keys; one at infinity is
+    // beyond every time anyone can scrub to.
+    if (mAnimated && !std::isfinite(time)) {
+        SetScriptError(std::string("Input \"") + GetName() + "\": a key needs a finite time");
+        return false;
+    }
     Slot slot;
     if (!SlotFor(time, slot))
         return true;
@@ -157,6 +163,17 @@ bool Input::RemoveKey(float64 time, uint32 flags)
         Exchange(slot, nullptr);
     Notify();
     return true;
+}
+
+void Input::SetInterpolation(Interpolation mode)
+{
+    if (mode == mInterpolation)
+        return;
+    mInterpolation = mode;
+    if (OrbaneDoc *doc = GetDoc())
+        doc->MarkModified();
+    if (mAnimated)
+        Notify();
 }
 
 bool Input::AttachWatcher(InputWatcher *w)

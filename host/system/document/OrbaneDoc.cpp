@@ -34,6 +34,7 @@ OrbaneDoc::OrbaneDoc(QObject *parent)
     SetUndoBounds(kMaxUndoSteps, kMaxUndoBytes);
     mPrefs.Set(PREF_ExportSplineMode, 0);
     mPrefs.Set(PREF_SelectPointsFromMultiPolies, 0);
+    connect(mUndoStack.get(), &QUndoStack::cleanChanged, this, [this](bool) { TellModified(); });
 }
 
 OrbaneDoc::~OrbaneDoc()
@@ -76,6 +77,7 @@ bool OrbaneDoc::AddTool(Operator *tool)
     tool->SetDoc(this);
     mTools.push_back(tool);
     emit toolAdded(tool);
+    MarkModified();
     return true;
 }
 
@@ -91,6 +93,7 @@ bool OrbaneDoc::RemoveTool(Operator *tool)
     mTools.erase(it);
     tool->SetDoc(nullptr);
     tool->DecRef();
+    MarkModified();
     return true;
 }
 
@@ -102,6 +105,50 @@ Operator *OrbaneDoc::FindTool(const char *name) const
         if (std::strcmp(tool->GetName(), name) == 0)
             return tool;
     return nullptr;
+}
+
+bool OrbaneDoc::IsModified() const
+{
+    return mChangedOutsideUndo || !mUndoStack->isClean();
+}
+
+void OrbaneDoc::MarkModified()
+{
+    mChangedOutsideUndo = true;
+    TellModified();
+}
+
+void OrbaneDoc::MarkSaved(const std::string &path)
+{
+    mChangedOutsideUndo = false;
+    mUndoStack->setClean();
+    TellModified();
+    if (path != mCompPath) {
+        mCompPath = path;
+        emit compPathChanged(QString::fromStdString(path));
+    }
+}
+
+// Both the undo stack and marks change the state; watchers hear of each
+// change once.
+void OrbaneDoc::TellModified()
+{
+    const bool now = IsModified();
+    if (now == mToldModified)
+        return;
+    mToldModified = now;
+    emit modifiedChanged(now);
+}
+
+void OrbaneDoc::Clear()
+{
+    while (!mTools.empty())
+        RemoveTool(mTools.back());
+    mRecorder->Abandon();
+    mUndoStack->clear();
+    SetCurrentTime(0.0);
+    SetPref(PREF_ViewerImage, "");
+    MarkSaved(std::string());
 }
 
 void OrbaneDoc::StartUndo(const char *name, const TagList *)

@@ -14,6 +14,8 @@
 
 #include <QFileInfo>
 
+#include <cmath>
+
 namespace Orbane {
 
 namespace {
@@ -57,6 +59,19 @@ Parameter *Make(const OrbID &type, const ScriptVal &v)
     return nullptr;
 }
 
+bool FiniteAt(const ScriptVal &v, int depth)
+{
+    if (v.IsNumber())
+        return std::isfinite(v.GetNumber());
+    // Values of Inputs are a few levels deep; a table that holds itself ends here.
+    if (!v.IsTable() || depth > 16)
+        return true;
+    for (const ScriptVal::Entry &e : v.GetEntries())
+        if (!FiniteAt(e.second, depth + 1))
+            return false;
+    return true;
+}
+
 bool IsShape(const OrbID &type)
 {
     return type == CLSID_DataType_Polyline || type == CLSID_DataType_BSplinePolyline;
@@ -83,6 +98,11 @@ Parameter *ParameterScript::FromScript(const OrbID &dataType, const ScriptVal &v
     if (error)
         *error = std::string("expected a value of type ") + dataType.c_str() + ", got " + value.TypeName();
     return nullptr;
+}
+
+bool ParameterScript::IsFinite(const ScriptVal &value)
+{
+    return FiniteAt(value, 0);
 }
 
 ScriptVal ParameterScript::ToScript(const Parameter *value)

@@ -1,5 +1,8 @@
 #include "orbane/ToolLoader.h"
 
+#include "CompInputs.h"
+#include "CompWriter.h"
+
 #include "orbane/AutoRef.h"
 #include "orbane/ClassIDs.h"
 #include "orbane/Gradient.h"
@@ -19,6 +22,7 @@
 #include <QDir>
 #include <QFileInfo>
 
+#include <algorithm>
 #include <cmath>
 #include <cstdint>
 #include <set>
@@ -310,7 +314,18 @@ bool IsFiniteNumber(const ScriptVal *v)
     return v && v->IsNumber() && std::isfinite(v->GetNumber());
 }
 
-bool ReadCompTools(const OrbaneDoc &doc, const std::string &path, CompPlan &plan, std::string *error)
+// A tool entry's Inputs and lock, given to its fresh tool.
+bool RestoreTool(Operator &tool, const ScriptVal &entry, const QDir &base, std::string *error)
+{
+    if (const ScriptVal *locked = entry.FindKeyConst(ScriptVal("locked")))
+        tool.SetLocked(locked->GetBool());
+    const ScriptVal *inputs = entry.FindKeyConst(ScriptVal("inputs"));
+    return !inputs || CompInputs::Restore(tool, *inputs, base, error);
+}
+
+// `doc` is the document the tools join, whose names they must not take;
+// null where they replace its tools.
+bool ReadCompTools(const OrbaneDoc *doc, const std::string &path, CompPlan &plan, std::string *error)
 {
     const QDir base = QFileInfo(QString::fromStdString(path)).absoluteDir();
     const ScriptVal *tools = plan.comp.FindKeyConst(ScriptVal("tools"));
@@ -325,20 +340,41 @@ bool ReadCompTools(const OrbaneDoc &doc, const std::string &path, CompPlan &plan
         if (!file)
             return Refuse(error, path, "tool " + std::to_string(i) + " names no file");
         const std::string name = Str(entry, "name", "Tool");
-        if (doc.FindTool(name.c_str()) || !names.insert(name).second)
+        if ((doc && doc->FindTool(name.c_str())) || !names.insert(name).second)
             return Refuse(error, path, "cannot add tool \"" + name + "\" (is the name taken?)");
         AutoRef<Operator> tool(
             ToolLoader::LoadTool(base.filePath(QString::fromUtf8(file)).toStdString(), name.c_str(), error));
         if (!tool)
             return false;
+        std::string why;
+        if (!RestoreTool(*tool, entry, base, &why))
+            return Refuse(error, path, why);
         plan.tools.push_back(std::move(tool));
     }
     return true;
 }
 
-bool ReadComp(const OrbaneDoc &doc, const std::string &path, CompPlan &plan, std::string *error)
+// A comp without a version is one of the first, which named tools only.
+bool CheckVersion(const std::string &path, const ScriptVal &comp, std::string *error)
 {
-    if (!RunDescription(path, plan.comp, error) || !ReadCompTools(doc, path, plan, error))
+    const ScriptVal *version = comp.FindKeyConst(ScriptVal("version"));
+    if (!version)
+        return true;
+    const float64 v = version->GetNumber(-1);
+    if (!(v >= 1 && v == std::floor(v)))
+        return Refuse(error, path, "version must be a whole number from 1");
+    if (v > CompWriter::kVersion)
+        return Refuse(error, path,
+                      "the comp was written by a newer Orbane (comp version " +
+                          std::to_string(int64(std::min(v, 1e9))) + "; this one reads up to " +
+                          std::to_string(CompWriter::kVersion) + ")");
+    return true;
+}
+
+bool ReadComp(const OrbaneDoc *doc, const std::string &path, CompPlan &plan, std::string *error)
+{
+    if (!RunDescription(path, plan.comp, error) || !CheckVersion(path, plan.comp, error) ||
+        !ReadCompTools(doc, path, plan, error))
         return false;
     plan.time = plan.comp.FindKeyConst(ScriptVal("time"));
     if (plan.time && !IsFiniteNumber(plan.time))
@@ -408,18 +444,51 @@ Operator *ToolLoader::LoadTool(const std::string &path, const char *name, std::s
     ScriptVal desc;
     if (!RunDescription(path, desc, error))
         return nullptr;
-    Operator *tool = FromTable(desc, name, error, QFileInfo(QString::fromStdString(path)).absolutePath().toStdString());
+    const QFileInfo file(QString::fromStdString(path));
+    Operator *tool = FromTable(desc, name, error, file.absolutePath().toStdString());
     if (!tool)
         *error = path + ": " + *error;
+    else
+        tool->SetSourceFile(file.absoluteFilePath().toStdString());
     return tool;
 }
 
 bool ToolLoader::LoadComp(OrbaneDoc &doc, const std::string &path, std::string *error)
 {
     CompPlan plan;
-    if (!ReadComp(doc, path, plan, error))
+    const bool fresh = doc.Tools().empty();
+    if (!ReadComp(&doc, path, plan, error) || !ApplyComp(doc, path, plan, error))
         return false;
-    return ApplyComp(doc, path, plan, error);
+    // Into empty work the comp is the document; into work that has tools it
+    // is an addition to that work.
+    if (fresh)
+        doc.MarkSaved(QFileInfo(QString::fromStdString(path)).absoluteFilePath().toStdString());
+    return true;
+}
+
+bool ToolLoader::OpenComp(OrbaneDoc &doc, const std::string &path, std::string *error)
+{
+    CompPlan plan;
+    if (!ReadComp(nullptr, path, plan, error))
+        return false;
+    doc.Clear();
+    if (!ApplyComp(doc, path, plan, error))
+        return false;
+    doc.MarkSaved(QFileInfo(QString::fromStdString(path)).absoluteFilePath().toStdString());
+    return true;
+}
+
+bool ToolLoader::WriteComp(const OrbaneDoc &doc, const std::string &path, std::string *error)
+{
+    return CompWriter::Write(doc, path, error);
+}
+
+bool ToolLoader::SaveComp(OrbaneDoc &doc, const std::string &path, std::string *error)
+{
+    if (!CompWriter::Write(doc, path, error))
+        return false;
+    doc.MarkSaved(QFileInfo(QString::fromStdString(path)).absoluteFilePath().toStdString());
+    return true;
 }
 
 } // namespace Orbane
