@@ -6,6 +6,7 @@
 #include "UiTarget.h"
 #include "ValueScripting.h"
 #include "ViewerScripting.h"
+#include "WindowScripting.h"
 
 #include "orbane/AutoParam.h"
 #include "orbane/CustomButton.h"
@@ -367,6 +368,7 @@ void UiScripting::Install(OrbaneDoc *doc, MainWindow *window)
     for (const char *name : {"Tools", "GetValue", "SetValue", "GetTime", "SetTime", "UndoNames", "RedoNames"})
         LuaSandbox::AllowCall(name);
     ViewerScripting::Install(window);
+    WindowScripting::Install(doc, window);
     ValueScripting::Install(doc);
     CompScripting::Install(doc, window);
 }
