@@ -1,16 +1,23 @@
 #include "MainWindow.h"
 
-#include "orbane/ParameterPanel.h"
+#include "AutoSave.h"
+#include "FileMenu.h"
+#include "RecentFiles.h"
+#include "TimeRuler.h"
+#include "TimeScale.h"
+#include "UndoHistoryDock.h"
+
 #include "orbane/Operator.h"
 #include "orbane/OrbaneDoc.h"
+#include "orbane/ParameterPanel.h"
 #include "orbane/ViewerPanel.h"
 
+#include <QCloseEvent>
 #include <QComboBox>
 #include <QDockWidget>
 #include <QLabel>
-#include <QSlider>
+#include <QMenuBar>
 #include <QStatusBar>
-#include <QToolBar>
 #include <QUndoStack>
 #include <QVBoxLayout>
 
@@ -18,23 +25,33 @@ namespace Orbane {
 
 MainWindow::MainWindow(OrbaneDoc *doc, QWidget *parent) : QMainWindow(parent), mDoc(doc)
 {
-    setWindowTitle("Orbane");
     resize(1280, 800);
-    mViewer = new ViewerPanel(doc);
-    setCentralWidget(mViewer);
+    setCentralWidget(BuildCentre());
 
-    auto *dock = new QDockWidget("Inspector", this);
+    auto *dock = new QDockWidget(tr("Inspector"), this);
     dock->setObjectName("inspector");
     dock->setFeatures(QDockWidget::NoDockWidgetFeatures);
     dock->setWidget(BuildInspectorDock());
     addDockWidget(Qt::RightDockWidgetArea, dock);
+    mHistory = new UndoHistoryDock(doc, this);
+    addDockWidget(Qt::RightDockWidgetArea, mHistory);
     resizeDocks({dock}, {380}, Qt::Horizontal);
-    BuildToolBar();
+    resizeDocks({dock, mHistory}, {600, 160}, Qt::Vertical);
+
+    mRecent = new RecentFiles(this);
+    mFile = new FileMenu(doc, this, mRecent);
+    connect(mFile, &FileMenu::quitRequested, this, [this] {
+        // The work is settled already: close without asking again.
+        mWorkSettled = true;
+        close();
+        mWorkSettled = false;
+    });
+    BuildEditMenu();
     BuildStatusBar();
+    mAutoSave = new AutoSave(doc, this);
 
     connect(doc, SIGNAL(toolAdded(Orbane::Operator *)), this, SLOT(OnToolAdded(Orbane::Operator *)));
     connect(doc, SIGNAL(toolRemoving(Orbane::Operator *)), this, SLOT(OnToolRemoving(Orbane::Operator *)));
-    connect(doc, SIGNAL(currentTimeChanged(float64)), this, SLOT(OnTimeChanged(double)));
     connect(doc, SIGNAL(syncRenderRequested()), this, SLOT(OnRenderRequested()));
     connect(doc, SIGNAL(autoProxyChanged(bool)), this, SLOT(OnAutoProxyChanged(bool)));
     for (Operator *tool : doc->Tools())
@@ -43,12 +60,26 @@ MainWindow::MainWindow(OrbaneDoc *doc, QWidget *parent) : QMainWindow(parent), m
 
 MainWindow::~MainWindow() = default;
 
+QWidget *MainWindow::BuildCentre()
+{
+    auto *box = new QWidget;
+    auto *column = new QVBoxLayout(box);
+    column->setContentsMargins(0, 0, 0, 0);
+    column->setSpacing(0);
+    mViewer = new ViewerPanel(mDoc);
+    mRuler = new TimeRuler(mDoc);
+    column->addWidget(mViewer, 1);
+    column->addWidget(mRuler);
+    return box;
+}
+
 QWidget *MainWindow::BuildInspectorDock()
 {
     auto *box = new QWidget;
     auto *column = new QVBoxLayout(box);
     column->setContentsMargins(0, 0, 0, 0);
     mToolChooser = new QComboBox;
+    mToolChooser->setAccessibleName(tr("Tool"));
     mInspector = new ParameterPanel(mDoc);
     column->addWidget(mToolChooser);
     column->addWidget(mInspector, 1);
@@ -56,35 +87,54 @@ QWidget *MainWindow::BuildInspectorDock()
     return box;
 }
 
-void MainWindow::BuildToolBar()
+// Undo and Redo name the step they act on ("Undo Move Points").
+void MainWindow::BuildEditMenu()
 {
-    QToolBar *bar = addToolBar("Edit");
-    bar->setObjectName("edit");
-    bar->setMovable(false);
-    QAction *undo = mDoc->UndoStack()->createUndoAction(this, "Undo");
-    QAction *redo = mDoc->UndoStack()->createRedoAction(this, "Redo");
+    mEditMenu = menuBar()->addMenu(tr("&Edit"));
+    mEditMenu->setObjectName("editMenu");
+    QAction *undo = mDoc->UndoStack()->createUndoAction(this, tr("Undo"));
+    QAction *redo = mDoc->UndoStack()->createRedoAction(this, tr("Redo"));
     undo->setShortcut(QKeySequence::Undo);
     redo->setShortcut(QKeySequence::Redo);
-    bar->addAction(undo);
-    bar->addAction(redo);
-    bar->addSeparator();
-    bar->addWidget(new QLabel(" Time "));
-    bar->addWidget(BuildTimeSlider());
-}
-
-QSlider *MainWindow::BuildTimeSlider()
-{
-    mTimeSlider = new QSlider(Qt::Horizontal);
-    mTimeSlider->setRange(0, 100);
-    mTimeSlider->setMinimumWidth(300);
-    connect(mTimeSlider, &QSlider::valueChanged, this, [this](int frame) { mDoc->SetCurrentTime(frame); });
-    return mTimeSlider;
+    mEditMenu->addAction(undo);
+    mEditMenu->addAction(redo);
+    QMenu *view = menuBar()->addMenu(tr("&View"));
+    view->addAction(mHistory->toggleViewAction());
 }
 
 void MainWindow::BuildStatusBar()
 {
     mProxyState = new QLabel;
     statusBar()->addPermanentWidget(mProxyState);
+}
+
+bool MainWindow::OfferRecovery()
+{
+    if (!AutoSave::HasRecovery())
+        return false;
+    const auto answer = mFile->Ask(tr("Orbane did not close cleanly last time. Restore the unsaved work? "
+                                      "(Save restores it, Discard drops it.)"));
+    if (answer == FileMenu::Answer::Discard)
+        AutoSave::Discard();
+    if (answer != FileMenu::Answer::Save)
+        return false;
+    QString why;
+    if (!mAutoSave->Restore(&why)) {
+        mFile->Tell(tr("Cannot restore the unsaved work: %1").arg(why));
+        return false;
+    }
+    return true;
+}
+
+void MainWindow::closeEvent(QCloseEvent *event)
+{
+    if (!mWorkSettled && !mFile->MaybeKeepWork()) {
+        event->ignore();
+        return;
+    }
+    if (mAutoSave->IsEnabled())
+        AutoSave::Discard();
+    event->accept();
 }
 
 void MainWindow::OnRenderRequested()
@@ -114,6 +164,8 @@ void MainWindow::OnToolAdded(Operator *tool)
 
 void MainWindow::OnToolRemoving(Operator *tool)
 {
+    if (mRuler->Scale()->Tool() == tool)
+        mRuler->SetTool(nullptr);
     const int index = mToolChooser->findText(QString::fromUtf8(tool->GetName()));
     if (index >= 0)
         mToolChooser->removeItem(index);
@@ -124,12 +176,7 @@ void MainWindow::OnToolChosen(int index)
     Operator *tool = index < 0 ? nullptr : mDoc->FindTool(mToolChooser->itemText(index).toUtf8().constData());
     mInspector->ShowTool(tool);
     mViewer->ShowTool(tool);
-}
-
-void MainWindow::OnTimeChanged(double time)
-{
-    const QSignalBlocker block(mTimeSlider);
-    mTimeSlider->setValue(int(time));
+    mRuler->SetTool(tool);
 }
 
 } // namespace Orbane

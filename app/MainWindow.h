@@ -7,15 +7,20 @@
 
 class QComboBox;
 class QLabel;
-class QSlider;
 
 namespace Orbane {
 
+class AutoSave;
+class FileMenu;
 class Operator;
 class OrbaneDoc;
+class RecentFiles;
+class TimeRuler;
+class UndoHistoryDock;
 
-// The application window: the viewer in the middle, the inspector of the
-// chosen tool on the right, a time slider below, undo and redo above.
+// The application window: the viewer in the middle with the time ruler
+// under it, the inspector of the chosen tool on the right, the undo history
+// below it, and the File and Edit menus.
 class MainWindow : public QMainWindow
 {
     Q_OBJECT
@@ -25,14 +30,26 @@ public:
 
     ParameterPanel *Inspector() const { return mInspector; }
     ViewerPanel *Viewer() const { return mViewer; }
+    TimeRuler *Ruler() const { return mRuler; }
+    FileMenu *File() const { return mFile; }
+    UndoHistoryDock *History() const { return mHistory; }
+    AutoSave *Recovery() const { return mAutoSave; }
+    QMenu *EditMenu() const { return mEditMenu; }
     // Shows the named tool's controls and overlays; false where there is no such tool.
     bool ShowTool(const QString &name);
+
+    // At start-up: where an earlier session left unsaved work, asks (through
+    // the File menu's question hook: Save restores, Discard drops it) and
+    // restores it. True where work was restored.
+    bool OfferRecovery();
+
+protected:
+    void closeEvent(QCloseEvent *event) override;
 
 private slots:
     void OnToolAdded(Orbane::Operator *tool);
     void OnToolRemoving(Orbane::Operator *tool);
     void OnToolChosen(int index);
-    void OnTimeChanged(double time);
     // The document's render hooks: this host has no renderer, so the window
     // says what a renderer would have been asked to do.
     void OnRenderRequested();
@@ -40,17 +57,23 @@ private slots:
 
 private:
     QWidget *BuildInspectorDock();
-    void BuildToolBar();
+    QWidget *BuildCentre();
+    void BuildEditMenu();
     void BuildStatusBar();
-    QSlider *BuildTimeSlider();
 
     OrbaneDoc *mDoc;
     ParameterPanel *mInspector = nullptr;
     ViewerPanel *mViewer = nullptr;
+    TimeRuler *mRuler = nullptr;
     QComboBox *mToolChooser = nullptr;
-    QSlider *mTimeSlider = nullptr;
     QLabel *mProxyState = nullptr;
+    RecentFiles *mRecent = nullptr;
+    FileMenu *mFile = nullptr;
+    QMenu *mEditMenu = nullptr;
+    UndoHistoryDock *mHistory = nullptr;
+    AutoSave *mAutoSave = nullptr;
     int mRenders = 0;
+    bool mWorkSettled = false; // File > Quit asked already
 };
 
 } // namespace Orbane

@@ -8,6 +8,7 @@
 #include "UiTarget.h"
 #include "ValueScripting.h"
 #include "ViewerScripting.h"
+#include "WindowScripting.h"
 
 #include "orbane/AutoParam.h"
 #include "orbane/CustomButton.h"
@@ -372,6 +373,7 @@ void UiScripting::Install(OrbaneDoc *doc, MainWindow *window)
         LuaSandbox::AllowCall(name);
     ViewerScripting::Install(window);
     ImageScripting::Install(doc, window);
+    WindowScripting::Install(doc, window);
     ValueScripting::Install(doc);
     CompScripting::Install(doc, window);
     ExpressionScripting::Install(doc);

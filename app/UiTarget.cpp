@@ -61,9 +61,14 @@ UiTarget Named(const QString &name, MainWindow *window)
         t.widget = window;
     else if (name == "viewer")
         t.widget = window->Viewer();
+    else if (name == "ruler")
+        t.widget = window->findChild<QWidget *>("timeScale");
     else
-        t.error =
-            QString("unknown widget \"%1\"; expected inspector, viewer, window, popup or a control table").arg(name);
+        t.widget = window->findChild<QWidget *>(name);
+    if (!t.widget && t.error.isEmpty())
+        t.error = QString("unknown widget \"%1\"; expected inspector, viewer, window, popup, ruler, the object "
+                          "name of a window part or a control table")
+                      .arg(name);
     return t;
 }
 

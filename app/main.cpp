@@ -1,3 +1,4 @@
+#include "AutoSave.h"
 #include "CommandLine.h"
 #include "ControlLister.h"
 #include "ControlModule.h"
@@ -83,8 +84,13 @@ int RunWindow(const CommandLine &cl, QApplication &app, QTextStream &out, QTextS
     MainWindow window(&doc);
     UiScripting::Install(&doc, &window);
     window.show();
+    // A person at the window gets autosave and the offer of work a crash
+    // left behind; headless runs leave the recovery file alone.
+    const bool interactive = cl.script.isEmpty() && !cl.headless && !NoDisplay();
+    window.Recovery()->SetEnabled(interactive);
+    const bool restored = interactive && window.OfferRecovery();
     std::string why;
-    if (!cl.comp.isEmpty() && !ToolLoader::LoadComp(doc, cl.comp.toStdString(), &why)) {
+    if (!restored && !cl.comp.isEmpty() && !ToolLoader::LoadComp(doc, cl.comp.toStdString(), &why)) {
         err << "orbane: " << QString::fromStdString(why) << "\n";
         return 1;
     }
@@ -122,7 +128,8 @@ int main(int argc, char **argv)
     }
     if (cl.listControls)
         return ControlLister::Print(out);
-    if (cl.comp.isEmpty() && cl.script.isEmpty()) {
+    // With a display and nothing named, the window opens on a new comp.
+    if (cl.comp.isEmpty() && cl.script.isEmpty() && (cl.headless || NoDisplay())) {
         err << CommandLine::Usage();
         return 2;
     }

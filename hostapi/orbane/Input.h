@@ -111,6 +111,12 @@ public:
     // the plain value; switching off keeps the value at the current time as
     // the plain value and drops the keys. Set-up, not an edit: no undo.
     void SetAnimated(bool animated);
+    // The user's switch of animation, an edit recorded for undo (in the open
+    // gesture, else as a step of its own): on, it keeps existing keys or makes
+    // one at the current time; off, it keeps the value at the current time as
+    // the plain value. Undo brings back the keys and the plain value exactly.
+    // False where the Input is already in that state.
+    bool Animate(bool animated);
     // The times of the keys, earliest first.
     std::vector<float64> KeyTimes() const;
     // The value stored in the key at `time` (not blended), as a new

@@ -1,5 +1,7 @@
 #include "orbane/InputControl.h"
 
+#include "InputStateMark.h"
+
 #include "orbane/AutoParam.h"
 #include "orbane/Input.h"
 #include "orbane/LookPackItem.h"
@@ -87,6 +89,7 @@ bool InputControl::Open(QWidget *host, const QRect &rect, const TagList *)
     setFont(mControlFont);
     setEnabled(!mDisabled);
     mOpen = true;
+    InputStateMark::Update(this, GetCurrentInput());
     if (host)
         show();
     return true;
@@ -248,6 +251,8 @@ void InputControl::OnInputChanged(Input *input, Parameter *value, const TagList 
     SyncExpression(input);
     if (!mQuietWrite)
         NotifyChanged(input, value, tags);
+    if (input == GetCurrentInput())
+        InputStateMark::Update(this, input, value);
 }
 
 bool InputControl::OnConnect(Input *input, const TagList *)
@@ -398,6 +403,8 @@ void InputControl::resizeEvent(QResizeEvent *event)
         mArrangedHeight = mLayout->HeightForWidth(mArrangedWidth);
         mLayout->Place(QRect(QPoint(0, 0), event->size()));
     }
+    if (event->size().height() != event->oldSize().height())
+        InputStateMark::Update(this, GetCurrentInput());
 }
 
 void InputControl::Relayout()

@@ -5,6 +5,7 @@
 #include "orbane/AutoParam.h"
 #include "orbane/ClassIDs.h"
 #include "orbane/Input.h"
+#include "orbane/KeyframeMenu.h"
 #include "orbane/OrbaneDoc.h"
 #include "orbane/Parser.h"
 
@@ -312,6 +313,7 @@ void InputControl::AddToMenu(QMenu *menu)
 {
     if (!menu || mInputs.empty() || mFlags & CF_ActionOnly)
         return;
+    KeyframeMenu::AddTo(menu, mInputs.front(), IsLocked());
     QAction *action = menu->addAction(kExpressionAction, this, SLOT(OnExpressionMenu()));
     action->setCheckable(true);
     const QLineEdit *edit = GetExpressionEdit(0);

@@ -22,9 +22,20 @@ void ChangeSet::Note(Input *in, const Input::Slot &slot, const AutoRef<Parameter
         mEntries.push_back({AutoRef<Input>::Share(in), slot, before});
 }
 
+void ChangeSet::NoteAnimated(Input *in, bool before)
+{
+    const auto known = [in](const Switch &s) { return s.input.get() == in; };
+    if (std::none_of(mSwitches.begin(), mSwitches.end(), known))
+        mSwitches.push_back({AutoRef<Input>::Share(in), before});
+}
+
 void ChangeSet::Swap()
 {
     std::vector<Input *> touched;
+    for (Switch &s : mSwitches) {
+        std::swap(s.held, s.input->mAnimated);
+        touched.push_back(s.input.get());
+    }
     for (Entry &e : mEntries) {
         e.held = e.input->Exchange(e.slot, std::move(e.held));
         if (std::find(touched.begin(), touched.end(), e.input.get()) == touched.end())
@@ -42,6 +53,8 @@ void ChangeSet::Prune()
 {
     const auto unchanged = [](const Entry &e) { return SameValue(e.held, e.input->Peek(e.slot)); };
     mEntries.erase(std::remove_if(mEntries.begin(), mEntries.end(), unchanged), mEntries.end());
+    const auto unswitched = [](const Switch &s) { return s.held == s.input->mAnimated; };
+    mSwitches.erase(std::remove_if(mSwitches.begin(), mSwitches.end(), unswitched), mSwitches.end());
     Reindex();
 }
 
@@ -54,7 +67,7 @@ void ChangeSet::Reindex()
 
 std::size_t ChangeSet::Footprint() const noexcept
 {
-    std::size_t bytes = 0;
+    std::size_t bytes = mSwitches.size() * sizeof(Switch);
     for (const Entry &e : mEntries)
         bytes += sizeof(Entry) + sizeof(std::pair<Key, std::size_t>) + (e.held ? e.held->Footprint() : 0);
     return bytes;

@@ -18,16 +18,18 @@ class ChangeSet
 public:
     // Remembers `before` for the slot unless the slot is already known.
     void Note(Input *in, const Input::Slot &slot, const AutoRef<Parameter> &before);
+    // Remembers whether the Input was animated before the edit, once.
+    void NoteAnimated(Input *in, bool before);
     // Exchanges every held value with the one stored now, then tells the
     // watchers of each Input concerned, once per Input.
     void Swap();
     // Forgets slots whose value is back to what it was before the edit.
     void Prune();
 
-    std::size_t Size() const noexcept { return mEntries.size(); }
+    std::size_t Size() const noexcept { return mEntries.size() + mSwitches.size(); }
     // About how many bytes the held values and their bookkeeping take.
     std::size_t Footprint() const noexcept;
-    bool IsEmpty() const noexcept { return mEntries.empty(); }
+    bool IsEmpty() const noexcept { return mEntries.empty() && mSwitches.empty(); }
 
 private:
     struct Entry
@@ -36,12 +38,19 @@ private:
         Input::Slot slot;
         AutoRef<Parameter> held;
     };
+    // An Input's animation switch as it was before the edit.
+    struct Switch
+    {
+        AutoRef<Input> input;
+        bool held;
+    };
     using Key = std::pair<const Input *, Input::Slot>;
 
     void Reindex();
 
     std::vector<Entry> mEntries;
     std::map<Key, std::size_t> mIndex;
+    std::vector<Switch> mSwitches;
 };
 
 } // namespace Orbane

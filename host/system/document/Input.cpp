@@ -110,6 +110,36 @@ void Input::SetAnimated(bool animated)
     Notify();
 }
 
+bool Input::Animate(bool animated)
+{
+    OrbaneDoc *doc = GetDoc();
+    if (animated == mAnimated || !doc) {
+        if (animated == mAnimated)
+            return false;
+        SetAnimated(animated);
+        return true;
+    }
+    const AutoRef<Input> self = AutoRef<Input>::Share(this);
+    UndoRecorder &recorder = doc->Recorder();
+    const float64 now = CurrentTime();
+    doc->StartUndo(animated ? "Animate" : "Remove Animation");
+    if (animated) {
+        recorder.RecordAnimated(this, true);
+        if (mKeys.empty() && mValue)
+            recorder.Record(this, Slot{true, now}, AutoRef<Parameter>(mValue->Clone()));
+    } else {
+        AutoRef<Parameter> kept(GetValue(now));
+        for (const float64 time : KeyTimes())
+            recorder.Record(this, Slot{true, time}, nullptr);
+        recorder.RecordAnimated(this, false);
+        if (kept)
+            recorder.Record(this, Slot{}, std::move(kept));
+    }
+    doc->EndUndo();
+    Notify();
+    return true;
+}
+
 std::vector<float64> Input::KeyTimes() const
 {
     std::vector<float64> times;

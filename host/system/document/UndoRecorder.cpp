@@ -5,6 +5,8 @@
 #include <QCoreApplication>
 #include <QUndoStack>
 
+#include <utility>
+
 namespace Orbane {
 
 void UndoRecorder::Start(const char *name)
@@ -45,6 +47,15 @@ void UndoRecorder::Record(Input *in, const Input::Slot &slot, AutoRef<Parameter>
     }
     for (ChangeSet &level : mLevels)
         level.Note(in, slot, before);
+}
+
+void UndoRecorder::RecordAnimated(Input *in, bool animated)
+{
+    const bool before = std::exchange(in->mAnimated, animated);
+    if (mReplaying)
+        return;
+    for (ChangeSet &level : mLevels)
+        level.NoteAnimated(in, before);
 }
 
 void UndoRecorder::Push(const QString &name, ChangeSet changes)

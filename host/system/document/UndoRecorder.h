@@ -29,6 +29,9 @@ public:
     // Stores `value` in the Input's slot and records the change: in every
     // open level, or as a step of its own where none is open.
     void Record(Input *in, const Input::Slot &slot, AutoRef<Parameter> value);
+    // Switches the Input's animation and records the switch in every open
+    // level; callers open a gesture around it (Input::Animate does).
+    void RecordAnimated(Input *in, bool animated);
 
     // While a step is undone, redone or rolled back, values written in reply
     // (by watchers) are stored but not recorded: the stack is busy with the

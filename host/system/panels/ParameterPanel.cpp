@@ -13,10 +13,24 @@
 #include <QResizeEvent>
 #include <QScopedValueRollback>
 #include <QScrollBar>
+#include <algorithm>
 
 namespace Orbane {
 
 namespace {
+
+// Keyboard users and screen readers go from control to control with Tab: a
+// control without any child that takes focus that way (a separator, a
+// label) takes it itself, so that it is announced with its Input's name.
+void KeepInTabReach(InputControl *control)
+{
+    const auto children = control->findChildren<QWidget *>();
+    const auto tabbable = [control](const QWidget *w) {
+        return (w->focusPolicy() & Qt::TabFocus) && w->isVisibleTo(control); // a hidden expression field is no stop
+    };
+    if (std::none_of(children.begin(), children.end(), tabbable))
+        control->setFocusPolicy(Qt::TabFocus);
+}
 
 // Room at the panel's sides, so edit boxes and captions do not touch its edges.
 constexpr int32 kSideMargin = 6;
@@ -95,6 +109,7 @@ InputControl *ParameterPanel::CreateControl(Input *input, const char *classID, Q
     control->AddInput(input, &attrs);
     control->SetAttrsTagList(input, attrs);
     control->Open(page, QRect(), nullptr);
+    KeepInTabReach(control);
     return control;
 }
 

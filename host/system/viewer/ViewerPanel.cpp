@@ -2,6 +2,7 @@
 
 #include "HoverIndex.h"
 #include "QtGPainter.h"
+#include "ViewerAccessible.h"
 #include "ViewerBackdrop.h"
 #include "ViewerImageFeed.h"
 #include "ViewerStatusLine.h"
@@ -15,6 +16,7 @@
 #include "orbane/RegistryList.h"
 #include "orbane/ScriptVal.h"
 
+#include <QAccessible>
 #include <QAction>
 #include <QEventLoop>
 #include <QPainter>
@@ -41,6 +43,11 @@ ViewerPanel::ViewerPanel(OrbaneDoc *doc, QWidget *parent)
 {
     setMouseTracking(true);
     setFocusPolicy(Qt::StrongFocus);
+    // Overlays are painted: accessibility tools learn of them through the
+    // viewer's interface, one child per overlay.
+    static const bool factoryInstalled = (QAccessible::installFactory(ViewerAccessible::Factory), true);
+    Q_UNUSED(factoryInstalled);
+    setAccessibleName(tr("Viewer"));
     setMinimumSize(64, 64);
     mInfo.SetCursorHandler([this](const QCursor *cursor) {
         if (cursor)
