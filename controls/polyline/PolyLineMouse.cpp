@@ -195,8 +195,8 @@ void PolyLineMouse::MovePoints(OrbPoint delta)
 void PolyLineMouse::MoveShapeBox(const PreviewInfo &info)
 {
     const QTransform toViewer = ToViewer(info);
-    const QTransform inViewer =
-        mControl.mShapeBox->Drag(mBoxPart, mPressViewer, info.MouseInViewer(), bool(HeldModifiers() & Qt::ShiftModifier));
+    const QTransform inViewer = mControl.mShapeBox->Drag(mBoxPart, mPressViewer, info.MouseInViewer(),
+                                                         bool(HeldModifiers() & Qt::ShiftModifier));
     const QTransform t = toViewer * inViewer * toViewer.inverted();
     const std::vector<uint8> movable = PolyLineShapes::Movable(*mPressShape, mControl.mSelection);
     AutoRef<PolyLine> shape = CloneOf(*mPressShape);

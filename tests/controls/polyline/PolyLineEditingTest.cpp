@@ -107,8 +107,8 @@ void PolyLineEditingTest::selection_data()
     const int none = Qt::NoModifier, shift = Qt::ShiftModifier, ctrl = Qt::ControlModifier;
     QTest::newRow("a click selects one") << Indices{0, 2} << int(A_Click) << 1 << none << Indices{1};
     QTest::newRow("shift-click adds") << Indices{0} << int(A_Click) << 2 << shift << Indices{0, 2};
-    QTest::newRow("shift-click on a selected one keeps it") << Indices{0, 2} << int(A_Click) << 2 << shift
-                                                            << Indices{0, 2};
+    QTest::newRow("shift-click on a selected one keeps it")
+        << Indices{0, 2} << int(A_Click) << 2 << shift << Indices{0, 2};
     QTest::newRow("ctrl-click takes one off") << Indices{0, 2} << int(A_Click) << 2 << ctrl << Indices{0};
     QTest::newRow("ctrl-click puts one on") << Indices{0} << int(A_Click) << 3 << ctrl << Indices{0, 3};
     QTest::newRow("a click on one of several selected: it alone")
@@ -117,8 +117,7 @@ void PolyLineEditingTest::selection_data()
     QTest::newRow("shift-box adds") << Indices{3} << int(A_Box) << 0 << shift << Indices{1, 2, 3};
     QTest::newRow("ctrl-box toggles") << Indices{1} << int(A_Box) << 0 << ctrl << Indices{2};
     QTest::newRow("a click on nothing empties") << Indices{0, 1} << int(A_ClickEmpty) << 0 << none << Indices{};
-    QTest::newRow("shift-click on nothing keeps") << Indices{0, 1} << int(A_ClickEmpty) << 0 << shift
-                                                  << Indices{0, 1};
+    QTest::newRow("shift-click on nothing keeps") << Indices{0, 1} << int(A_ClickEmpty) << 0 << shift << Indices{0, 1};
 }
 
 void PolyLineEditingTest::selection()
@@ -146,7 +145,7 @@ void PolyLineEditingTest::selection()
 
 void PolyLineEditingTest::drags_data()
 {
-    QTest::addColumn<bool>("handles");  // point 1 smooth
+    QTest::addColumn<bool>("handles");   // point 1 smooth
     QTest::addColumn<Indices>("select"); // by hand first
     QTest::addColumn<OrbPoint>("press"); // image point
     QTest::addColumn<int>("mods");
@@ -162,9 +161,8 @@ void PolyLineEditingTest::drags_data()
     // stay opposite and keeps its length of 0.05.
     const OrbPoint arm(0.05, 0.1);
     const OrbPoint turned = OrbPoint(0.4, 0.2) - arm * (0.05 / arm.Length());
-    QTest::newRow("one point") << false << Indices{} << kCorners[1] << none << QPoint(40, 20) << 1
-                               << OrbPoint(0.5, 0.3) << OrbPoint(0.5, 0.3) << OrbPoint(0.5, 0.3) << kCorners[2]
-                               << QStringList{"Move Point"};
+    QTest::newRow("one point") << false << Indices{} << kCorners[1] << none << QPoint(40, 20) << 1 << OrbPoint(0.5, 0.3)
+                               << OrbPoint(0.5, 0.3) << OrbPoint(0.5, 0.3) << kCorners[2] << QStringList{"Move Point"};
     QTest::newRow("several selected move together")
         << false << Indices{1, 2} << kCorners[1] << none << QPoint(40, 0) << 1 << OrbPoint(0.5, 0.2)
         << OrbPoint(0.5, 0.2) << OrbPoint(0.5, 0.2) << OrbPoint(0.7, 0.2) << QStringList{"Move points"};
@@ -177,8 +175,8 @@ void PolyLineEditingTest::drags_data()
     // The middle of the first segment pulled 20 pixels up: both handles of
     // the segment move 4/3 of that, so the curve's middle follows the mouse.
     QTest::newRow("a segment is shaped") << false << Indices{} << OrbPoint(0.3, 0.2) << none << QPoint(0, 20) << 0
-                                         << kCorners[0] << kCorners[0] << OrbPoint(0.2, 0.2 + 0.4 / 3.0)
-                                         << kCorners[2] << QStringList{"Shape points"};
+                                         << kCorners[0] << kCorners[0] << OrbPoint(0.2, 0.2 + 0.4 / 3.0) << kCorners[2]
+                                         << QStringList{"Shape points"};
 }
 
 void PolyLineEditingTest::drags()

@@ -36,7 +36,8 @@ inline Input *AddShapeValue(ViewerFixture &f, const PolyLine *shape, const TagLi
     return f.tool->AddInput(OrbID(id), id, CLSID_DataType_Polyline, attrs, shape);
 }
 
-inline Input *AddShape(ViewerFixture &f, const Points &points, const TagList &more = TagList(), const char *id = "Shape")
+inline Input *AddShape(ViewerFixture &f, const Points &points, const TagList &more = TagList(),
+                       const char *id = "Shape")
 {
     return AddShapeValue(f, MakeShape(points).get(), more, id);
 }
