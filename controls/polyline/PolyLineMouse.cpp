@@ -219,6 +219,8 @@ void PolyLineMouse::Write(const char *undo, PolyLine *shape)
 void PolyLineMouse::Release(const PreviewInfo &info)
 {
     PolyLineEditor &edit = mControl.Editor();
+    // The release may come where no move went before it.
+    mTo = OrbPoint(info.MouseX, info.MouseY);
     const bool click = !Moved(info);
     if (mGesture == PMG_Points && mReselect && click)
         edit.Select({mHit.item}, PolyLineEditor::SH_Replace);
