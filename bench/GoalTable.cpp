@@ -29,6 +29,9 @@ const std::vector<Goal> &Goals()
          "a scan of every point"},
         {"V2", "hover over 100 each of six layer overlays (transform to image), one mouse event",
          "BM_Viewer_HoverLayers/100", nullptr, 0.5, ""},
+        {"E1", "drag one point of a 10,000-point shape: one mouse move with the repaint",
+         "BM_Viewer_DragPolyLinePoint/10000", nullptr, 2.0, ""},
+        {"E2", "select by box among 100,000 points, press to release", "BM_Viewer_BoxSelect/100000", nullptr, 5.0, ""},
     };
     return goals;
 }

@@ -17,6 +17,7 @@
 #include "orbane/PreviewInfo.h"
 #include "orbane/ScriptVal.h"
 
+#include <algorithm>
 #include <cmath>
 
 namespace Orbane {
@@ -484,13 +485,22 @@ void PolyLineControl::BuildHandles(const PreviewInfo &info, HandleSet &handles) 
     const bool selected = !points && !(mDisplayFlags & PLD_Handles) && (mDisplayFlags & PLD_SelectedWhenHidden);
     const bool ends = mDisplayFlags & PLD_Handles;
     const int32 count = shape->GetCount();
+    // Only the handles the mouse can reach: a hit test of a large shape
+    // then costs a walk over its points, not a handle for each.
+    const OrbPoint mouse = info.MouseInViewer();
+    const float64 reach = HandleReach(info);
+    auto add = [&](OrbPoint image, uint32 part, int32 priority, int32 i) {
+        const OrbPoint at = info.TransformOut(image);
+        if (std::fabs(at.x - mouse.x) <= reach && std::fabs(at.y - mouse.y) <= reach)
+            handles.AddPixelSquare(at, part, priority).item = i;
+    };
     for (int32 i = 0; i < count; ++i) {
         const PolyPoint &pt = *shape->GetPoint(i);
         if (points || (selected && mSelection.IsSet(i)))
-            handles.AddPixelSquare(info.TransformOut(pt.Pos()), PLP_Point).item = i;
+            add(pt.Pos(), PLP_Point, HP_Point, i);
         if (ends && mSelection.IsSet(i)) {
-            handles.AddPixelSquare(info.TransformOut(pt.In()), PLP_InHandle, HP_Tangent).item = i;
-            handles.AddPixelSquare(info.TransformOut(pt.Out()), PLP_OutHandle, HP_Tangent).item = i;
+            add(pt.In(), PLP_InHandle, HP_Tangent, i);
+            add(pt.Out(), PLP_OutHandle, HP_Tangent, i);
         }
     }
 }
@@ -501,7 +511,33 @@ bool PolyLineControl::HoverBounds(const PreviewInfo &info, OrbRect &bounds) cons
 {
     if (IsAppending())
         return false;
-    return HandleOverlay::HoverBounds(info, bounds);
+    const AutoRef<PolyLine> shape = Shape();
+    bounds = OrbRect(1.0, 1.0, 0.0, 0.0);
+    if (!shape || shape->GetCount() == 0)
+        return true;
+    // Every key point and the handle ends of the selected ones, with room
+    // for a marker, the pick tolerance and the shape box's turning ring.
+    OrbRect image(shape->First()->Pos(), shape->First()->Pos());
+    auto grow = [&image](OrbPoint p) {
+        image =
+            OrbRect(std::min(image.x1, p.x), std::min(image.y1, p.y), std::max(image.x2, p.x), std::max(image.y2, p.y));
+    };
+    for (int32 i = 0; i < shape->GetCount(); ++i) {
+        const PolyPoint &p = *shape->GetPoint(i);
+        grow(p.Pos());
+        if (mSelection.IsSet(i))
+            grow(p.In()), grow(p.Out());
+    }
+    const OrbRect viewer = info.TransformOut(image).Normalized();
+    const float64 margin = HandleReach(info) + (ShapeBox::RotateReach + 1.0) * info.PickTolerance;
+    bounds = OrbRect(viewer.x1 - margin, viewer.y1 - margin, viewer.x2 + margin, viewer.y2 + margin);
+    return true;
+}
+
+// How far from the mouse a marker may be and still be hit (viewer units).
+float64 PolyLineControl::HandleReach(const PreviewInfo &info)
+{
+    return PolyLineDrawing::MarkerSide(2.0 * info.HandleScale) + 2.0 * info.PickTolerance;
 }
 
 uint64 PolyLineControl::ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags)

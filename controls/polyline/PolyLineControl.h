@@ -155,6 +155,7 @@ private:
     void DrawOuter(Graphics::GPainter &p, const PolyLineStyle &style) const;
     void EndStroke(const PreviewInfo &info);
     static OrbPoint OnePixel(const PreviewInfo &info);
+    static float64 HandleReach(const PreviewInfo &info);
     void OpenStep(const char *name);
     void CloseStep();
 
