@@ -33,6 +33,9 @@ const std::vector<Goal> &Goals()
          "BM_StdMap_FillAndFind/50000", 3.0, "a std::unordered_map of the same strings"},
         {"X1", "time change re-evaluating 1000 expression Inputs", "BM_Expressions_TimeChange/1000",
          "BM_PlainSetValue_TimeChange/1000", 2.0, "1000 plain SetValue calls"},
+        {"E1", "drag one point of a 10,000-point shape: one mouse move with the repaint",
+         "BM_Viewer_DragPolyLinePoint/10000", nullptr, 2.0, ""},
+        {"E2", "select by box among 100,000 points, press to release", "BM_Viewer_BoxSelect/100000", nullptr, 5.0, ""},
     };
     return goals;
 }

@@ -17,6 +17,7 @@
 #include "orbane/PreviewInfo.h"
 #include "orbane/ScriptVal.h"
 
+#include <algorithm>
 #include <cmath>
 
 namespace Orbane {
@@ -255,6 +256,23 @@ void PolyLineControl::GetState(ScriptVal &state) const
     state.SetKey(ScriptVal("selected"), selected);
     const AutoRef<PolyLine> shape = Shape();
     state.SetKey(ScriptVal("points"), ScriptVal(shape ? shape->GetCount() : 0));
+    ScriptVal locked = ScriptVal::NewTable();
+    for (int32 i = 0, n = 0; shape && i < shape->GetCount(); ++i)
+        if (shape->GetPoint(i)->Flags & PPF_Locked)
+            locked.SetKey(ScriptVal(++n), ScriptVal(i));
+    state.SetKey(ScriptVal("lockedPoints"), locked);
+    state.SetKey(ScriptVal("selectionLocked"), ScriptVal(mEditor.IsSelectionLocked()));
+    state.SetKey(ScriptVal("lockPairs"), ScriptVal(mEditor.LockPairs()));
+    state.SetKey(ScriptVal("multiFrame"), ScriptVal(mEditor.GetMultiFrame()));
+    state.SetKey(ScriptVal("currentTimeOnly"), ScriptVal(mCurrentTimeOnly));
+    state.SetKey(ScriptVal("shapeBox"), ScriptVal(mEditor.GetShapeBox()));
+    state.SetKey(ScriptVal("gesture"), ScriptVal(int(mMouse.Current())));
+    state.SetKey(ScriptVal("message"), ScriptVal(mEditor.Message().c_str()));
+    ScriptVal keys = ScriptVal::NewTable();
+    int32 k = 0;
+    for (const float64 t : mEditor.KeyTimes())
+        keys.SetKey(ScriptVal(++k), ScriptVal(t));
+    state.SetKey(ScriptVal("keyTimes"), keys);
 }
 
 // --- values ---
@@ -342,6 +360,8 @@ bool PolyLineControl::IsAppending() const
 
 void PolyLineControl::SetInactive(const TagList *tags)
 {
+    mMouse.Cancel();
+    mEditor.EndNudge();
     CloseStep();
     mCreation.gesture = PolyLineCreation::PCG_None;
     HandleOverlay::SetInactive(tags);
@@ -377,7 +397,8 @@ PolyLineStyle PolyLineControl::Style(const PreviewInfo &info) const
     s.half = OrbPoint(half / s.span.x, half / s.span.y);
     s.hot = Handles().PickedHit() ? Handles().PickedHit() : Handles().PoisedHit();
     s.pending = mCreation.gesture == PolyLineCreation::PCG_Click ||
-                (mCreation.gesture == PolyLineCreation::PCG_Move && !mSelection.IsMultiSet());
+                (mCreation.gesture == PolyLineCreation::PCG_Edit && mMouse.Current() == PolyLineMouse::PMG_Points &&
+                 !mSelection.IsMultiSet());
     return s;
 }
 
@@ -398,6 +419,8 @@ void PolyLineControl::DrawControls(PreviewInfo *info, const TagList *tags)
     const PolyLineStyle style = Style(*info);
     if (mShape)
         mDrawing.Draw(*p, *mShape, mSelection, style);
+    DrawOuter(*p, style);
+    mMouse.Draw(*p, *info, style);
     if (mCreation.gesture == PolyLineCreation::PCG_Stroke) {
         p->Color(style.curve, style.shadow);
         PolyLineDrawing::DrawStrip(*p, mCreation.StrokePoints());
@@ -462,13 +485,22 @@ void PolyLineControl::BuildHandles(const PreviewInfo &info, HandleSet &handles) 
     const bool selected = !points && !(mDisplayFlags & PLD_Handles) && (mDisplayFlags & PLD_SelectedWhenHidden);
     const bool ends = mDisplayFlags & PLD_Handles;
     const int32 count = shape->GetCount();
+    // Only the handles the mouse can reach: a hit test of a large shape
+    // then costs a walk over its points, not a handle for each.
+    const OrbPoint mouse = info.MouseInViewer();
+    const float64 reach = HandleReach(info);
+    auto add = [&](OrbPoint image, uint32 part, int32 priority, int32 i) {
+        const OrbPoint at = info.TransformOut(image);
+        if (std::fabs(at.x - mouse.x) <= reach && std::fabs(at.y - mouse.y) <= reach)
+            handles.AddPixelSquare(at, part, priority).item = i;
+    };
     for (int32 i = 0; i < count; ++i) {
         const PolyPoint &pt = *shape->GetPoint(i);
         if (points || (selected && mSelection.IsSet(i)))
-            handles.AddPixelSquare(info.TransformOut(pt.Pos()), PLP_Point).item = i;
+            add(pt.Pos(), PLP_Point, HP_Point, i);
         if (ends && mSelection.IsSet(i)) {
-            handles.AddPixelSquare(info.TransformOut(pt.In()), PLP_InHandle, HP_Tangent).item = i;
-            handles.AddPixelSquare(info.TransformOut(pt.Out()), PLP_OutHandle, HP_Tangent).item = i;
+            add(pt.In(), PLP_InHandle, HP_Tangent, i);
+            add(pt.Out(), PLP_OutHandle, HP_Tangent, i);
         }
     }
 }
@@ -479,14 +511,48 @@ bool PolyLineControl::HoverBounds(const PreviewInfo &info, OrbRect &bounds) cons
 {
     if (IsAppending())
         return false;
-    return HandleOverlay::HoverBounds(info, bounds);
+    const AutoRef<PolyLine> shape = Shape();
+    bounds = OrbRect(1.0, 1.0, 0.0, 0.0);
+    if (!shape || shape->GetCount() == 0)
+        return true;
+    // Every key point and the handle ends of the selected ones, with room
+    // for a marker, the pick tolerance and the shape box's turning ring.
+    OrbRect image(shape->First()->Pos(), shape->First()->Pos());
+    auto grow = [&image](OrbPoint p) {
+        image =
+            OrbRect(std::min(image.x1, p.x), std::min(image.y1, p.y), std::max(image.x2, p.x), std::max(image.y2, p.y));
+    };
+    for (int32 i = 0; i < shape->GetCount(); ++i) {
+        const PolyPoint &p = *shape->GetPoint(i);
+        grow(p.Pos());
+        if (mSelection.IsSet(i))
+            grow(p.In()), grow(p.Out());
+    }
+    const OrbRect viewer = info.TransformOut(image).Normalized();
+    const float64 margin = HandleReach(info) + (ShapeBox::RotateReach + 1.0) * info.PickTolerance;
+    bounds = OrbRect(viewer.x1 - margin, viewer.y1 - margin, viewer.x2 + margin, viewer.y2 + margin);
+    return true;
+}
+
+// How far from the mouse a marker may be and still be hit (viewer units).
+float64 PolyLineControl::HandleReach(const PreviewInfo &info)
+{
+    return PolyLineDrawing::MarkerSide(2.0 * info.HandleScale) + 2.0 * info.PickTolerance;
 }
 
 uint64 PolyLineControl::ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags)
 {
     const uint64 result = HandleOverlay::ControlCommand(info, command, data, tags);
-    if (command == CCMD_HitTest)
-        ShowCursor(*info, IsAppending() && !(data & 1));
+    if (command == CCMD_HitTest) {
+        // Over the shape box its part's cursor shows.
+        const int32 boxCursor = IsAppending() ? -1 : mMouse.HoverCursor(*info);
+        if (boxCursor >= 0)
+            mCurrentCursor = &mCursors[std::size_t(boxCursor)];
+        else if (!IsAppending())
+            mCurrentCursor = &mCursors[0];
+        ShowCursor(*info, (IsAppending() && !(data & 1)) || boxCursor >= 0);
+        return boxCursor >= 0 ? result | 1 : result;
+    }
     return result;
 }
 
@@ -521,8 +587,10 @@ DragType PolyLineControl::ControlDown(PreviewInfo *info, const OrbPointI &mouse,
         BeginClick(hit, at);
     else if (CanCreate())
         BeginStroke(at);
-    else if (hit && GetMainInput() && !mShapeReadOnly && ModeOf() != PLM_Done)
-        BeginMove(*info, hit);
+    else if (CanEditByMouse() && mMouse.Press(*info, hit)) {
+        mCreation.gesture = PolyLineCreation::PCG_Edit;
+        Pick(hit);
+    }
     if (mCreation.gesture != PolyLineCreation::PCG_None) {
         mDragType = DRAG_Handle;
         ShowCursor(*info, IsAppending());
@@ -560,18 +628,11 @@ void PolyLineControl::BeginStroke(OrbPoint at)
     mCreation.gesture = PolyLineCreation::PCG_Stroke;
 }
 
-void PolyLineControl::BeginMove(const PreviewInfo &info, HandleHit hit)
+// Points are edited in "Insert and Modify" and "Modify Only" (presses
+// pass through in the other modes, so the shape can be left alone).
+bool PolyLineControl::CanEditByMouse() const
 {
-    const AutoRef<PolyLine> shape = Shape();
-    const PolyPoint &pt = *shape->GetPoint(hit.item);
-    const OrbPoint held = hit.part == PLP_InHandle ? pt.In() : hit.part == PLP_OutHandle ? pt.Out() : pt.Pos();
-    mGrabOffset = info.TransformOut(held) - info.MouseInViewer();
-    mCreation.gesture = PolyLineCreation::PCG_Move;
-    mCreation.index = hit.item;
-    mCreation.part = hit.part;
-    if (hit.part == PLP_Point && !mSelection.IsSet(hit.item))
-        mSelection.DoSet(hit.item, SelMask::SEL_Only);
-    Pick(hit);
+    return GetMainInput() && mShape && !mShapeReadOnly && (ModeOf() == PLM_InsertModify || ModeOf() == PLM_ModifyOnly);
 }
 
 void PolyLineControl::ControlMove(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
@@ -588,8 +649,8 @@ void PolyLineControl::ControlMove(PreviewInfo *info, const OrbPointI &mouse, con
         if (mCreation.AddSample({at, mStrokeClock.elapsed() / 1000.0, 1.0}, OnePixel(*info)))
             Redraw();
         break;
-    case PolyLineCreation::PCG_Move:
-        MovePicked(*info);
+    case PolyLineCreation::PCG_Edit:
+        mMouse.Move(*info);
         break;
     default:
         break;
@@ -610,15 +671,6 @@ void PolyLineControl::PullHandles(const PreviewInfo &info, OrbPoint to)
     WriteShape(PolyLineCreation::Pulled(*shape, mCreation.index, to));
 }
 
-void PolyLineControl::MovePicked(const PreviewInfo &info)
-{
-    const AutoRef<PolyLine> shape = Shape();
-    const OrbPoint to = info.TransformIn(info.MouseInViewer() + mGrabOffset);
-    if (!mStepOpen)
-        OpenStep("Move Point");
-    WriteShape(PolyLineCreation::Moved(*shape, mCreation.index, mCreation.part, to));
-}
-
 OrbPoint PolyLineControl::OnePixel(const PreviewInfo &info)
 {
     return OrbPoint(1.0 / info.Mapping().SpanX(), 1.0 / info.Mapping().SpanY());
@@ -628,6 +680,8 @@ void PolyLineControl::ControlUp(PreviewInfo *info, const OrbPointI &mouse, const
 {
     if (mCreation.gesture == PolyLineCreation::PCG_Stroke)
         EndStroke(*info);
+    if (mCreation.gesture == PolyLineCreation::PCG_Edit)
+        mMouse.Release(*info);
     mCreation.gesture = PolyLineCreation::PCG_None;
     CloseStep();
     HandleOverlay::ControlUp(info, mouse, tags);
@@ -667,6 +721,54 @@ void PolyLineControl::EndStroke(const PreviewInfo &info)
         SetMode(PLM_InsertModify);
 }
 
+// --- the pair of shapes ---
+
+Input *PolyLineControl::InnerInput() const
+{
+    return mOuterInput ? GetMainInput() : mInnerInput;
+}
+
+Input *PolyLineControl::OuterInput() const
+{
+    return mOuterInput ? mOuterInput : mInnerInput ? GetMainInput() : nullptr;
+}
+
+AutoRef<PolyLine> PolyLineControl::InnerShape() const
+{
+    return AutoParam<PolyLine>(InnerInput(), GetCurrentTime());
+}
+
+AutoRef<PolyLine> PolyLineControl::OuterShape() const
+{
+    return AutoParam<PolyLine>(OuterInput(), GetCurrentTime());
+}
+
+void PolyLineControl::FollowInner(const PolyLine &inner)
+{
+    const AutoRef<PolyLine> outer = mPairing == PAIR_Follow && mOuterInput ? OuterShape() : AutoRef<PolyLine>();
+    if (!outer || outer->GetCount() != inner.GetCount())
+        return;
+    AutoRef<PolyLine> moved(static_cast<PolyLine *>(outer->Clone()));
+    if (moved->UpdateShape(inner))
+        mOuterInput->SetValue(moved.get(), GetCurrentTime());
+}
+
+// The outer shape of a pair, dotted, while it is in use.
+void PolyLineControl::DrawOuter(GPainter &p, const PolyLineStyle &style) const
+{
+    if (!mOuterInput || mPairing == PAIR_Off)
+        return;
+    const AutoRef<PolyLine> outer = OuterShape();
+    if (!outer || outer->GetCount() == 0)
+        return;
+    p.PushAttrib();
+    p.LineStipple(1, 0xF0F0);
+    p.Enable(Graphics::GC_LineStipple);
+    p.Color(style.curve, style.shadow);
+    PolyLineDrawing::DrawCurve(p, *outer, style.span);
+    p.PopAttrib();
+}
+
 bool PolyLineControl::WriteShape(PolyLine *shape)
 {
     return shape && SetInputs(shape, GetCurrentTime(), 0, nullptr);
@@ -686,6 +788,9 @@ void PolyLineControl::CloseStep()
 {
     if (!std::exchange(mStepOpen, false))
         return;
+    // The base's own level, opened by the first write inside this step,
+    // closes first: an edit from a key or the menu has no release to do it.
+    ResetUndo(nullptr);
     if (OrbaneDoc *doc = GetDoc())
         doc->EndUndo(true);
 }
