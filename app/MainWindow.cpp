@@ -22,6 +22,9 @@ MainWindow::MainWindow(OrbaneDoc *doc, QWidget *parent) : QMainWindow(parent), m
     resize(1280, 800);
     mViewer = new ViewerPanel(doc);
     setCentralWidget(mViewer);
+    // What an overlay tells the user stays long enough to be read.
+    connect(mViewer, &ViewerPanel::overlayMessage, this,
+            [this](const QString &message) { statusBar()->showMessage(message, 8000); });
 
     auto *dock = new QDockWidget("Inspector", this);
     dock->setObjectName("inspector");

@@ -396,8 +396,10 @@ void PolyLineControl::DrawControls(PreviewInfo *info, const TagList *tags)
     p->Translate(m.Origin().x, m.Origin().y);
     p->Scale(m.SpanX(), m.SpanY());
     const PolyLineStyle style = Style(*info);
-    if (mShape)
+    if (mShape) {
         mDrawing.Draw(*p, *mShape, mSelection, style);
+        DrawExtras(*p, *mShape, style);
+    }
     if (mCreation.gesture == PolyLineCreation::PCG_Stroke) {
         p->Color(style.curve, style.shadow);
         PolyLineDrawing::DrawStrip(*p, mCreation.StrokePoints());
@@ -431,17 +433,20 @@ void PolyLineControl::DrawCentre(GPainter &p, const PreviewInfo &info) const
 void PolyLineControl::DrawOnionSkins(GPainter &p, const PreviewInfo &info, const PolyLineStyle &style) const
 {
     Input *main = GetMainInput();
-    if (!main || !main->IsAnimated())
+    if (!main || !main->IsAnimated() || !mSettings.onionEnabled)
         return;
     const float64 now = GetCurrentTime();
     p.PushAttrib();
     p.LineStipple(1, kOnionStipple);
     p.Enable(Graphics::GC_LineStipple);
-    p.Color(kOnionColor, info.GetShadow(OrbColor()).Faded(0.5f));
     for (const float64 time : main->KeyTimes()) {
         if (std::fabs(time - now) < 1e-9)
             continue;
         const AutoParam<PolyLine> skin(main, time);
+        // The skins before now in their own colour, where one is set.
+        const bool prev = time < now && !mSettings.onionPrevColor.IsNone();
+        p.Color(prev ? GColor::FromOrb(mSettings.onionPrevColor) : kOnionColor,
+                info.GetShadow(OrbColor()).Faded(0.5f));
         if (skin)
             PolyLineDrawing::DrawCurve(p, *skin, style.span);
     }
@@ -480,14 +485,6 @@ bool PolyLineControl::HoverBounds(const PreviewInfo &info, OrbRect &bounds) cons
     if (IsAppending())
         return false;
     return HandleOverlay::HoverBounds(info, bounds);
-}
-
-uint64 PolyLineControl::ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags)
-{
-    const uint64 result = HandleOverlay::ControlCommand(info, command, data, tags);
-    if (command == CCMD_HitTest)
-        ShowCursor(*info, IsAppending() && !(data & 1));
-    return result;
 }
 
 // The control's cursor while it takes the viewer's presses; the viewer's

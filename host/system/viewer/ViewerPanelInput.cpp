@@ -277,7 +277,7 @@ bool ViewerPanel::TriggerMenuAction(QAction *action)
     const auto it = mMenuOwners.find(action);
     if (it == mMenuOwners.end() || !IsOverlay(it->second))
         return false;
-    return it->second->HandleMenu(action->data().toInt(), &mInfo, nullptr);
+    return it->second->HandleMenu(action->data().toInt(), &mInfo, &mCommandTags);
 }
 
 void ViewerPanel::contextMenuEvent(QContextMenuEvent *event)
