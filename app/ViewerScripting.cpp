@@ -270,7 +270,8 @@ QStringList PathArg(const LuaArgs &args, int idx)
     return path;
 }
 
-// An entry matches by its whole text or by the text before its shortcut
+// The first entry (that of the overlay under the mouse, where there is one)
+// matches by its whole text or by the text before its shortcut
 // ("Edit Point" for "Edit Point\tE").
 QAction *FindAction(const QList<QAction *> &actions, const QStringList &path)
 {
@@ -278,7 +279,7 @@ QAction *FindAction(const QList<QAction *> &actions, const QStringList &path)
     for (int i = 0; i < path.size(); ++i) {
         QAction *found = nullptr;
         for (QAction *a : level)
-            if (!a->isSeparator() && (a->text() == path[i] || a->text().section('\t', 0, 0) == path[i]))
+            if (!found && !a->isSeparator() && (a->text() == path[i] || a->text().section('\t', 0, 0) == path[i]))
                 found = a;
         if (!found || (i + 1 < path.size() && !found->menu()))
             return nullptr;

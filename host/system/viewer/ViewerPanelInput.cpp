@@ -260,7 +260,14 @@ void ViewerPanel::FillContextMenu(QMenu *menu)
 {
     mMenuOwners.clear();
     SetMouse(mLastMouse);
-    for (PreviewControl *overlay : ByPriority()) {
+    // The overlay under the mouse offers its entries first, then the others
+    // from the topmost down.
+    std::vector<PreviewControl *> order = ByPriority();
+    if (PreviewControl *under = UnderMouse()) {
+        order.erase(std::remove(order.begin(), order.end(), under), order.end());
+        order.insert(order.begin(), under);
+    }
+    for (PreviewControl *overlay : order) {
         std::vector<QAction *> before;
         CollectActions(menu, before);
         overlay->AddToMenu(menu, &mInfo, nullptr);
