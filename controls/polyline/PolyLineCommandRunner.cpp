@@ -14,6 +14,7 @@
 #include <QColor>
 #include <QColorDialog>
 #include <QFileDialog>
+#include <QInputDialog>
 
 #include <algorithm>
 #include <cmath>
@@ -56,10 +57,10 @@ bool PolyLineCommandRunner::Run(int32 command, int32 arg)
         return Mode(command);
     case PLCMD_Closed: {
         const AutoRef<PolyLine> shape = c.Shape();
-        return SetClosed(!(shape && shape->IsClosed()));
+        return Edited(c.mEditor.SetClosed(!(shape && shape->IsClosed())));
     }
     case PLCMD_ClosePolygon:
-        return SetClosed(true);
+        return Edited(c.mEditor.SetClosed(true));
     case PLCMD_ShowKeyPoints:
     case PLCMD_ShowHandles:
     case PLCMD_ShowPolygon:
@@ -70,25 +71,29 @@ bool PolyLineCommandRunner::Run(int32 command, int32 arg)
     case PLCMD_PointNumbers:
         return Toggle(c.mSettings.pointNumbers);
     case PLCMD_CurrentTimeOnly:
-        return Toggle(c.mCurrentTimeOnly);
+        c.mEditor.SetCurrentTimeOnly(!c.mEditor.CurrentTimeOnly());
+        c.Redraw();
+        return true;
     case PLCMD_StopRendering:
         c.mStopRendering = c.mStopRendering ? 0 : 1;
         return true;
     case PLCMD_LockSelection:
-        return Toggle(c.mSettings.lockSelection);
+        c.mEditor.SetSelectionLocked(!c.mEditor.IsSelectionLocked());
+        return true;
     case PLCMD_PublishPathPoints:
         return Toggle(c.mSettings.publishPathPoints);
     case PLCMD_LockPointPairs:
-        return Toggle(c.mSettings.lockPointPairs);
+        c.mEditor.SetLockPairs(!c.mEditor.LockPairs());
+        return true;
     case PLCMD_MultiFrame:
-        c.mSettings.multiFrame = std::clamp(arg, 0, 3);
+        c.mEditor.SetMultiFrame(std::clamp(arg, 0, 3));
         return true;
     case PLCMD_EditMultiplePolys:
         return EditMultiplePolys();
     case PLCMD_SelectAll:
-        return SelectAll();
+        return Edited(c.mEditor.SelectAll());
     case PLCMD_NextPoint:
-        return NextPoint(arg);
+        return Edited(c.mEditor.SelectNext(arg));
     case PLCMD_NextKeyframe:
         return NextKeyframe(arg);
     case PLCMD_KeyframeList:
@@ -234,21 +239,6 @@ bool PolyLineCommandRunner::Write(const char *undo, PolyLine *shape)
         return Tell(std::string(undo) + ": the shape was not written");
     mControl.Redraw();
     return true;
-}
-
-bool PolyLineCommandRunner::SetClosed(bool closed)
-{
-    const char *undo = closed ? "Close polygon" : "Open polygon";
-    if (!Editable(undo))
-        return false;
-    const AutoRef<PolyLine> shape = mControl.Shape();
-    if (!shape || shape->GetCount() < 2)
-        return Tell(std::string(undo) + ": the shape needs two points or more");
-    if (shape->IsClosed() == closed)
-        return Tell(std::string(undo) + (closed ? ": the shape is closed already" : ": the shape is open already"));
-    AutoRef<PolyLine> edited(static_cast<PolyLine *>(shape->Clone()));
-    closed ? edited->Close() : edited->Open();
-    return Write(undo, edited.get());
 }
 
 // A new shape about the image's centre, in place of the one there is.
@@ -557,86 +547,114 @@ bool PolyLineCommandRunner::KeyframeList()
     return Tell(list);
 }
 
-// --- selection ---
-
-bool PolyLineCommandRunner::SelectAll()
-{
-    const AutoRef<PolyLine> shape = mControl.Shape();
-    if (!shape || shape->GetCount() == 0)
-        return Tell("Select All: the shape has no points");
-    for (int32 i = 0; i < shape->GetCount(); ++i)
-        mControl.mSelection.DoSet(i, SelMask::SEL_Set);
-    mControl.Redraw();
-    return true;
-}
-
-// Tab: the single selection moves on to the next point (round a closed
-// shape, and from the last point of an open one back to the first).
-bool PolyLineCommandRunner::NextPoint(int32 step)
-{
-    const AutoRef<PolyLine> shape = mControl.Shape();
-    const int32 n = shape ? shape->GetCount() : 0;
-    if (n == 0)
-        return Tell("Next point: the shape has no points");
-    SelMask &sel = mControl.mSelection;
-    const int32 last = sel.GetSetCount() > 0 ? sel.GetSetItem(sel.GetSetCount() - 1) : -1;
-    const int32 next = last < 0 ? 0 : ((last + step) % n + n) % n;
-    sel.DoSet(next, SelMask::SEL_Only);
-    mControl.Redraw();
-    return true;
-}
-
 // --- the editing operations ---
 
+// The edits of the points are the editor's; it refuses with a message.
 bool PolyLineCommandRunner::Editing(int32 command, int32 arg)
 {
-    (void)arg;
+    PolyLineEditor &e = mControl.mEditor;
     switch (command) {
     case PLCMD_EditPoint:
         return Missing("Edit Point", "the point editor");
     case PLCMD_DeletePoints:
-        return Missing("Delete Points", "deleting points");
+        return Edited(e.DeleteSelected());
     case PLCMD_Smooth:
-        return Missing("Smooth", "smoothing points");
+        return Edited(e.Smooth());
     case PLCMD_Linear:
-        return Missing("Linear", "making points linear");
+        return Edited(e.MakeLinear());
     case PLCMD_SmoothPoints:
     case PLCMD_SmoothAnimation:
     case PLCMD_EaseInOut:
-        return Missing("Smoothing", "smoothing of points and animation");
+        return Missing("Smoothing", "smoothing of the points' animation");
     case PLCMD_FlipPoints:
-        return Missing("Flip Points", "flipping points");
+        return Edited(e.Flip(arg == 0 ? Qt::Horizontal : Qt::Vertical));
     case PLCMD_TagPoints:
-        return Missing("Tag Points", "tagging points");
+        return Edited(e.TagSelected());
     case PLCMD_LockPoints:
-        return Missing("Lock Points", "locking points");
+        return Edited(e.LockSelected(!e.IsSelectionLockedPoint()));
     case PLCMD_Copy:
+        return Edited(e.Copy());
     case PLCMD_CopyPathValue:
+        return Edited(e.CopyPathValue());
     case PLCMD_Cut:
+        return Edited(e.Cut());
     case PLCMD_Paste:
+        return Edited(e.Paste());
     case PLCMD_PasteWithOffset:
-        return Missing("Clipboard", "copying and pasting shapes");
+        return Edited(e.PasteWithOffset(e.DefaultPasteOffset()));
     case PLCMD_OuterMakeRemove:
+        return Edited(mControl.Pairing() == PolyLineControl::PAIR_Free ? e.RemoveOuter() : e.MakeOuter());
     case PLCMD_OuterEnable:
+        return Edited(e.EnableOuter());
     case PLCMD_OuterReset:
+        return Edited(e.ResetOuter());
     case PLCMD_FollowInner:
-        return Missing("Outer Polyline", "the outer polyline");
-    case PLCMD_ShapeBox:
-        return Missing("Shape Box", "the shape box");
+        return Edited(e.FollowInner());
+    case PLCMD_ShapeBox: {
+        // The entry switches its box on, or off again where it is on.
+        const int32 mode = arg == 1 ? PolyLineEditor::SB_Both : PolyLineEditor::SB_Shape;
+        e.SetShapeBox(e.GetShapeBox() == mode ? int32(PolyLineEditor::SB_Off) : mode);
+        mControl.Redraw();
+        return true;
+    }
     case PLCMD_Subdivide:
-        return Missing("Subdivide", "subdividing");
+        return Edited(e.Subdivide());
     case PLCMD_ReducePoints:
-        return Missing("Reduce Points", "reducing points");
+        return Reduce();
     case PLCMD_PublishPoints:
+        return Edited(e.PublishSelected());
     case PLCMD_UnpublishPoints:
+        return Edited(e.Unpublish());
     case PLCMD_PublishAll:
+        return Edited(e.SelectAll() && e.PublishSelected());
     case PLCMD_FollowNearby:
+        return Edited(e.FollowNearby());
     case PLCMD_StopFollowing:
+        return Missing("Stop Points Following", "letting points stop following");
     case PLCMD_PublishTo:
-        return Missing("Publish", "publishing points");
+        return Edited(e.PublishTo(arg));
     default:
         return Tell("Polyline: unknown command " + std::to_string(command));
     }
+}
+
+// "Reduce Points…": the tolerance in viewer pixels, from a script's value or
+// the dialog; the overlay's freehand tolerance is the dialog's start.
+bool PolyLineCommandRunner::Reduce()
+{
+    PolyLineControl *c = &mControl;
+    const std::string value = Value();
+    if (!value.empty()) {
+        char *end = nullptr;
+        const float64 px = std::strtod(value.c_str(), &end);
+        if (*end || !(px > 0.0) || !std::isfinite(px))
+            return Tell("Reduce Points: \"" + value + "\" is not a tolerance in pixels above 0");
+        return Edited(c->mEditor.Reduce(px));
+    }
+    if (FromScript())
+        return Edited(c->mEditor.Reduce(c->ReduceTolerance()));
+    if (!c->mDialogs)
+        c->mDialogs = std::make_unique<QObject>();
+    auto *dialog = new QInputDialog;
+    dialog->setWindowTitle("Reduce Points");
+    dialog->setLabelText("Tolerance in pixels");
+    dialog->setInputMode(QInputDialog::DoubleInput);
+    dialog->setDoubleRange(0.01, 1000.0);
+    dialog->setDoubleValue(c->ReduceTolerance());
+    dialog->setAttribute(Qt::WA_DeleteOnClose);
+    QObject::connect(c->mDialogs.get(), &QObject::destroyed, dialog, &QObject::deleteLater);
+    QObject::connect(dialog, &QInputDialog::doubleValueSelected, c->mDialogs.get(),
+                     [c](double px) { c->mEditor.Reduce(px); });
+    QObject::connect(dialog, &QDialog::finished, c->mDialogs.get(), [c](int) { c->mSettings.reduceOpen = false; });
+    c->mSettings.reduceOpen = true;
+    dialog->open();
+    return true;
+}
+
+bool PolyLineCommandRunner::Edited(bool done)
+{
+    mControl.Redraw();
+    return done;
 }
 
 bool PolyLineCommandRunner::Tell(const std::string &message)

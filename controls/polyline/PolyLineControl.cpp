@@ -255,6 +255,22 @@ void PolyLineControl::GetState(ScriptVal &state) const
     state.SetKey(ScriptVal("selected"), selected);
     const AutoRef<PolyLine> shape = Shape();
     state.SetKey(ScriptVal("points"), ScriptVal(shape ? shape->GetCount() : 0));
+    ScriptVal locked = ScriptVal::NewTable();
+    for (int32 i = 0, n = 0; shape && i < shape->GetCount(); ++i)
+        if (shape->GetPoint(i)->Flags & PPF_Locked)
+            locked.SetKey(ScriptVal(++n), ScriptVal(i));
+    state.SetKey(ScriptVal("lockedPoints"), locked);
+    state.SetKey(ScriptVal("selectionLocked"), ScriptVal(mEditor.IsSelectionLocked()));
+    state.SetKey(ScriptVal("lockPairs"), ScriptVal(mEditor.LockPairs()));
+    state.SetKey(ScriptVal("multiFrame"), ScriptVal(mEditor.GetMultiFrame()));
+    state.SetKey(ScriptVal("currentTimeOnly"), ScriptVal(mCurrentTimeOnly));
+    state.SetKey(ScriptVal("shapeBox"), ScriptVal(mEditor.GetShapeBox()));
+    state.SetKey(ScriptVal("gesture"), ScriptVal(int(mMouse.Current())));
+    ScriptVal keys = ScriptVal::NewTable();
+    int32 k = 0;
+    for (const float64 t : mEditor.KeyTimes())
+        keys.SetKey(ScriptVal(++k), ScriptVal(t));
+    state.SetKey(ScriptVal("keyTimes"), keys);
 }
 
 // --- values ---
@@ -342,6 +358,8 @@ bool PolyLineControl::IsAppending() const
 
 void PolyLineControl::SetInactive(const TagList *tags)
 {
+    mMouse.Cancel();
+    mEditor.EndNudge();
     CloseStep();
     mCreation.gesture = PolyLineCreation::PCG_None;
     HandleOverlay::SetInactive(tags);
@@ -377,7 +395,8 @@ PolyLineStyle PolyLineControl::Style(const PreviewInfo &info) const
     s.half = OrbPoint(half / s.span.x, half / s.span.y);
     s.hot = Handles().PickedHit() ? Handles().PickedHit() : Handles().PoisedHit();
     s.pending = mCreation.gesture == PolyLineCreation::PCG_Click ||
-                (mCreation.gesture == PolyLineCreation::PCG_Move && !mSelection.IsMultiSet());
+                (mCreation.gesture == PolyLineCreation::PCG_Edit && mMouse.Current() == PolyLineMouse::PMG_Points &&
+                 !mSelection.IsMultiSet());
     return s;
 }
 
@@ -400,6 +419,8 @@ void PolyLineControl::DrawControls(PreviewInfo *info, const TagList *tags)
         mDrawing.Draw(*p, *mShape, mSelection, style);
         DrawExtras(*p, *mShape, style);
     }
+    DrawOuter(*p, style);
+    mMouse.Draw(*p, *info, style);
     if (mCreation.gesture == PolyLineCreation::PCG_Stroke) {
         p->Color(style.curve, style.shadow);
         PolyLineDrawing::DrawStrip(*p, mCreation.StrokePoints());
@@ -518,8 +539,10 @@ DragType PolyLineControl::ControlDown(PreviewInfo *info, const OrbPointI &mouse,
         BeginClick(hit, at);
     else if (CanCreate())
         BeginStroke(at);
-    else if (hit && GetMainInput() && !mShapeReadOnly && ModeOf() != PLM_Done)
-        BeginMove(*info, hit);
+    else if (CanEditByMouse() && mMouse.Press(*info, hit)) {
+        mCreation.gesture = PolyLineCreation::PCG_Edit;
+        Pick(hit);
+    }
     if (mCreation.gesture != PolyLineCreation::PCG_None) {
         mDragType = DRAG_Handle;
         ShowCursor(*info, IsAppending());
@@ -557,18 +580,11 @@ void PolyLineControl::BeginStroke(OrbPoint at)
     mCreation.gesture = PolyLineCreation::PCG_Stroke;
 }
 
-void PolyLineControl::BeginMove(const PreviewInfo &info, HandleHit hit)
+// Points are edited in "Insert and Modify" and "Modify Only" (presses
+// pass through in the other modes, so the shape can be left alone).
+bool PolyLineControl::CanEditByMouse() const
 {
-    const AutoRef<PolyLine> shape = Shape();
-    const PolyPoint &pt = *shape->GetPoint(hit.item);
-    const OrbPoint held = hit.part == PLP_InHandle ? pt.In() : hit.part == PLP_OutHandle ? pt.Out() : pt.Pos();
-    mGrabOffset = info.TransformOut(held) - info.MouseInViewer();
-    mCreation.gesture = PolyLineCreation::PCG_Move;
-    mCreation.index = hit.item;
-    mCreation.part = hit.part;
-    if (hit.part == PLP_Point && !mSelection.IsSet(hit.item))
-        mSelection.DoSet(hit.item, SelMask::SEL_Only);
-    Pick(hit);
+    return GetMainInput() && mShape && !mShapeReadOnly && (ModeOf() == PLM_InsertModify || ModeOf() == PLM_ModifyOnly);
 }
 
 void PolyLineControl::ControlMove(PreviewInfo *info, const OrbPointI &mouse, const TagList *tags)
@@ -585,8 +601,8 @@ void PolyLineControl::ControlMove(PreviewInfo *info, const OrbPointI &mouse, con
         if (mCreation.AddSample({at, mStrokeClock.elapsed() / 1000.0, 1.0}, OnePixel(*info)))
             Redraw();
         break;
-    case PolyLineCreation::PCG_Move:
-        MovePicked(*info);
+    case PolyLineCreation::PCG_Edit:
+        mMouse.Move(*info);
         break;
     default:
         break;
@@ -607,15 +623,6 @@ void PolyLineControl::PullHandles(const PreviewInfo &info, OrbPoint to)
     WriteShape(PolyLineCreation::Pulled(*shape, mCreation.index, to));
 }
 
-void PolyLineControl::MovePicked(const PreviewInfo &info)
-{
-    const AutoRef<PolyLine> shape = Shape();
-    const OrbPoint to = info.TransformIn(info.MouseInViewer() + mGrabOffset);
-    if (!mStepOpen)
-        OpenStep("Move Point");
-    WriteShape(PolyLineCreation::Moved(*shape, mCreation.index, mCreation.part, to));
-}
-
 OrbPoint PolyLineControl::OnePixel(const PreviewInfo &info)
 {
     return OrbPoint(1.0 / info.Mapping().SpanX(), 1.0 / info.Mapping().SpanY());
@@ -625,6 +632,8 @@ void PolyLineControl::ControlUp(PreviewInfo *info, const OrbPointI &mouse, const
 {
     if (mCreation.gesture == PolyLineCreation::PCG_Stroke)
         EndStroke(*info);
+    if (mCreation.gesture == PolyLineCreation::PCG_Edit)
+        mMouse.Release(*info);
     mCreation.gesture = PolyLineCreation::PCG_None;
     CloseStep();
     HandleOverlay::ControlUp(info, mouse, tags);
@@ -662,6 +671,54 @@ void PolyLineControl::EndStroke(const PreviewInfo &info)
     WriteShape(drawn);
     if (closes)
         SetMode(PLM_InsertModify);
+}
+
+// --- the pair of shapes ---
+
+Input *PolyLineControl::InnerInput() const
+{
+    return mOuterInput ? GetMainInput() : mInnerInput;
+}
+
+Input *PolyLineControl::OuterInput() const
+{
+    return mOuterInput ? mOuterInput : mInnerInput ? GetMainInput() : nullptr;
+}
+
+AutoRef<PolyLine> PolyLineControl::InnerShape() const
+{
+    return AutoParam<PolyLine>(InnerInput(), GetCurrentTime());
+}
+
+AutoRef<PolyLine> PolyLineControl::OuterShape() const
+{
+    return AutoParam<PolyLine>(OuterInput(), GetCurrentTime());
+}
+
+void PolyLineControl::FollowInner(const PolyLine &inner)
+{
+    const AutoRef<PolyLine> outer = mPairing == PAIR_Follow && mOuterInput ? OuterShape() : AutoRef<PolyLine>();
+    if (!outer || outer->GetCount() != inner.GetCount())
+        return;
+    AutoRef<PolyLine> moved(static_cast<PolyLine *>(outer->Clone()));
+    if (moved->UpdateShape(inner))
+        mOuterInput->SetValue(moved.get(), GetCurrentTime());
+}
+
+// The outer shape of a pair, dotted, while it is in use.
+void PolyLineControl::DrawOuter(GPainter &p, const PolyLineStyle &style) const
+{
+    if (!mOuterInput || mPairing == PAIR_Off)
+        return;
+    const AutoRef<PolyLine> outer = OuterShape();
+    if (!outer || outer->GetCount() == 0)
+        return;
+    p.PushAttrib();
+    p.LineStipple(1, 0xF0F0);
+    p.Enable(Graphics::GC_LineStipple);
+    p.Color(style.curve, style.shadow);
+    PolyLineDrawing::DrawCurve(p, *outer, style.span);
+    p.PopAttrib();
 }
 
 bool PolyLineControl::WriteShape(PolyLine *shape)

@@ -5,6 +5,8 @@
 #include "polyline/PolyLineCreation.h"
 #include "polyline/PolyLineDrawing.h"
 #include "polyline/PolyLineSettings.h"
+#include "polyline/PolyLineEditor.h"
+#include "polyline/PolyLineMouse.h"
 
 #include "orbane/AutoRef.h"
 #include "orbane/LockableObject.h"
@@ -43,6 +45,14 @@ public:
         PLM_DrawAppend = 2,
         PLM_InsertModify = 3,
         PLM_ModifyOnly = 4,
+    };
+    // Pairing of an inner shape with its outer (feather) shape.
+    enum Pairing : int32
+    {
+        PAIR_IsOuter = 0, // this overlay edits the outer shape of an inner one
+        PAIR_Follow = 1,  // the outer shape follows the inner one
+        PAIR_Free = 2,    // both shown and edited, each on its own
+        PAIR_Off = 3,     // no outer shape in use
     };
     // Parts of the handles: a key point, or one of its two handle ends.
     enum Part : uint32
@@ -100,6 +110,16 @@ public:
     const SelMask &Selection() const { return mSelection; }
     SelMask &Selection() { return mSelection; }
     const ShapeBox *Box() const { return mShapeBox; }
+    // The editing operations behind keys, menu and toolbar.
+    PolyLineEditor &Editor() { return mEditor; }
+    const PolyLineEditor &Editor() const { return mEditor; }
+    void SetPairing(int32 pairing) { mPairing = pairing; }
+    // The pair of shapes this overlay belongs to, whichever of the two it
+    // edits; null where it has no partner.
+    Input *InnerInput() const;
+    Input *OuterInput() const;
+    AutoRef<PolyLine> InnerShape() const;
+    AutoRef<PolyLine> OuterShape() const;
     const QCursor &CurrentCursor() const { return *mCurrentCursor; }
     // The shape as drawing reads it (one more reference for the caller).
     AutoRef<PolyLine> Shape() const;
@@ -119,6 +139,8 @@ protected:
 
 private:
     friend class PolyLineCommandRunner;
+    friend class PolyLineEditor;
+    friend class PolyLineMouse;
     static const LinkedInput<PolyLineControl> Links[];
 
     uint64 KeyCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags);
@@ -144,9 +166,11 @@ private:
     bool CanCreate() const;
     void BeginClick(HandleHit hit, OrbPoint at);
     void BeginStroke(OrbPoint at);
-    void BeginMove(const PreviewInfo &info, HandleHit hit);
+    bool CanEditByMouse() const;
     void PullHandles(const PreviewInfo &info, OrbPoint to);
-    void MovePicked(const PreviewInfo &info);
+    // An outer shape that follows this one moves with it (same step).
+    void FollowInner(const PolyLine &inner);
+    void DrawOuter(Graphics::GPainter &p, const PolyLineStyle &style) const;
     void EndStroke(const PreviewInfo &info);
     static OrbPoint OnePixel(const PreviewInfo &info);
     void OpenStep(const char *name);
@@ -201,6 +225,9 @@ private:
     // --- the command surface ---
     PolyLineSettings mSettings;
     std::unique_ptr<QObject> mDialogs; // the parent of open dialogs: they go with the control
+    // --- editing ---
+    PolyLineEditor mEditor{*this};
+    PolyLineMouse mMouse{*this};
 };
 
 } // namespace Orbane

@@ -51,11 +51,13 @@ void PolyLineControl::AddToMenu(QMenu *menu, PreviewInfo *info, const TagList *t
     s.readOnly = mShapeReadOnly;
     s.bspline = shape && shape->DataType() == CLSID_DataType_BSplinePolyline;
     s.pairing = mPairing;
-    s.lockPointPairs = mSettings.lockPointPairs;
-    s.currentTimeOnly = mCurrentTimeOnly;
+    s.selectedLocked = mEditor.IsSelectionLockedPoint();
+    s.lockPointPairs = mEditor.LockPairs();
+    s.currentTimeOnly = mEditor.CurrentTimeOnly();
     s.canPublish = mCanPublishPoints;
+    s.reduceVisible = mSettings.reduceOpen;
     s.pointNumbers = mSettings.pointNumbers;
-    s.lockSelection = mSettings.lockSelection;
+    s.lockSelection = mEditor.IsSelectionLocked();
     s.publishPathPoints = mSettings.publishPathPoints;
     s.displayFlags = mDisplayFlags;
     s.hull = mSettings.hull;
@@ -68,7 +70,7 @@ void PolyLineControl::AddToMenu(QMenu *menu, PreviewInfo *info, const TagList *t
     s.rotoPatternEdit = mSettings.rotoPatternEdit;
     s.rotoDistance = mSettings.rotoDistance;
     s.editMultiplePolys = doc && doc->GetPrefs().GetLong(PREF_SelectPointsFromMultiPolies, 0) != 0;
-    s.multiFrame = mSettings.multiFrame;
+    s.multiFrame = mEditor.GetMultiFrame();
     s.stopRendering = mStopRendering != 0;
     const bool record[6] = {mRecordTime, mRecordPressure, mRecordHeight, mRecordAngleXY, mRecordAngleZ, mRecordRotation};
     std::copy(std::begin(record), std::end(record), s.record);
@@ -128,13 +130,22 @@ uint64 PolyLineControl::ControlCommand(PreviewInfo *info, const OrbID &command, 
         return 1;
     } else if (command == CCMD_NeedsKey || command == CCMD_KeyDown || command == CCMD_KeyUp) {
         return KeyCommand(info, command, data, tags);
+    } else if (command == CCMD_KeyUpAll) {
+        // The run of nudges ends as one step.
+        mEditor.EndNudge();
     } else if (command == CCMD_TimeChanged) {
         // A new time may be a new keyframe: the point numbers and the skins move.
         Redraw();
     } else if (command == CCMD_HitTest) {
         const uint64 result = HandleOverlay::ControlCommand(info, command, data, tags);
-        ShowCursor(*info, IsAppending() && !(data & 1));
-        return result;
+        // Over the shape box its part's cursor shows.
+        const int32 boxCursor = IsAppending() ? -1 : mMouse.HoverCursor(*info);
+        if (boxCursor >= 0)
+            mCurrentCursor = &mCursors[std::size_t(boxCursor)];
+        else if (!IsAppending())
+            mCurrentCursor = &mCursors[0];
+        ShowCursor(*info, (IsAppending() && !(data & 1)) || boxCursor >= 0);
+        return boxCursor >= 0 ? result | 1 : result;
     }
     return HandleOverlay::ControlCommand(info, command, data, tags);
 }
@@ -151,7 +162,7 @@ uint64 PolyLineControl::KeyCommand(PreviewInfo *info, const OrbID &command, uint
         if (action.kind == PolyLineKeys::Action::Command)
             PolyLineCommandRunner(*this, info, tags).Run(action.command, action.arg);
         else if (action.kind == PolyLineKeys::Action::Nudge)
-            Tell("Nudge: moving the selected points with the arrow keys is not built yet");
+            mEditor.NudgeKey(key, mods, *info);
     }
     return 1;
 }

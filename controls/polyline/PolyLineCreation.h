@@ -30,6 +30,7 @@ public:
         PCG_Close,  // the press closed the shape
         PCG_Stroke, // a freehand stroke is being drawn
         PCG_Move,   // a key point or a handle end is dragged
+        PCG_Edit,   // the shape's editing gestures have the mouse
     };
 
     // One sample of a freehand stroke: where (image coordinates), when

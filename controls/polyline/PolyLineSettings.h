@@ -11,9 +11,8 @@ struct PolyLineSettings
 {
     bool pointNumbers = false;      // each key point's number drawn beside it
     bool hull = false;              // the Bezier control polygon drawn
-    bool lockSelection = false;     // clicks leave the selected points as they are
+    bool reduceOpen = false;        // the reduce-points dialog is shown
     bool publishPathPoints = false; // new points of a published shape publish themselves
-    bool lockPointPairs = false;    // inner and outer points move together
     bool onionEnabled = true;       // the other keyframes' shapes drawn
     bool onionClickTime = false;    // a click on an onion skin goes to its time
     float64 onionAnchor = TIME_UNDEFINED;
@@ -22,7 +21,6 @@ struct PolyLineSettings
     bool rotoShowArea = false, rotoPatternEdit = false;
     int32 rotoDistance = 5;  // frames between tracked keys
     int32 rotoFrameSkip = 1; // frames the tracker steps
-    int32 multiFrame = 0;    // edits reach: 0 this key, 1 the previous, 2 the next, 3 all keys
 };
 
 } // namespace Orbane

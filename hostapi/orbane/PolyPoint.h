@@ -15,6 +15,7 @@ enum PolyPointFlags : uint32
     PPF_Published = 1u << 2,    // offered to the tool as a point Input (TagID is its number)
     PPF_Following = 1u << 3,    // keeps its offset to a point of another shape
     PPF_Discontinual = 1u << 4, // the segment that starts here is a gap, not drawn
+    PPF_Locked = 1u << 5,       // held where it is: edits of the selection leave it
 };
 
 // Flags of PolyPoint::Next1 and PolyLine::First.

@@ -22,6 +22,9 @@ public:
     // A new shape (one reference) as the file says; null with `error`
     // naming the file, the line and, where it helps, the column.
     static PolyLine *Read(const std::string &file, std::string *error);
+    // The same from text (the clipboard's); `name` stands for the file in
+    // errors.
+    static PolyLine *Parse(const std::string &text, const std::string &name, std::string *error);
     static std::string Text(const PolyLine &shape);
     static bool Write(const std::string &file, const PolyLine &shape, std::string *error);
 

@@ -35,7 +35,8 @@ constexpr FlagField kFlags[] = {{"linear", PPF_Linear},
                                 {"tagged", PPF_Tagged},
                                 {"published", PPF_Published},
                                 {"following", PPF_Following},
-                                {"gap", PPF_Discontinual}};
+                                {"gap", PPF_Discontinual},
+                                {"locked", PPF_Locked}};
 
 // Whole-number fields.
 struct IntField

@@ -132,16 +132,8 @@ void WriteNumber(std::ostream &out, float64 v)
     out << buf;
 }
 
-} // namespace
-
-PolyLine *ShapeFile::Read(const std::string &file, std::string *error)
+PolyLine *FromStream(std::istream &in, const std::string &file, std::string *error)
 {
-    std::ifstream in(file);
-    if (!in) {
-        if (error)
-            *error = file + ": cannot open the file";
-        return nullptr;
-    }
     ScriptVal table = ScriptVal::NewTable();
     LineReader reader(file, table);
     std::string line;
@@ -164,6 +156,26 @@ PolyLine *ShapeFile::Read(const std::string &file, std::string *error)
         *error = file + ": " + (known ? "line " + std::to_string(lines[std::size_t(index - 1)]) + ": " : "") + why;
     }
     return shape;
+}
+
+
+} // namespace
+
+PolyLine *ShapeFile::Read(const std::string &file, std::string *error)
+{
+    std::ifstream in(file);
+    if (!in) {
+        if (error)
+            *error = file + ": cannot open the file";
+        return nullptr;
+    }
+    return FromStream(in, file, error);
+}
+
+PolyLine *ShapeFile::Parse(const std::string &text, const std::string &name, std::string *error)
+{
+    std::istringstream in(text);
+    return FromStream(in, name, error);
 }
 
 std::string ShapeFile::Text(const PolyLine &shape)

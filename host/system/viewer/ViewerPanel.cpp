@@ -22,6 +22,8 @@
 
 #include <algorithm>
 #include <cmath>
+#include <set>
+#include <string>
 
 namespace Orbane {
 
@@ -158,9 +160,13 @@ void ViewerPanel::Clear()
 void ViewerPanel::BuildToolBar()
 {
     mToolBar->clear();
+    // Overlays of one class offer the same buttons: the bar shows them once.
+    std::set<std::string> shown;
     for (PreviewControl *overlay : mOverlays) {
         std::vector<PreviewControl::ToolbarEvent> events;
         overlay->GetAvailableEvents(events, nullptr);
+        if (events.empty() || !shown.insert(overlay->GetRegistry() ? overlay->GetRegistry()->Name() : "").second)
+            continue;
         for (const PreviewControl::ToolbarEvent &e : events)
             AddToolbarEvent(overlay, e);
     }
@@ -196,9 +202,14 @@ void ViewerPanel::ToolbarAction(QAction *action, PreviewControl *overlay, const 
     action->setToolTip(QString::fromUtf8(e.tip.c_str()));
     const OrbID id = e.id;
     connect(action, &QAction::triggered, this, [this, overlay, id]() {
+        // A shared button acts on the overlay of its class that was pressed
+        // last, where there is one.
         if (!IsOverlay(overlay))
             return;
-        overlay->HandleEvent(id, &mInfo, &mCommandTags);
+        PreviewControl *target = overlay;
+        if (IsOverlay(mLastPressed) && mLastPressed->GetRegistry() == overlay->GetRegistry())
+            target = mLastPressed;
+        target->HandleEvent(id, &mInfo, &mCommandTags);
         QTimer::singleShot(0, this, [this]() { BuildToolBar(); });
     });
 }

@@ -409,7 +409,7 @@ void PolyLineControlTest::appendTakesAnyPress_data()
     QTest::addColumn<bool>("taken");
     QTest::newRow("click append") << 1 << false << true;
     QTest::newRow("draw append") << 2 << false << true;
-    QTest::newRow("modify only, off the shape") << 4 << false << false;
+    QTest::newRow("modify only, off the shape: a selection box") << 4 << false << true;
     QTest::newRow("done") << 0 << false << false;
     QTest::newRow("click append on a locked tool") << 1 << true << false;
 }
