@@ -410,6 +410,7 @@ bool PolyLineCommandRunner::ImportShape()
         if (!c->WriteShape(shape.get()))
             c->Tell("Import Shape: this Input does not take that kind of shape");
         c->CloseStep();
+        c->ResetUndo(nullptr);
     };
     const std::string path = Value();
     if (!path.empty()) {
@@ -644,7 +645,10 @@ bool PolyLineCommandRunner::Reduce()
     dialog->setAttribute(Qt::WA_DeleteOnClose);
     QObject::connect(c->mDialogs.get(), &QObject::destroyed, dialog, &QObject::deleteLater);
     QObject::connect(dialog, &QInputDialog::doubleValueSelected, c->mDialogs.get(),
-                     [c](double px) { c->mEditor.Reduce(px); });
+                     [c](double px) {
+                         c->mEditor.Reduce(px);
+                         c->ResetUndo(nullptr);
+                     });
     QObject::connect(dialog, &QDialog::finished, c->mDialogs.get(), [c](int) { c->mSettings.reduceOpen = false; });
     c->mSettings.reduceOpen = true;
     dialog->open();

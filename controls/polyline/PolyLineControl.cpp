@@ -271,6 +271,7 @@ void PolyLineControl::GetState(ScriptVal &state) const
     for (const float64 t : mEditor.KeyTimes())
         keys.SetKey(ScriptVal(++k), ScriptVal(t));
     state.SetKey(ScriptVal("keyTimes"), keys);
+    AddSurfaceState(state);
 }
 
 // --- values ---

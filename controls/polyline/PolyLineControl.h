@@ -144,6 +144,8 @@ private:
     static const LinkedInput<PolyLineControl> Links[];
 
     uint64 KeyCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags);
+    void AddSurfaceState(ScriptVal &state) const;
+    bool RunWhole(PreviewInfo *info, int32 command, int32 arg, const TagList *tags);
     void DrawExtras(Graphics::GPainter &p, const PolyLine &shape, const PolyLineStyle &style) const;
 
     void ReadFlags(const TagList &tags);

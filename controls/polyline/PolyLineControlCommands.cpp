@@ -19,6 +19,7 @@
 #include "orbane/PolyLine.h"
 #include "orbane/Prefs.h"
 #include "orbane/PreviewInfo.h"
+#include "orbane/ScriptVal.h"
 
 #include <cmath>
 #include <cstdio>
@@ -81,12 +82,21 @@ void PolyLineControl::AddToMenu(QMenu *menu, PreviewInfo *info, const TagList *t
 
 bool PolyLineControl::HandleMenu(int32 id, PreviewInfo *info, const TagList *tags)
 {
-    return PolyLineCommandRunner(*this, info, tags).Run(PolyLineMenu::IdOf(id), PolyLineMenu::ArgOf(id));
+    return RunWhole(info, PolyLineMenu::IdOf(id), PolyLineMenu::ArgOf(id), tags);
 }
 
 bool PolyLineControl::RunCommand(int32 command, int32 arg, const TagList *tags)
 {
-    return PolyLineCommandRunner(*this, nullptr, tags).Run(command, arg);
+    return RunWhole(nullptr, command, arg, tags);
+}
+
+// A menu choice or a button is a gesture of its own: its writes are one
+// undo step, closed with it.
+bool PolyLineControl::RunWhole(PreviewInfo *info, int32 command, int32 arg, const TagList *tags)
+{
+    const bool done = PolyLineCommandRunner(*this, info, tags).Run(command, arg);
+    ResetUndo(nullptr);
+    return done;
 }
 
 // --- the toolbar ---
@@ -103,7 +113,7 @@ bool PolyLineControl::HandleEvent(const OrbID &event, PreviewInfo *info, const T
     int32 command = 0, arg = 0;
     if (!PolyLineToolbar::CommandOf(event, command, arg))
         return HandleOverlay::HandleEvent(event, info, tags);
-    return PolyLineCommandRunner(*this, info, tags).Run(command, arg);
+    return RunWhole(info, command, arg, tags);
 }
 
 // --- viewer commands, in the order they are tested ---
@@ -131,8 +141,9 @@ uint64 PolyLineControl::ControlCommand(PreviewInfo *info, const OrbID &command, 
     } else if (command == CCMD_NeedsKey || command == CCMD_KeyDown || command == CCMD_KeyUp) {
         return KeyCommand(info, command, data, tags);
     } else if (command == CCMD_KeyUpAll) {
-        // The run of nudges ends as one step.
+        // The keys' edits (a run of nudges) end as one step.
         mEditor.EndNudge();
+        ResetUndo(nullptr);
     } else if (command == CCMD_TimeChanged) {
         // A new time may be a new keyframe: the point numbers and the skins move.
         Redraw();
@@ -211,6 +222,29 @@ bool PolyLineControl::ControlGetTip(PreviewInfo *info, char *buffer, const TagLi
         return HandleOverlay::ControlGetTip(info, buffer, tags);
     std::snprintf(buffer, TipSize, "%s", tip.c_str());
     return true;
+}
+
+// --- state ---
+
+// What the menu's own settings show, for scripts.
+void PolyLineControl::AddSurfaceState(ScriptVal &state) const
+{
+    const PolyLineSettings &s = mSettings;
+    for (auto [key, on] : {std::pair{"pointNumbers", s.pointNumbers},
+                           {"hull", s.hull},
+                           {"onionSkins", s.onionEnabled},
+                           {"onionClickTime", s.onionClickTime},
+                           {"rotoAssist", s.rotoEnabled},
+                           {"reduceDialog", s.reduceOpen},
+                           {"stopRendering", mStopRendering != 0}})
+        state.SetKey(ScriptVal(key), ScriptVal(on));
+    state.SetKey(ScriptVal("rotoDistance"), ScriptVal(s.rotoDistance));
+    state.SetKey(ScriptVal("rotoFrameSkip"), ScriptVal(s.rotoFrameSkip));
+    const bool record[6] = {mRecordTime, mRecordPressure, mRecordHeight, mRecordAngleXY, mRecordAngleZ, mRecordRotation};
+    int32 bits = 0;
+    for (int32 i = 0; i < 6; ++i)
+        bits |= record[i] ? 1 << i : 0;
+    state.SetKey(ScriptVal("record"), ScriptVal(bits));
 }
 
 // --- what the settings add to the drawing ---
