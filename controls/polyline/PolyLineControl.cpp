@@ -741,6 +741,9 @@ void PolyLineControl::CloseStep()
 {
     if (!std::exchange(mStepOpen, false))
         return;
+    // The base's own level, opened by the first write inside this step,
+    // closes first: an edit from a key or the menu has no release to do it.
+    ResetUndo(nullptr);
     if (OrbaneDoc *doc = GetDoc())
         doc->EndUndo(true);
 }

@@ -183,19 +183,22 @@ bool PolyLineEditor::EditSelected(const char *undo, const std::function<bool(Pol
     const std::vector<uint8> movable = PolyLineShapes::Movable(*mControl.Shape(), mControl.mSelection);
     if (std::none_of(movable.begin(), movable.end(), [](uint8 b) { return b != 0; }))
         return Refuse("The selected points are locked");
-    return Commit(undo, [&](PolyLine &s) { return edit(s, movable.data()); }, false);
+    return Commit(
+        undo, [&](PolyLine &s) { return edit(s, movable.data()); }, false);
 }
 
 bool PolyLineEditor::DeleteSelected()
 {
     if (!CanEdit() || !NeedSelection())
         return false;
-    const std::vector<uint8> sel(mControl.mSelection.Bytes(), mControl.mSelection.Bytes() + mControl.mSelection.GetCount());
+    const std::vector<uint8> sel(mControl.mSelection.Bytes(),
+                                 mControl.mSelection.Bytes() + mControl.mSelection.GetCount());
     SelMask kept = mControl.mSelection;
     kept.RemoveSetItems();
     const SelMask before = mControl.mSelection;
     mControl.mSelection = kept;
-    if (Commit("Delete Points", [&](PolyLine &s) { return s.DeletePoints(sel.data()); }, true))
+    if (Commit(
+            "Delete Points", [&](PolyLine &s) { return s.DeletePoints(sel.data()); }, true))
         return true;
     mControl.mSelection = before;
     return false;
@@ -217,8 +220,9 @@ bool PolyLineEditor::SetClosed(bool closed)
         return false;
     if (mControl.Shape()->IsClosed() == closed)
         return Refuse(closed ? "The shape is closed already" : "The shape is open already");
-    return Commit(closed ? "Close polygon" : "Open polygon",
-                  [closed](PolyLine &s) { return closed ? s.Close() : s.Open(); }, true);
+    return Commit(
+        closed ? "Close polygon" : "Open polygon", [closed](PolyLine &s) { return closed ? s.Close() : s.Open(); },
+        true);
 }
 
 bool PolyLineEditor::Flip(Qt::Orientation axis)
@@ -232,9 +236,8 @@ bool PolyLineEditor::Nudge(OrbPoint delta)
 {
     // The step stays open over the whole run of keys.
     const bool running = std::exchange(mNudging, true);
-    const bool moved = EditSelected("Shift points", [delta](PolyLine &s, const uint8 *sel) {
-        return s.MovePoints(sel, delta.x, delta.y);
-    });
+    const bool moved = EditSelected(
+        "Shift points", [delta](PolyLine &s, const uint8 *sel) { return s.MovePoints(sel, delta.x, delta.y); });
     mNudging = running || moved;
     return moved;
 }
@@ -269,17 +272,20 @@ bool PolyLineEditor::TagSelected()
 {
     if (!CanEdit() || !NeedSelection())
         return false;
-    const std::vector<uint8> sel(mControl.mSelection.Bytes(), mControl.mSelection.Bytes() + mControl.mSelection.GetCount());
-    return Commit("Tag Points", [&](PolyLine &s) { return PolyLineShapes::ToggleTags(s, sel.data()); }, false);
+    const std::vector<uint8> sel(mControl.mSelection.Bytes(),
+                                 mControl.mSelection.Bytes() + mControl.mSelection.GetCount());
+    return Commit(
+        "Tag Points", [&](PolyLine &s) { return PolyLineShapes::ToggleTags(s, sel.data()); }, false);
 }
 
 bool PolyLineEditor::LockSelected(bool locked)
 {
     if (!CanEdit() || !NeedSelection())
         return false;
-    const std::vector<uint8> sel(mControl.mSelection.Bytes(), mControl.mSelection.Bytes() + mControl.mSelection.GetCount());
-    return Commit("Lock Points", [&](PolyLine &s) { return PolyLineShapes::SetFlag(s, sel.data(), PPF_Locked, locked); },
-                  false);
+    const std::vector<uint8> sel(mControl.mSelection.Bytes(),
+                                 mControl.mSelection.Bytes() + mControl.mSelection.GetCount());
+    return Commit(
+        "Lock Points", [&](PolyLine &s) { return PolyLineShapes::SetFlag(s, sel.data(), PPF_Locked, locked); }, false);
 }
 
 bool PolyLineEditor::IsSelectionLockedPoint() const
@@ -299,7 +305,8 @@ bool PolyLineEditor::Subdivide()
     if (mControl.Shape()->GetCount() < 2)
         return Refuse("Subdivide needs two points or more");
     mControl.mSelection.Reset();
-    return Commit("Subdivide", [](PolyLine &s) { return PolyLineShapes::Subdivide(s); }, true);
+    return Commit(
+        "Subdivide", [](PolyLine &s) { return PolyLineShapes::Subdivide(s); }, true);
 }
 
 bool PolyLineEditor::Reduce(float64 tolerancePx)
@@ -313,7 +320,8 @@ bool PolyLineEditor::Reduce(float64 tolerancePx)
     if (OtherTimes(true).size() > 0)
         return Refuse("Reduce Points would leave the keyframes with different points");
     mControl.mSelection.Reset();
-    return Commit("Reduce Points", [tolerancePx](PolyLine &s) { return s.ReducePoints(tolerancePx, 1e-3, 1e-3); }, true);
+    return Commit(
+        "Reduce Points", [tolerancePx](PolyLine &s) { return s.ReducePoints(tolerancePx, 1e-3, 1e-3); }, true);
 }
 
 // --- the clipboard ---
@@ -325,7 +333,8 @@ bool PolyLineEditor::Copy()
     if (!shape || shape->GetCount() == 0)
         return Refuse("The shape has no points");
     const SelMask &sel = mControl.mSelection;
-    const AutoRef<PolyLine> copied = sel.GetSetCount() ? PolyLineShapes::Selected(*shape, sel.Bytes()) : CloneOf(*shape);
+    const AutoRef<PolyLine> copied =
+        sel.GetSetCount() ? PolyLineShapes::Selected(*shape, sel.Bytes()) : CloneOf(*shape);
     QGuiApplication::clipboard()->setText(QString::fromStdString(ShapeFile::Text(*copied)));
     return true;
 }
@@ -344,10 +353,12 @@ bool PolyLineEditor::Cut()
 {
     if (!CanEdit() || !NeedSelection() || !Copy())
         return false;
-    const std::vector<uint8> sel(mControl.mSelection.Bytes(), mControl.mSelection.Bytes() + mControl.mSelection.GetCount());
+    const std::vector<uint8> sel(mControl.mSelection.Bytes(),
+                                 mControl.mSelection.Bytes() + mControl.mSelection.GetCount());
     const SelMask before = mControl.mSelection;
     mControl.mSelection.RemoveSetItems();
-    if (Commit("Cut Points", [&](PolyLine &s) { return s.DeletePoints(sel.data()); }, true))
+    if (Commit(
+            "Cut Points", [&](PolyLine &s) { return s.DeletePoints(sel.data()); }, true))
         return true;
     mControl.mSelection = before;
     return false;
@@ -390,7 +401,8 @@ bool PolyLineEditor::PasteText(OrbPoint offset)
         sel.Set(i, true);
     const SelMask old = mControl.mSelection;
     mControl.mSelection = sel;
-    const bool done = Commit("Paste Points", [&](PolyLine &s) { return PolyLineShapes::Append(s, *pasted); }, true);
+    const bool done = Commit(
+        "Paste Points", [&](PolyLine &s) { return PolyLineShapes::Append(s, *pasted); }, true);
     if (!done)
         mControl.mSelection = old;
     return done;
@@ -420,10 +432,12 @@ bool PolyLineEditor::PublishSelected()
 {
     if (!CanEdit() || !NeedSelection())
         return false;
-    const std::vector<uint8> sel(mControl.mSelection.Bytes(), mControl.mSelection.Bytes() + mControl.mSelection.GetCount());
+    const std::vector<uint8> sel(mControl.mSelection.Bytes(),
+                                 mControl.mSelection.Bytes() + mControl.mSelection.GetCount());
     const int32 first = PolyLineShapes::FirstFreePointNumber(*mControl.GetMainInput()->GetOperator());
     mControl.OpenStep("Publish Points");
-    const bool done = Commit("Publish Points", [&](PolyLine &s) { return s.PublishPoints(sel.data(), first) > 0; }, false);
+    const bool done = Commit(
+        "Publish Points", [&](PolyLine &s) { return s.PublishPoints(sel.data(), first) > 0; }, false);
     if (done) {
         const AutoRef<PolyLine> shape = mControl.Shape();
         CreatePointInputs(*shape);
@@ -439,8 +453,10 @@ bool PolyLineEditor::Unpublish()
 {
     if (!CanEdit() || !NeedSelection())
         return false;
-    const std::vector<uint8> sel(mControl.mSelection.Bytes(), mControl.mSelection.Bytes() + mControl.mSelection.GetCount());
-    return Commit("Unpublish Points", [&](PolyLine &s) { return s.UnpublishPoints(sel.data()); }, false) ||
+    const std::vector<uint8> sel(mControl.mSelection.Bytes(),
+                                 mControl.mSelection.Bytes() + mControl.mSelection.GetCount());
+    return Commit(
+               "Unpublish Points", [&](PolyLine &s) { return s.UnpublishPoints(sel.data()); }, false) ||
            Refuse("None of the selected points is published");
 }
 
@@ -449,11 +465,13 @@ bool PolyLineEditor::FollowNearby()
     if (!CanEdit() || !NeedSelection())
         return false;
     Operator *tool = mControl.GetMainInput()->GetOperator();
-    const std::vector<uint8> sel(mControl.mSelection.Bytes(), mControl.mSelection.Bytes() + mControl.mSelection.GetCount());
+    const std::vector<uint8> sel(mControl.mSelection.Bytes(),
+                                 mControl.mSelection.Bytes() + mControl.mSelection.GetCount());
     const float64 now = mControl.GetCurrentTime();
-    return Commit("Set Points to follow",
-                  [&](PolyLine &s) { return tool && PolyLineShapes::FollowPublished(s, sel.data(), *tool, now); },
-                  false) ||
+    return Commit(
+               "Set Points to follow",
+               [&](PolyLine &s) { return tool && PolyLineShapes::FollowPublished(s, sel.data(), *tool, now); },
+               false) ||
            Refuse("No published point of the tool's other shapes to follow");
 }
 
@@ -471,10 +489,12 @@ bool PolyLineEditor::PublishTo(int32 target)
     Operator *tool = main->GetOperator();
     if (!tool)
         return Refuse("The shape belongs to no tool");
-    const std::vector<uint8> sel(mControl.mSelection.Bytes(), mControl.mSelection.Bytes() + mControl.mSelection.GetCount());
+    const std::vector<uint8> sel(mControl.mSelection.Bytes(),
+                                 mControl.mSelection.Bytes() + mControl.mSelection.GetCount());
     const int32 first = PolyLineShapes::FirstFreePointNumber(*tool);
     mControl.OpenStep(target == PT_Path ? "Publish To Path" : "Publish To XYPath");
-    Commit("Publish Points", [&](PolyLine &s) { return s.PublishPoints(sel.data(), first) > 0; }, false);
+    Commit(
+        "Publish Points", [&](PolyLine &s) { return s.PublishPoints(sel.data(), first) > 0; }, false);
     std::vector<float64> times = KeyTimes();
     if (times.empty())
         times.push_back(mControl.GetCurrentTime());

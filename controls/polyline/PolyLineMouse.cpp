@@ -195,8 +195,8 @@ void PolyLineMouse::MovePoints(OrbPoint delta)
 void PolyLineMouse::MoveShapeBox(const PreviewInfo &info)
 {
     const QTransform toViewer = ToViewer(info);
-    const QTransform inViewer =
-        mControl.mShapeBox->Drag(mBoxPart, mPressViewer, info.MouseInViewer(), bool(HeldModifiers() & Qt::ShiftModifier));
+    const QTransform inViewer = mControl.mShapeBox->Drag(mBoxPart, mPressViewer, info.MouseInViewer(),
+                                                         bool(HeldModifiers() & Qt::ShiftModifier));
     const QTransform t = toViewer * inViewer * toViewer.inverted();
     const std::vector<uint8> movable = PolyLineShapes::Movable(*mPressShape, mControl.mSelection);
     AutoRef<PolyLine> shape = CloneOf(*mPressShape);
@@ -219,6 +219,8 @@ void PolyLineMouse::Write(const char *undo, PolyLine *shape)
 void PolyLineMouse::Release(const PreviewInfo &info)
 {
     PolyLineEditor &edit = mControl.Editor();
+    // The release may come where no move went before it.
+    mTo = OrbPoint(info.MouseX, info.MouseY);
     const bool click = !Moved(info);
     if (mGesture == PMG_Points && mReselect && click)
         edit.Select({mHit.item}, PolyLineEditor::SH_Replace);

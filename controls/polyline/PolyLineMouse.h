@@ -89,9 +89,9 @@ private:
     AutoRef<PolyLine> mPressShape; // the shape as the press found it
     AutoRef<PolyLine> mExpected;   // the shape as this gesture last left it
     AutoRef<PolyLine> mPressOuter;
-    OrbPoint mFrom, mTo;           // image coordinates of the press and the mouse now
-    OrbPoint mPressViewer;         // the press in viewer units
-    OrbPoint mHeld;                // what the press held (image coordinates)
+    OrbPoint mFrom, mTo;   // image coordinates of the press and the mouse now
+    OrbPoint mPressViewer; // the press in viewer units
+    OrbPoint mHeld;        // what the press held (image coordinates)
     int32 mSegment = -1;
     float64 mSegmentT = 0.0, mSegmentPar = 0.0;
     int32 mBoxPart = -1;

@@ -252,8 +252,6 @@ AutoRef<PolyLine> PolyLineShapes::OuterOf(const PolyLine &inner, float64 distanc
         points[std::size_t(i)].Flags &= ~uint32(PPF_Published);
     }
     Rebuild(*outer, points);
-    outer->SetFollowingPointsOrg(inner);
-    outer->RecalcDisplacements(inner);
     return outer;
 }
 

@@ -51,8 +51,8 @@ public:
     // other handle turns with it to stay opposite (its length kept) unless
     // `breakTangent`, or the point is a corner.
     static bool MoveHandle(PolyLine &shape, int32 index, uint32 part, OrbPoint to, bool breakTangent);
-    // `inner` with every point `distance` out along its normal, each point
-    // following the inner point of its index.
+    // `inner` with every point `distance` out along its normal (free: the
+    // points follow nothing until "Follow Inner Polyline").
     static AutoRef<PolyLine> OuterOf(const PolyLine &inner, float64 distance);
 
     // Publishing: the lowest point number no point Input of `tool` uses.

@@ -1,3 +1,4 @@
+#include "PolyLineTestShapes.h"
 #include "RecordingPainter.h"
 #include "ViewerFixture.h"
 
@@ -21,7 +22,6 @@ Q_DECLARE_METATYPE(Orbane::TagList)
 
 namespace {
 
-using Points = std::vector<OrbPoint>;
 using RP = RecordingPainter;
 
 constexpr Tag PLC_DrawMode = 0x10058000, PLC_ShowKeyPoints = 0x10058009, PLC_ShowHandles = 0x1005800A;
@@ -30,28 +30,6 @@ constexpr Tag PLC_ShowTaggedPointIDs = 0x10058015, PLC_SelectedWhenHidden = 0x10
 constexpr Tag PLC_PairFromAttach = 0x10058011, PLC_KeyPointColor = 0x10058014, PCA_Color = 0x1003000F;
 constexpr Tag PLCID_Center = 0x80058000, PLCID_Displacement = 0x80058003, PLCID_InPolyLine2 = 0x80058008;
 constexpr Tag PLCID_InPolyLine = 0x8005800F, TOOL_FollowInner = 0x10030005;
-
-AutoRef<PolyLine> MakeShape(const Points &points, bool closed = false)
-{
-    AutoRef<PolyLine> shape(new PolyLine);
-    for (const OrbPoint &p : points)
-        shape->AddPoint(PolyPoint(p.x, p.y));
-    if (closed)
-        shape->Close();
-    return shape;
-}
-
-Input *AddShapeValue(ViewerFixture &f, const PolyLine *shape, const TagList &more = TagList(), const char *id = "Shape")
-{
-    TagList attrs{{INPA_PreviewControl, OrbID("PolylineControl")}};
-    attrs.Append(more);
-    return f.tool->AddInput(OrbID(id), id, CLSID_DataType_Polyline, attrs, shape);
-}
-
-Input *AddShape(ViewerFixture &f, const Points &points, const TagList &more = TagList(), const char *id = "Shape")
-{
-    return AddShapeValue(f, MakeShape(points).get(), more, id);
-}
 
 // A tool of its own in place of the fixture's, with tool attributes.
 void ReplaceTool(ViewerFixture &f, const TagList &attrs)
@@ -62,23 +40,11 @@ void ReplaceTool(ViewerFixture &f, const TagList &attrs)
     f.tool->DecRef();
 }
 
-ScriptVal StateOf(const PreviewControl *overlay)
-{
-    ScriptVal state = ScriptVal::NewTable();
-    overlay->GetState(state);
-    return state;
-}
-
 double Field(const PreviewControl *overlay, const char *key)
 {
     const ScriptVal state = StateOf(overlay);
     const ScriptVal *v = state.FindKeyConst(ScriptVal(key));
     return v ? (v->IsBool() ? double(v->GetBool()) : v->GetNumber()) : -1.0;
-}
-
-AutoParam<PolyLine> ShapeOf(const ViewerFixture &f, Input *input)
-{
-    return AutoParam<PolyLine>(input, f.doc.GetCurrentTime());
 }
 
 // What the overlay draws in one ordinary pass of the viewer's view.
