@@ -14,11 +14,11 @@
 
 #include <QAction>
 #include <QApplication>
-#include <QMenu>
-#include <QToolBar>
 #include <QKeySequence>
+#include <QMenu>
 #include <QMouseEvent>
 #include <QTest>
+#include <QToolBar>
 
 #include <cmath>
 #include <cstring>
@@ -411,12 +411,20 @@ void ViewerScripting::Install(MainWindow *window)
 {
     gWindow = window;
     const std::pair<const char *, lua_CFunction> functions[] = {
-        {"ViewerPress", ViewerPress},   {"ViewerMove", ViewerMove}, {"ViewerRelease", ViewerRelease},
-        {"ViewerHover", ViewerHover},   {"ViewerKey", ViewerKey},   {"ViewerGrab", ViewerGrab},
-        {"ViewerImage", ViewerImage},   {"ViewerInfo", ViewerInfo}, {"Overlay", Overlay},
+        {"ViewerPress", ViewerPress},
+        {"ViewerMove", ViewerMove},
+        {"ViewerRelease", ViewerRelease},
+        {"ViewerHover", ViewerHover},
+        {"ViewerKey", ViewerKey},
+        {"ViewerGrab", ViewerGrab},
+        {"ViewerImage", ViewerImage},
+        {"ViewerInfo", ViewerInfo},
+        {"Overlay", Overlay},
         {"OverlayState", OverlayState},
-        {"ViewerMenu", ViewerMenu},     {"ViewerMenuChoose", ViewerMenuChoose},
-        {"ViewerToolbar", ViewerToolbar}, {"ViewerToolbarPress", ViewerToolbarPress},
+        {"ViewerMenu", ViewerMenu},
+        {"ViewerMenuChoose", ViewerMenuChoose},
+        {"ViewerToolbar", ViewerToolbar},
+        {"ViewerToolbarPress", ViewerToolbarPress},
         {"ViewerTip", ViewerTip},
     };
     for (const auto &[name, fn] : functions)

@@ -126,7 +126,7 @@ bool PolyLineCommandRunner::Run(int32 command, int32 arg)
         break;
     }
     if (command >= PLCMD_RecordTime && command < PLCMD_RecordTime + 6) {
-        bool *flags[] = {&c.mRecordTime,   &c.mRecordPressure, &c.mRecordHeight,
+        bool *flags[] = {&c.mRecordTime,    &c.mRecordPressure, &c.mRecordHeight,
                          &c.mRecordAngleXY, &c.mRecordAngleZ,   &c.mRecordRotation};
         return Toggle(*flags[command - PLCMD_RecordTime]);
     }
@@ -403,24 +403,23 @@ bool PolyLineCommandRunner::ImportShape()
         AutoRef<PolyLine> shape(ShapeFile::Import(path, &error));
         if (!shape) {
             c->Tell(("Import Shape: " + error).c_str());
-            return;
+            return false;
         }
         c->mSelection.Reset();
         c->OpenStep("Import Shape");
-        if (!c->WriteShape(shape.get()))
-            c->Tell("Import Shape: this Input does not take that kind of shape");
+        const bool written = c->WriteShape(shape.get());
         c->CloseStep();
         c->ResetUndo(nullptr);
+        if (!written)
+            c->Tell("Import Shape: this Input does not take that kind of shape");
+        return written;
     };
     const std::string path = Value();
-    if (!path.empty()) {
-        const std::string before = c->LastMessage().str();
-        read(path);
-        return c->LastMessage().str() == before;
-    }
+    if (!path.empty())
+        return read(path);
     if (FromScript())
         return Tell("Import Shape: give the file to read");
-    AskFile(false, "Import Shape", read);
+    AskFile(false, "Import Shape", [read](const std::string &file) { read(file); });
     return true;
 }
 
@@ -432,7 +431,8 @@ bool PolyLineCommandRunner::Import(int32 command)
                          : command == PLCMD_ImportFxs        ? "FXS (Silhouette) shape"
                          : command == PLCMD_ImportNuke       ? "Nuke shape"
                                                              : "Boujou path";
-    return Tell(std::string("Import: the ") + format + " format is not read yet; \"Import Shape…\" reads shape and SVG files");
+    return Tell(std::string("Import: the ") + format +
+                " format is not read yet; \"Import Shape…\" reads shape and SVG files");
 }
 
 // --- time ---
@@ -644,11 +644,10 @@ bool PolyLineCommandRunner::Reduce()
     dialog->setDoubleValue(c->ReduceTolerance());
     dialog->setAttribute(Qt::WA_DeleteOnClose);
     QObject::connect(c->mDialogs.get(), &QObject::destroyed, dialog, &QObject::deleteLater);
-    QObject::connect(dialog, &QInputDialog::doubleValueSelected, c->mDialogs.get(),
-                     [c](double px) {
-                         c->mEditor.Reduce(px);
-                         c->ResetUndo(nullptr);
-                     });
+    QObject::connect(dialog, &QInputDialog::doubleValueSelected, c->mDialogs.get(), [c](double px) {
+        c->mEditor.Reduce(px);
+        c->ResetUndo(nullptr);
+    });
     QObject::connect(dialog, &QDialog::finished, c->mDialogs.get(), [c](int) { c->mSettings.reduceOpen = false; });
     c->mSettings.reduceOpen = true;
     dialog->open();

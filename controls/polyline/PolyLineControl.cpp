@@ -467,8 +467,7 @@ void PolyLineControl::DrawOnionSkins(GPainter &p, const PreviewInfo &info, const
         const AutoParam<PolyLine> skin(main, time);
         // The skins before now in their own colour, where one is set.
         const bool prev = time < now && !mSettings.onionPrevColor.IsNone();
-        p.Color(prev ? GColor::FromOrb(mSettings.onionPrevColor) : kOnionColor,
-                info.GetShadow(OrbColor()).Faded(0.5f));
+        p.Color(prev ? GColor::FromOrb(mSettings.onionPrevColor) : kOnionColor, info.GetShadow(OrbColor()).Faded(0.5f));
         if (skin)
             PolyLineDrawing::DrawCurve(p, *skin, style.span);
     }

@@ -4,9 +4,9 @@
 #include "framework/LinkedInput.h"
 #include "polyline/PolyLineCreation.h"
 #include "polyline/PolyLineDrawing.h"
-#include "polyline/PolyLineSettings.h"
 #include "polyline/PolyLineEditor.h"
 #include "polyline/PolyLineMouse.h"
+#include "polyline/PolyLineSettings.h"
 
 #include "orbane/AutoRef.h"
 #include "orbane/LockableObject.h"

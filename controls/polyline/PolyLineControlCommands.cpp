@@ -73,7 +73,8 @@ void PolyLineControl::AddToMenu(QMenu *menu, PreviewInfo *info, const TagList *t
     s.editMultiplePolys = doc && doc->GetPrefs().GetLong(PREF_SelectPointsFromMultiPolies, 0) != 0;
     s.multiFrame = mEditor.GetMultiFrame();
     s.stopRendering = mStopRendering != 0;
-    const bool record[6] = {mRecordTime, mRecordPressure, mRecordHeight, mRecordAngleXY, mRecordAngleZ, mRecordRotation};
+    const bool record[6] = {mRecordTime,    mRecordPressure, mRecordHeight,
+                            mRecordAngleXY, mRecordAngleZ,   mRecordRotation};
     std::copy(std::begin(record), std::end(record), s.record);
     s.trackingSwitch = PolyLineMenu::TrackingSwitch();
     PolyLineMenu::Fill(menu, PolyLineMenu::Build(s));
@@ -199,8 +200,9 @@ bool PolyLineControl::ControlGetTip(PreviewInfo *info, char *buffer, const TagLi
         p.tool = main->GetOperator() ? main->GetOperator()->GetName() : "";
         p.shape = main->GetName();
         p.index = hit.item;
-        p.role = mInnerInput ? PolyLineTips::Outer : (mOuterInput && mPairing == 2) ? PolyLineTips::Inner
-                                                                                    : PolyLineTips::Single;
+        p.role = mInnerInput                      ? PolyLineTips::Outer
+                 : (mOuterInput && mPairing == 2) ? PolyLineTips::Inner
+                                                  : PolyLineTips::Single;
         p.tag = tag;
         p.animated = main->IsAnimated();
         p.time = GetCurrentTime();
@@ -240,7 +242,8 @@ void PolyLineControl::AddSurfaceState(ScriptVal &state) const
         state.SetKey(ScriptVal(key), ScriptVal(on));
     state.SetKey(ScriptVal("rotoDistance"), ScriptVal(s.rotoDistance));
     state.SetKey(ScriptVal("rotoFrameSkip"), ScriptVal(s.rotoFrameSkip));
-    const bool record[6] = {mRecordTime, mRecordPressure, mRecordHeight, mRecordAngleXY, mRecordAngleZ, mRecordRotation};
+    const bool record[6] = {mRecordTime,    mRecordPressure, mRecordHeight,
+                            mRecordAngleXY, mRecordAngleZ,   mRecordRotation};
     int32 bits = 0;
     for (int32 i = 0; i < 6; ++i)
         bits |= record[i] ? 1 << i : 0;
@@ -266,7 +269,8 @@ void PolyLineControl::DrawExtras(Graphics::GPainter &p, const PolyLine &shape, c
                 p.Vertex(pt.OutX, pt.OutY);
         }
         if (shape.IsClosed())
-            p.Vertex(shape.GetPoint(0)->InX, shape.GetPoint(0)->InY), p.Vertex(shape.GetPoint(0)->X, shape.GetPoint(0)->Y);
+            p.Vertex(shape.GetPoint(0)->InX, shape.GetPoint(0)->InY),
+                p.Vertex(shape.GetPoint(0)->X, shape.GetPoint(0)->Y);
         p.End();
     }
     if (mSettings.pointNumbers) {

@@ -56,8 +56,8 @@ Entry Separator()
 Entry ModeMenu(const PolyLineMenuState &s)
 {
     Entry e;
-    e.text = (s.shapeName.IsEmpty() ? std::string("Polyline") : s.shapeName.str()) + ": " +
-             PolyLineMenu::ModeName(s.mode);
+    e.text =
+        (s.shapeName.IsEmpty() ? std::string("Polyline") : s.shapeName.str()) + ": " + PolyLineMenu::ModeName(s.mode);
     for (int32 mode : {1, 2, 3, 4, 0})
         e.items.push_back(Check(PolyLineMenu::ModeName(mode), PolyLineMenu::ModeCommand(mode), s.mode == mode));
     return e;
@@ -85,8 +85,8 @@ void AddEditing(std::vector<Entry> &m, const PolyLineMenuState &s)
     m.push_back(Item("Linear", PLCMD_Linear));
     m.push_back(Item("Smooth", PLCMD_Smooth));
     m.push_back(Sub("Smooth Points", {Item("Default", PLCMD_SmoothPoints, 1), Item("Dialog…", PLCMD_SmoothPoints, 0)}));
-    m.push_back(
-        Sub("Smooth Animation", {Item("Default", PLCMD_SmoothAnimation, 1), Item("Dialog…", PLCMD_SmoothAnimation, 0)}));
+    m.push_back(Sub("Smooth Animation",
+                    {Item("Default", PLCMD_SmoothAnimation, 1), Item("Dialog…", PLCMD_SmoothAnimation, 0)}));
     m.push_back(Item("Ease In / Out…", PLCMD_EaseInOut));
     m.push_back(Sub("Create", {Item("Ellipse…", PLCMD_CreateEllipse), Item("Rectangle…", PLCMD_CreateRectangle),
                                Item("Arrow…", PLCMD_CreateArrow, 0, s.readOnly ? MIF_Disabled : 0u)}));
@@ -122,12 +122,12 @@ void AddShapeTools(std::vector<Entry> &m, const PolyLineMenuState &s)
     m.push_back(Item("Shape Box", PLCMD_ShapeBox, 0));
     m.push_back(Item("Shape Box Both Polylines", PLCMD_ShapeBox, 1));
     const uint16 style = s.displayFlags & PLD_Styles;
-    m.push_back(Sub("Draw Style", {Check("Solid", PLCMD_DrawStyle, style == 0, 0),
-                                   Check("Dash", PLCMD_DrawStyle, style == PLD_Dash, 1),
-                                   Check("Null", PLCMD_DrawStyle, style == PLD_Null, 5), Separator(),
-                                   Item("Custom Spline Color…", PLCMD_SplineColor),
-                                   Item("Custom Key Point Color…", PLCMD_KeyPointColor),
-                                   Item("Custom Handle Color…", PLCMD_HandleColor)}));
+    m.push_back(
+        Sub("Draw Style",
+            {Check("Solid", PLCMD_DrawStyle, style == 0, 0), Check("Dash", PLCMD_DrawStyle, style == PLD_Dash, 1),
+             Check("Null", PLCMD_DrawStyle, style == PLD_Null, 5), Separator(),
+             Item("Custom Spline Color…", PLCMD_SplineColor), Item("Custom Key Point Color…", PLCMD_KeyPointColor),
+             Item("Custom Handle Color…", PLCMD_HandleColor)}));
     if (s.bspline)
         m.push_back(Item("Subdivide…", PLCMD_Subdivide));
     const bool canReduce = s.points >= 3 && !s.readOnly && !s.currentTimeOnly;
@@ -141,11 +141,11 @@ void AddPublishing(std::vector<Entry> &m, const PolyLineMenuState &s)
 {
     if (!s.canPublish)
         return;
-    m.push_back(Sub("Publish", {Item("Publish Points", PLCMD_PublishPoints),
-                                Item("Unpublish Points", PLCMD_UnpublishPoints),
-                                Item("Publish All Points", PLCMD_PublishAll),
-                                Item("Make Points Follow Nearby Published Points", PLCMD_FollowNearby),
-                                Item("Stop Points Following", PLCMD_StopFollowing)}));
+    m.push_back(
+        Sub("Publish", {Item("Publish Points", PLCMD_PublishPoints), Item("Unpublish Points", PLCMD_UnpublishPoints),
+                        Item("Publish All Points", PLCMD_PublishAll),
+                        Item("Make Points Follow Nearby Published Points", PLCMD_FollowNearby),
+                        Item("Stop Points Following", PLCMD_StopFollowing)}));
     m.push_back(Sub("Publish To", {Item("Publish To Path", PLCMD_PublishTo, PT_Path),
                                    Item("Publish To XYPath", PLCMD_PublishTo, PT_XYPath),
                                    Item("Publish To IntelliTrack Tracker", PLCMD_PublishTo, PT_IntelliTrack),
@@ -170,13 +170,12 @@ void AddDisplay(std::vector<Entry> &m, const PolyLineMenuState &s)
 
 void AddTime(std::vector<Entry> &m, const PolyLineMenuState &s)
 {
-    m.push_back(Sub("Onion Skin", {Check("Enable", PLCMD_OnionEnable, s.onionEnabled),
-                                   Item("Onion skin settings…", PLCMD_OnionSettings),
-                                   Check("Onion skin click to Set Current Time", PLCMD_OnionClickTime,
-                                         s.onionClickTime),
-                                   Item("Reset onion skin anchor", PLCMD_OnionResetAnchor),
-                                   Item("Set prev skin color", PLCMD_OnionSetPrevColor),
-                                   Item("Reset prev skin color", PLCMD_OnionResetPrevColor)}));
+    m.push_back(Sub(
+        "Onion Skin",
+        {Check("Enable", PLCMD_OnionEnable, s.onionEnabled), Item("Onion skin settings…", PLCMD_OnionSettings),
+         Check("Onion skin click to Set Current Time", PLCMD_OnionClickTime, s.onionClickTime),
+         Item("Reset onion skin anchor", PLCMD_OnionResetAnchor), Item("Set prev skin color", PLCMD_OnionSetPrevColor),
+         Item("Reset prev skin color", PLCMD_OnionResetPrevColor)}));
     Entry roto = Sub("Roto Assist", {Check("Enable", PLCMD_RotoEnable, s.rotoEnabled)});
     if (s.trackingSwitch)
         roto.items.push_back(Check("Track Points", PLCMD_RotoTrackPoints, s.rotoTrackPoints));
@@ -211,12 +210,11 @@ void AddFiles(std::vector<Entry> &m, const PolyLineMenuState &s)
     }
     m.push_back(record);
     m.push_back(Item("Export…", PLCMD_Export));
-    m.push_back(Sub("Import", {Item("Import LightWave MOT…", PLCMD_ImportMot),
-                               Item("Import Motion Path…", PLCMD_ImportMotionPath),
-                               Item("Import Shape…", PLCMD_ImportShape), Item("Import SSF Shapes…", PLCMD_ImportSsf),
-                               Item("Import FXS (Silhouette) Shapes…", PLCMD_ImportFxs),
-                               Item("Import Nuke Shapes…", PLCMD_ImportNuke),
-                               Item("Import Boujou Path…", PLCMD_ImportBoujou)}));
+    m.push_back(Sub(
+        "Import", {Item("Import LightWave MOT…", PLCMD_ImportMot), Item("Import Motion Path…", PLCMD_ImportMotionPath),
+                   Item("Import Shape…", PLCMD_ImportShape), Item("Import SSF Shapes…", PLCMD_ImportSsf),
+                   Item("Import FXS (Silhouette) Shapes…", PLCMD_ImportFxs),
+                   Item("Import Nuke Shapes…", PLCMD_ImportNuke), Item("Import Boujou Path…", PLCMD_ImportBoujou)}));
 }
 
 void FillAction(QAction *action, const Entry &e)

@@ -99,7 +99,7 @@ enum PolyLineCommand : int32
     PLCMD_RotoResetPattern = 0x20073,
     PLCMD_AutoRotoEdges = 0x20074, // toolbar only
     // Key-only actions (no menu entry).
-    PLCMD_NextPoint = 0x20100, // arg +1 / -1
+    PLCMD_NextPoint = 0x20100,    // arg +1 / -1
     PLCMD_NextKeyframe = 0x20101, // arg +1 / -1
     PLCMD_ToggleMarkers = 0x20102,
     PLCMD_FinishMode = 0x20103,

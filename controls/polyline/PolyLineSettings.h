@@ -16,7 +16,7 @@ struct PolyLineSettings
     bool onionEnabled = true;       // the other keyframes' shapes drawn
     bool onionClickTime = false;    // a click on an onion skin goes to its time
     float64 onionAnchor = TIME_UNDEFINED;
-    OrbColor onionPrevColor;        // the skins before the current time; none: the skin colour
+    OrbColor onionPrevColor; // the skins before the current time; none: the skin colour
     bool rotoEnabled = false, rotoMultiple = false, rotoTrackPoints = false;
     bool rotoShowArea = false, rotoPatternEdit = false;
     int32 rotoDistance = 5;  // frames between tracked keys

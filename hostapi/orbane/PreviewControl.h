@@ -28,16 +28,16 @@ class PreviewInfo;
 enum PreviewControlTag : Tag
 {
     PCA_EventFlags = 0x10010002,        // a mouse event's flag word (PEF_ bits)
-    // HandleMenu and HandleEvent from a script: the value a dialog would ask
-    // for (a file path, a colour "#rrggbb", a number), as text; and that the
-    // command comes from a script, which no dialog may wait for.
-    PCA_CommandValue = 0x30010003,
-    PCA_FromScript = 0x10010004,
     PCA_ValueFlags = 0x10000451,        // a written value's flag word; 0: an ordinary edit
     PCA_FollowCursor = 0x10048003,      // the overlay's point follows the mouse
     PCA_HideWhileDragging = 0x10048004, // the overlay is not drawn while its own drag runs
     PCA_GrabOffsetX = 0x2004800c,       // screen offset from the mouse to the handle at the press
     PCA_GrabOffsetY = 0x2004800d,
+    // HandleMenu and HandleEvent from a script: the value a dialog would ask
+    // for (a file path, a colour "#rrggbb", a number), as text; and that the
+    // command comes from a script, which no dialog may wait for.
+    PCA_CommandValue = 0x30010003,
+    PCA_FromScript = 0x10010004,
 };
 
 // Bits of PCA_EventFlags.

@@ -60,6 +60,17 @@ check.eq(orbane.UndoNames()[#orbane.UndoNames()], "Delete Points", "as one step"
 orbane.Undo()
 check.eq(#orbane.GetValue("Roto1", "Mask").points, 4, "and undo brings them back")
 
+-- Export and import through a file the script names.
+local file = os.tmpname() .. ".svg"
+check.eq(orbane.ViewerMenuChoose(on, { "Export…" }, file), true, "exported")
+check.eq(orbane.ViewerMenuChoose(on, { "Import", "Import Shape…" }, file), true, "read back")
+check.eq(orbane.UndoNames()[#orbane.UndoNames()], "Import Shape", "one step")
+check.eq(#orbane.GetValue("Roto1", "Mask").points, 4, "the same four points")
+check.eq(orbane.ViewerMenuChoose(on, { "Import", "Import Shape…" }, file .. ".missing"), false, "a file not there")
+check.eq(orbane.ViewerMenuChoose(on, { "Import", "Import Nuke Shapes…" }), false, "a format not read yet")
+check.eq(orbane.OverlayState("Roto1", "Mask").message:find("not read yet", 1, true) ~= nil, true, "says so")
+os.remove(file)
+
 -- The toolbar: buttons by tip and label, pop-downs with their items.
 local bar = orbane.ViewerToolbar()
 check.eq(bar[1].label, "Click", "the first button")

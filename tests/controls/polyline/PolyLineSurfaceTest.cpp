@@ -179,50 +179,112 @@ void PolyLineSurfaceTest::menuEntriesInOrder()
     AddShape(f, 4, TagList{{PLC_CanPublishPoints, 1}});
     QVERIFY(f.Show());
     const bool tracking = qEnvironmentVariableIntValue("ORBANE_ROTO_TRACKING") == 1;
-    QStringList expected{
-        "Shape: Insert and Modify>Click Append=2000e,0,400", "Shape: Insert and Modify>Draw Append=2000f,0,400",
-        "Shape: Insert and Modify>Insert and Modify=20010,0,408", "Shape: Insert and Modify>Modify Only=20011,0,400",
-        "Shape: Insert and Modify>Done=20012,0,400", "Set Focus=2004e,0,0", "Closed=20008,0,400", "-",
-        "Copy=20020,0,0", "Copy Path Value=2001f,0,0", "Cut Path Points=20021,0,0", "Paste=20022,0,0",
-        "Paste With Offset=20023,0,0", "-", "Delete Points=20002,0,0", "Lock Points=20013,0,400",
-        "Lock Point Pairs=2005f,0,0", "Edit Point\tE=2001c,0,0", "Linear=20004,0,0", "Smooth=20003,0,0",
-        "Smooth Points>Default=20005,1,0", "Smooth Points>Dialog…=20005,0,0", "Smooth Animation>Default=20006,1,0",
-        "Smooth Animation>Dialog…=20006,0,0", "Ease In / Out…=20007,0,0", "Create>Ellipse…=20052,0,0",
-        "Create>Rectangle…=20051,0,0", "Create>Arrow…=20054,0,0", "-", "Make Outer Polyline=2005c,0,0", "-",
-        "Bezier to B-Spline=20055,0,0", "B-Spline to Bezier=20056,0,0", "Cardinal to Bezier=20058,0,0",
-        "Convert to XYPath=2005b,0,0", "Shape Box=2000b,0,0", "Shape Box Both Polylines=2000b,1,0",
-        "Draw Style>Solid=20062,0,408", "Draw Style>Dash=20062,1,400", "Draw Style>Null=20062,5,400",
-        "Draw Style>-", "Draw Style>Custom Spline Color…=2000c,0,0", "Draw Style>Custom Key Point Color…=2004f,0,0",
-        "Draw Style>Custom Handle Color…=20050,0,0", "Reduce Points…=2000a,0,400", "Publish>Publish Points=20047,0,0",
-        "Publish>Unpublish Points=20048,0,0", "Publish>Publish All Points=20049,0,0",
-        "Publish>Make Points Follow Nearby Published Points=2004a,0,0", "Publish>Stop Points Following=2004b,0,0",
-        "Publish To>Publish To Path=2004d,0,0", "Publish To>Publish To XYPath=2004d,1,0",
-        "Publish To>Publish To IntelliTrack Tracker=2004d,2,0", "Publish To>Publish To Point Tracker=2004d,3,0", "-",
-        "Point Numbers=20014,0,400", "Current Time Only=2001b,0,400", "Select All=20001,0,0",
-        "Lock Point Selection=20024,0,400", "Publishing Path Points Enabled=20031,0,400",
-        "Show>Key Points=20025,0,408", "Show>Handles=20026,0,408", "Show>Convex Hull Polygon=20026,1,400",
-        "Show>Polygon=20061,0,408", "Show>Show Tagged Point IDs=20027,0,408", "Polygon Keyframe List...=20028,0,0",
-        "-", "Onion Skin>Enable=2002a,0,408", "Onion Skin>Onion skin settings…=2002b,0,0",
-        "Onion Skin>Onion skin click to Set Current Time=2002d,0,400", "Onion Skin>Reset onion skin anchor=2002e,0,0",
-        "Onion Skin>Set prev skin color=2002f,0,0", "Onion Skin>Reset prev skin color=20030,0,0",
-        "Roto Assist>Enable=2006a,0,400"};
+    QStringList expected{"Shape: Insert and Modify>Click Append=2000e,0,400",
+                         "Shape: Insert and Modify>Draw Append=2000f,0,400",
+                         "Shape: Insert and Modify>Insert and Modify=20010,0,408",
+                         "Shape: Insert and Modify>Modify Only=20011,0,400",
+                         "Shape: Insert and Modify>Done=20012,0,400",
+                         "Set Focus=2004e,0,0",
+                         "Closed=20008,0,400",
+                         "-",
+                         "Copy=20020,0,0",
+                         "Copy Path Value=2001f,0,0",
+                         "Cut Path Points=20021,0,0",
+                         "Paste=20022,0,0",
+                         "Paste With Offset=20023,0,0",
+                         "-",
+                         "Delete Points=20002,0,0",
+                         "Lock Points=20013,0,400",
+                         "Lock Point Pairs=2005f,0,0",
+                         "Edit Point\tE=2001c,0,0",
+                         "Linear=20004,0,0",
+                         "Smooth=20003,0,0",
+                         "Smooth Points>Default=20005,1,0",
+                         "Smooth Points>Dialog…=20005,0,0",
+                         "Smooth Animation>Default=20006,1,0",
+                         "Smooth Animation>Dialog…=20006,0,0",
+                         "Ease In / Out…=20007,0,0",
+                         "Create>Ellipse…=20052,0,0",
+                         "Create>Rectangle…=20051,0,0",
+                         "Create>Arrow…=20054,0,0",
+                         "-",
+                         "Make Outer Polyline=2005c,0,0",
+                         "-",
+                         "Bezier to B-Spline=20055,0,0",
+                         "B-Spline to Bezier=20056,0,0",
+                         "Cardinal to Bezier=20058,0,0",
+                         "Convert to XYPath=2005b,0,0",
+                         "Shape Box=2000b,0,0",
+                         "Shape Box Both Polylines=2000b,1,0",
+                         "Draw Style>Solid=20062,0,408",
+                         "Draw Style>Dash=20062,1,400",
+                         "Draw Style>Null=20062,5,400",
+                         "Draw Style>-",
+                         "Draw Style>Custom Spline Color…=2000c,0,0",
+                         "Draw Style>Custom Key Point Color…=2004f,0,0",
+                         "Draw Style>Custom Handle Color…=20050,0,0",
+                         "Reduce Points…=2000a,0,400",
+                         "Publish>Publish Points=20047,0,0",
+                         "Publish>Unpublish Points=20048,0,0",
+                         "Publish>Publish All Points=20049,0,0",
+                         "Publish>Make Points Follow Nearby Published Points=2004a,0,0",
+                         "Publish>Stop Points Following=2004b,0,0",
+                         "Publish To>Publish To Path=2004d,0,0",
+                         "Publish To>Publish To XYPath=2004d,1,0",
+                         "Publish To>Publish To IntelliTrack Tracker=2004d,2,0",
+                         "Publish To>Publish To Point Tracker=2004d,3,0",
+                         "-",
+                         "Point Numbers=20014,0,400",
+                         "Current Time Only=2001b,0,400",
+                         "Select All=20001,0,0",
+                         "Lock Point Selection=20024,0,400",
+                         "Publishing Path Points Enabled=20031,0,400",
+                         "Show>Key Points=20025,0,408",
+                         "Show>Handles=20026,0,408",
+                         "Show>Convex Hull Polygon=20026,1,400",
+                         "Show>Polygon=20061,0,408",
+                         "Show>Show Tagged Point IDs=20027,0,408",
+                         "Polygon Keyframe List...=20028,0,0",
+                         "-",
+                         "Onion Skin>Enable=2002a,0,408",
+                         "Onion Skin>Onion skin settings…=2002b,0,0",
+                         "Onion Skin>Onion skin click to Set Current Time=2002d,0,400",
+                         "Onion Skin>Reset onion skin anchor=2002e,0,0",
+                         "Onion Skin>Set prev skin color=2002f,0,0",
+                         "Onion Skin>Reset prev skin color=20030,0,0",
+                         "Roto Assist>Enable=2006a,0,400"};
     if (tracking)
         expected << "Roto Assist>Track Points=2006b,0,400";
-    expected << "Roto Assist>Roto Assist Multiple Points=2006d,0,400" << "Roto Assist>Distance 5…=2006e,0,0";
+    expected << "Roto Assist>Roto Assist Multiple Points=2006d,0,400"
+             << "Roto Assist>Distance 5…=2006e,0,0";
     if (tracking)
         expected << "Roto Assist>Frame Skip=2006c,0,0";
-    expected << "Roto Assist>Create Track Points=2006f,0,0" << "Roto Assist>Reset=20070,0,0"
-             << "Roto Assist>Show Tracker Area=20071,0,400" << "Roto Assist>Track Pattern Edit Mode=20072,0,400"
+    expected << "Roto Assist>Create Track Points=2006f,0,0"
+             << "Roto Assist>Reset=20070,0,0"
+             << "Roto Assist>Show Tracker Area=20071,0,400"
+             << "Roto Assist>Track Pattern Edit Mode=20072,0,400"
              << "Roto Assist>Reset Track Pattern to PolyLine Points=20073,0,0"
-             << "Edit Multiple Polylines=20063,0,400" << "Edit Multiple Frames>None=20064,0,408"
-             << "Edit Multiple Frames>Prev=20064,1,400" << "Edit Multiple Frames>Next=20064,2,400"
-             << "Edit Multiple Frames>All=20064,3,400" << "Stop Rendering=20032,0,400" << "-"
-             << "Record>Time=20015,0,400" << "Record>Pressure=20016,0,400" << "Record>Height=20017,0,400"
-             << "Record>Angle XY=20018,0,400" << "Record>Angle Z=20019,0,400" << "Record>Rotation=2001a,0,400"
-             << "Export…=2003e,0,0" << "Import>Import LightWave MOT…=20040,0,0"
-             << "Import>Import Motion Path…=2003f,0,0" << "Import>Import Shape…=20041,0,0"
-             << "Import>Import SSF Shapes…=20042,0,0" << "Import>Import FXS (Silhouette) Shapes…=20043,0,0"
-             << "Import>Import Nuke Shapes…=20044,0,0" << "Import>Import Boujou Path…=20045,0,0";
+             << "Edit Multiple Polylines=20063,0,400"
+             << "Edit Multiple Frames>None=20064,0,408"
+             << "Edit Multiple Frames>Prev=20064,1,400"
+             << "Edit Multiple Frames>Next=20064,2,400"
+             << "Edit Multiple Frames>All=20064,3,400"
+             << "Stop Rendering=20032,0,400"
+             << "-"
+             << "Record>Time=20015,0,400"
+             << "Record>Pressure=20016,0,400"
+             << "Record>Height=20017,0,400"
+             << "Record>Angle XY=20018,0,400"
+             << "Record>Angle Z=20019,0,400"
+             << "Record>Rotation=2001a,0,400"
+             << "Export…=2003e,0,0"
+             << "Import>Import LightWave MOT…=20040,0,0"
+             << "Import>Import Motion Path…=2003f,0,0"
+             << "Import>Import Shape…=20041,0,0"
+             << "Import>Import SSF Shapes…=20042,0,0"
+             << "Import>Import FXS (Silhouette) Shapes…=20043,0,0"
+             << "Import>Import Nuke Shapes…=20044,0,0"
+             << "Import>Import Boujou Path…=20045,0,0";
     const QStringList menu = MenuAt(f, kAway);
     for (int i = 0; i < std::min(menu.size(), expected.size()); ++i)
         QCOMPARE(menu[i], expected[i]);
@@ -238,27 +300,31 @@ void PolyLineSurfaceTest::menuConditions_data()
     QTest::addColumn<QStringList>("present");
     QTest::addColumn<QStringList>("absent");
     const TagList none;
-    QTest::newRow("three points: reduce enabled") << 3 << none << none
+    QTest::newRow("three points: reduce enabled")
+        << 3 << none << none
         << QStringList{"Reduce Points…=2000a,0,400", "Make Outer Polyline=2005c,0,0", "Create>Arrow…=20054,0,0"}
         << QStringList{"Remove Outer Polyline=2005c,0,0", "Subdivide…=2000d,0,0", "Publish>Publish Points=20047,0,0"};
-    QTest::newRow("two points: reduce disabled") << 2 << none << none
-        << QStringList{"Reduce Points…=2000a,0,401"} << QStringList{"Reduce Points…=2000a,0,400"};
+    QTest::newRow("two points: reduce disabled")
+        << 2 << none << none << QStringList{"Reduce Points…=2000a,0,401"} << QStringList{"Reduce Points…=2000a,0,400"};
     QTest::newRow("empty: no outer entries") << 0 << none << none << QStringList{"Reduce Points…=2000a,0,401"}
-        << QStringList{"Make Outer Polyline=2005c,0,0"};
-    QTest::newRow("read-only: arrow and reduce disabled") << 4 << TagList{{INPA_ReadOnly, 1}} << none
+                                             << QStringList{"Make Outer Polyline=2005c,0,0"};
+    QTest::newRow("read-only: arrow and reduce disabled")
+        << 4 << TagList{{INPA_ReadOnly, 1}} << none
         << QStringList{"Create>Arrow…=20054,0,1", "Reduce Points…=2000a,0,401", "Create>Ellipse…=20052,0,0"}
         << QStringList{"Create>Arrow…=20054,0,0"};
     QTest::newRow("current time only: reduce disabled")
         << 4 << TagList{{0x10058008, 1}} << none
         << QStringList{"Reduce Points…=2000a,0,401", "Current Time Only=2001b,0,408"} << QStringList{};
-    QTest::newRow("pairing 2: remove and reset") << 4 << TagList{{PLCID_InPolyLine2, OrbID("Outer")}}
-        << TagList{{TOOL_FollowInner, 0}}
+    QTest::newRow("pairing 2: remove and reset")
+        << 4 << TagList{{PLCID_InPolyLine2, OrbID("Outer")}} << TagList{{TOOL_FollowInner, 0}}
         << QStringList{"Remove Outer Polyline=2005c,0,0", "Reset Outer Point Positions=2005e,0,0"}
         << QStringList{"Make Outer Polyline=2005c,0,0", "Follow Inner Polyline=20060,0,0"};
     QTest::newRow("pairing 1: make") << 4 << TagList{{PLCID_InPolyLine2, OrbID("Outer")}}
-        << TagList{{TOOL_FollowInner, 1}} << QStringList{"Make Outer Polyline=2005c,0,0"}
-        << QStringList{"Remove Outer Polyline=2005c,0,0", "Enable Outer Polyline=2005d,0,0"};
-    QTest::newRow("pairing 3: enable and make") << 4 << TagList{{PLC_PairFromAttach, 1}} << none
+                                     << TagList{{TOOL_FollowInner, 1}} << QStringList{"Make Outer Polyline=2005c,0,0"}
+                                     << QStringList{"Remove Outer Polyline=2005c,0,0",
+                                                    "Enable Outer Polyline=2005d,0,0"};
+    QTest::newRow("pairing 3: enable and make")
+        << 4 << TagList{{PLC_PairFromAttach, 1}} << none
         << QStringList{"Enable Outer Polyline=2005d,0,0", "Make Outer Polyline=2005c,0,0"}
         << QStringList{"Remove Outer Polyline=2005c,0,0", "Enable Polyline=2005d,0,0"};
     QTest::newRow("pairing 0: the outer shape's own entries")
@@ -266,8 +332,8 @@ void PolyLineSurfaceTest::menuConditions_data()
         << QStringList{"Make Outer Polyline=2005c,0,0", "Follow Inner Polyline=20060,0,0",
                        "Reset Outer Point Positions=2005e,0,0", "Enable Polyline=2005d,0,0"}
         << QStringList{"Remove Outer Polyline=2005c,0,0", "Enable Outer Polyline=2005d,0,0"};
-    QTest::newRow("pairing 0 and empty: none") << 0 << TagList{{PLC_PairFromAttach, 1}, {PLCID_InPolyLine, OrbID("Outer")}}
-        << none << QStringList{}
+    QTest::newRow("pairing 0 and empty: none")
+        << 0 << TagList{{PLC_PairFromAttach, 1}, {PLCID_InPolyLine, OrbID("Outer")}} << none << QStringList{}
         << QStringList{"Make Outer Polyline=2005c,0,0", "Follow Inner Polyline=20060,0,0", "Enable Polyline=2005d,0,0"};
 }
 
@@ -461,14 +527,15 @@ void PolyLineSurfaceTest::toolbar()
                 if (item->text() == "Prev")
                     prev = item;
     }
-    QCOMPARE(bar.join(" "),
-             QString("Click Append/Click Draw Append/Draw Insert and Modify/Insert Modify Only/Modify Done/Done | "
-                     "Current Time Only/Current Close the Polyline/Closed Lock Points/Lock Select All points/Select All | "
-                     "Show Key Points/Keys Show All Handles/Handles Show Polygon curve/Polygon | Shape Box/Shape "
-                     "Delete Points (Del)/Delete Reduce Points/Reduce | Publish Menu/Publish[5] "
-                     "Make Points Follow Nearby Published Points/Follow Points | Make Double Poly/Double Poly "
-                     "Follow Inner Poly/Follow Inner | Multiframe Menu/Multiframe[4] | Onion Skin/Onion Skin[6] | "
-                     "Roto Assist/Roto Assist[10]"));
+    QCOMPARE(
+        bar.join(" "),
+        QString("Click Append/Click Draw Append/Draw Insert and Modify/Insert Modify Only/Modify Done/Done | "
+                "Current Time Only/Current Close the Polyline/Closed Lock Points/Lock Select All points/Select All | "
+                "Show Key Points/Keys Show All Handles/Handles Show Polygon curve/Polygon | Shape Box/Shape "
+                "Delete Points (Del)/Delete Reduce Points/Reduce | Publish Menu/Publish[5] "
+                "Make Points Follow Nearby Published Points/Follow Points | Make Double Poly/Double Poly "
+                "Follow Inner Poly/Follow Inner | Multiframe Menu/Multiframe[4] | Onion Skin/Onion Skin[6] | "
+                "Roto Assist/Roto Assist[10]"));
     QVERIFY(prev && draw && closed);
     prev->trigger();
     QCOMPARE(FieldText(overlay, "multiFrame"), QString("1"));
