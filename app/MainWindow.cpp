@@ -27,6 +27,9 @@ MainWindow::MainWindow(OrbaneDoc *doc, QWidget *parent) : QMainWindow(parent), m
 {
     resize(1280, 800);
     setCentralWidget(BuildCentre());
+    // What an overlay tells the user stays long enough to be read.
+    connect(mViewer, &ViewerPanel::overlayMessage, this,
+            [this](const QString &message) { statusBar()->showMessage(message, 8000); });
 
     auto *dock = new QDockWidget(tr("Inspector"), this);
     dock->setObjectName("inspector");

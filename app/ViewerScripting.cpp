@@ -12,10 +12,13 @@
 #include "orbane/ScriptVal.h"
 #include "orbane/ViewerPanel.h"
 
+#include <QAction>
 #include <QApplication>
 #include <QKeySequence>
+#include <QMenu>
 #include <QMouseEvent>
 #include <QTest>
+#include <QToolBar>
 
 #include <cmath>
 #include <cstring>
@@ -142,6 +145,10 @@ int ViewerInfo(lua_State *L)
         lua_pushinteger(L, v);
         lua_setfield(L, -2, key);
     }
+    if (!viewer->LastMessage().isEmpty()) {
+        lua_pushstring(L, viewer->LastMessage().toUtf8().constData());
+        lua_setfield(L, -2, "message");
+    }
     if (const PreviewControl *hot = viewer->HotControl()) {
         lua_pushstring(L, hot->GetRegistry() ? hot->GetRegistry()->Name() : "PreviewControl");
         lua_setfield(L, -2, "hot");
@@ -204,16 +211,221 @@ int OverlayState(lua_State *L)
     return 1;
 }
 
+// --- the context menu, the toolbar and tips ---
+
+// A menu entry's flag word as the user sees the action: 0x001 disabled,
+// 0x008 checked, 0x400 a check item.
+int ActionFlags(const QAction *a)
+{
+    return (a->isEnabled() ? 0 : 0x001) | (a->isChecked() ? 0x008 : 0) | (a->isCheckable() ? 0x400 : 0);
+}
+
+void PushMenu(lua_State *L, const QMenu *menu)
+{
+    const QList<QAction *> actions = menu->actions();
+    lua_createtable(L, actions.size(), 0);
+    int n = 0;
+    for (const QAction *a : actions) {
+        lua_newtable(L);
+        if (a->isSeparator()) {
+            lua_pushboolean(L, 1);
+            lua_setfield(L, -2, "separator");
+        } else {
+            lua_pushstring(L, a->text().toUtf8().constData());
+            lua_setfield(L, -2, "text");
+            if (a->menu()) {
+                PushMenu(L, a->menu());
+                lua_setfield(L, -2, "items");
+            } else {
+                const QVariant id = a->property("menuId");
+                lua_pushinteger(L, id.isValid() ? id.toInt() : a->data().toInt());
+                lua_setfield(L, -2, "id");
+                lua_pushinteger(L, a->property("menuArg").toInt());
+                lua_setfield(L, -2, "arg");
+                lua_pushinteger(L, ActionFlags(a));
+                lua_setfield(L, -2, "flags");
+            }
+        }
+        lua_rawseti(L, -2, ++n);
+    }
+}
+
+// The texts of the table at `idx`: a path through submenus or pop-downs.
+QStringList PathArg(const LuaArgs &args, int idx)
+{
+    lua_State *L = args.State();
+    if (!lua_istable(L, idx))
+        args.Fail(idx, "path", "expected a table of entry texts");
+    QStringList path;
+    const lua_Integer n = lua_Integer(lua_objlen(L, idx));
+    for (lua_Integer i = 1; i <= n; ++i) {
+        lua_rawgeti(L, idx, i);
+        if (lua_type(L, -1) != LUA_TSTRING)
+            args.Fail(idx, "path", "expected only texts");
+        path << QString::fromUtf8(lua_tostring(L, -1));
+        lua_pop(L, 1);
+    }
+    if (path.isEmpty())
+        args.Fail(idx, "path", "is empty");
+    return path;
+}
+
+// The first entry (that of the overlay under the mouse, where there is one)
+// matches by its whole text or by the text before its shortcut
+// ("Edit Point" for "Edit Point\tE").
+QAction *FindAction(const QList<QAction *> &actions, const QStringList &path)
+{
+    QList<QAction *> level = actions;
+    for (int i = 0; i < path.size(); ++i) {
+        QAction *found = nullptr;
+        for (QAction *a : level)
+            if (!found && !a->isSeparator() && (a->text() == path[i] || a->text().section('\t', 0, 0) == path[i]))
+                found = a;
+        if (!found || (i + 1 < path.size() && !found->menu()))
+            return nullptr;
+        if (i + 1 == path.size())
+            return found;
+        level = found->menu()->actions();
+    }
+    return nullptr;
+}
+
+// The command tags of a choice made by a script: no dialog may wait, and a
+// value given is the one the dialog would ask for.
+TagList ScriptCommandTags(const LuaArgs &args, int idx)
+{
+    TagList tags{{PCA_FromScript, 1}};
+    if (const char *value = args.OptString(idx, "value", nullptr))
+        tags.Set(PCA_CommandValue, OrbString(value));
+    return tags;
+}
+
+void HoverAt(const LuaArgs &args, int idx)
+{
+    ViewerPanel *viewer = gWindow->Viewer();
+    Hands::SendMouse(viewer, QEvent::MouseMove, Position(args, idx, viewer), Qt::NoButton, Qt::NoButton,
+                     Qt::NoModifier);
+}
+
+// ViewerMenu(pos) -> the context menu at `pos`: { text =, id =, arg =,
+// flags = } per entry, { text =, items = } per submenu, { separator = true }.
+int ViewerMenu(lua_State *L)
+{
+    const LuaArgs args(L, "ViewerMenu");
+    HoverAt(args, 1);
+    QMenu menu;
+    gWindow->Viewer()->FillContextMenu(&menu);
+    PushMenu(L, &menu);
+    return 1;
+}
+
+// ViewerMenuChoose(pos, { "Draw Style", "Dash" } [, value]) -> whether the
+// command acted.
+int ViewerMenuChoose(lua_State *L)
+{
+    const LuaArgs args(L, "ViewerMenuChoose");
+    const QStringList path = PathArg(args, 2);
+    const TagList tags = ScriptCommandTags(args, 3);
+    HoverAt(args, 1);
+    ViewerPanel *viewer = gWindow->Viewer();
+    QMenu menu;
+    viewer->FillContextMenu(&menu);
+    QAction *action = FindAction(menu.actions(), path);
+    if (!action || action->menu())
+        return Hands::Raise(L, QString("the viewer's menu has no entry \"%1\"").arg(path.join(" > ")));
+    if (!action->isEnabled())
+        return Hands::Raise(L, QString("the menu entry \"%1\" is disabled").arg(path.join(" > ")));
+    viewer->SetCommandTags(tags);
+    const bool acted = viewer->TriggerMenuAction(action);
+    viewer->SetCommandTags(TagList());
+    lua_pushboolean(L, acted);
+    return 1;
+}
+
+void PushToolbar(lua_State *L, const QList<QAction *> &actions)
+{
+    lua_createtable(L, actions.size(), 0);
+    int n = 0;
+    for (const QAction *a : actions) {
+        lua_newtable(L);
+        if (a->isSeparator()) {
+            lua_pushboolean(L, 1);
+            lua_setfield(L, -2, "separator");
+        } else {
+            lua_pushstring(L, a->toolTip().toUtf8().constData());
+            lua_setfield(L, -2, "tip");
+            lua_pushstring(L, a->text().toUtf8().constData());
+            lua_setfield(L, -2, "label");
+            if (a->menu()) {
+                PushToolbar(L, a->menu()->actions());
+                lua_setfield(L, -2, "items");
+            }
+        }
+        lua_rawseti(L, -2, ++n);
+    }
+}
+
+// ViewerToolbar() -> the buttons of the viewer's toolbar: { tip =, label =
+// [, items = { ... }] }, separators as { separator = true }.
+int ViewerToolbar(lua_State *L)
+{
+    QCoreApplication::processEvents();
+    PushToolbar(L, gWindow->Viewer()->OverlayToolBar()->actions());
+    return 1;
+}
+
+// ViewerToolbarPress({ "Multiframe", "Prev" } [, value]).
+int ViewerToolbarPress(lua_State *L)
+{
+    const LuaArgs args(L, "ViewerToolbarPress");
+    const QStringList path = PathArg(args, 1);
+    const TagList tags = ScriptCommandTags(args, 2);
+    ViewerPanel *viewer = gWindow->Viewer();
+    QCoreApplication::processEvents();
+    QAction *action = FindAction(viewer->OverlayToolBar()->actions(), path);
+    if (!action || action->menu())
+        return Hands::Raise(L, QString("the viewer's toolbar has no button \"%1\"").arg(path.join(" > ")));
+    viewer->SetCommandTags(tags);
+    action->trigger();
+    viewer->SetCommandTags(TagList());
+    QCoreApplication::processEvents();
+    return 0;
+}
+
+// ViewerTip(pos) -> the tool tip at `pos`, or nil.
+int ViewerTip(lua_State *L)
+{
+    const LuaArgs args(L, "ViewerTip");
+    ViewerPanel *viewer = gWindow->Viewer();
+    const QString tip = viewer->TipAt(Position(args, 1, viewer));
+    if (tip.isEmpty())
+        lua_pushnil(L);
+    else
+        lua_pushstring(L, tip.toUtf8().constData());
+    return 1;
+}
+
 } // namespace
 
 void ViewerScripting::Install(MainWindow *window)
 {
     gWindow = window;
     const std::pair<const char *, lua_CFunction> functions[] = {
-        {"ViewerPress", ViewerPress},   {"ViewerMove", ViewerMove}, {"ViewerRelease", ViewerRelease},
-        {"ViewerHover", ViewerHover},   {"ViewerKey", ViewerKey},   {"ViewerGrab", ViewerGrab},
-        {"ViewerImage", ViewerImage},   {"ViewerInfo", ViewerInfo}, {"Overlay", Overlay},
+        {"ViewerPress", ViewerPress},
+        {"ViewerMove", ViewerMove},
+        {"ViewerRelease", ViewerRelease},
+        {"ViewerHover", ViewerHover},
+        {"ViewerKey", ViewerKey},
+        {"ViewerGrab", ViewerGrab},
+        {"ViewerImage", ViewerImage},
+        {"ViewerInfo", ViewerInfo},
+        {"Overlay", Overlay},
         {"OverlayState", OverlayState},
+        {"ViewerMenu", ViewerMenu},
+        {"ViewerMenuChoose", ViewerMenuChoose},
+        {"ViewerToolbar", ViewerToolbar},
+        {"ViewerToolbarPress", ViewerToolbarPress},
+        {"ViewerTip", ViewerTip},
     };
     for (const auto &[name, fn] : functions)
         LuaRuntime::Instance().AddModuleFunction(name, fn);

@@ -267,12 +267,12 @@ void PolyLineControl::GetState(ScriptVal &state) const
     state.SetKey(ScriptVal("currentTimeOnly"), ScriptVal(mCurrentTimeOnly));
     state.SetKey(ScriptVal("shapeBox"), ScriptVal(mEditor.GetShapeBox()));
     state.SetKey(ScriptVal("gesture"), ScriptVal(int(mMouse.Current())));
-    state.SetKey(ScriptVal("message"), ScriptVal(mEditor.Message().c_str()));
     ScriptVal keys = ScriptVal::NewTable();
     int32 k = 0;
     for (const float64 t : mEditor.KeyTimes())
         keys.SetKey(ScriptVal(++k), ScriptVal(t));
     state.SetKey(ScriptVal("keyTimes"), keys);
+    AddSurfaceState(state);
 }
 
 // --- values ---
@@ -417,8 +417,10 @@ void PolyLineControl::DrawControls(PreviewInfo *info, const TagList *tags)
     p->Translate(m.Origin().x, m.Origin().y);
     p->Scale(m.SpanX(), m.SpanY());
     const PolyLineStyle style = Style(*info);
-    if (mShape)
+    if (mShape) {
         mDrawing.Draw(*p, *mShape, mSelection, style);
+        DrawExtras(*p, *mShape, style);
+    }
     DrawOuter(*p, style);
     mMouse.Draw(*p, *info, style);
     if (mCreation.gesture == PolyLineCreation::PCG_Stroke) {
@@ -454,17 +456,19 @@ void PolyLineControl::DrawCentre(GPainter &p, const PreviewInfo &info) const
 void PolyLineControl::DrawOnionSkins(GPainter &p, const PreviewInfo &info, const PolyLineStyle &style) const
 {
     Input *main = GetMainInput();
-    if (!main || !main->IsAnimated())
+    if (!main || !main->IsAnimated() || !mSettings.onionEnabled)
         return;
     const float64 now = GetCurrentTime();
     p.PushAttrib();
     p.LineStipple(1, kOnionStipple);
     p.Enable(Graphics::GC_LineStipple);
-    p.Color(kOnionColor, info.GetShadow(OrbColor()).Faded(0.5f));
     for (const float64 time : main->KeyTimes()) {
         if (std::fabs(time - now) < 1e-9)
             continue;
         const AutoParam<PolyLine> skin(main, time);
+        // The skins before now in their own colour, where one is set.
+        const bool prev = time < now && !mSettings.onionPrevColor.IsNone();
+        p.Color(prev ? GColor::FromOrb(mSettings.onionPrevColor) : kOnionColor, info.GetShadow(OrbColor()).Faded(0.5f));
         if (skin)
             PolyLineDrawing::DrawCurve(p, *skin, style.span);
     }
@@ -538,22 +542,6 @@ bool PolyLineControl::HoverBounds(const PreviewInfo &info, OrbRect &bounds) cons
 float64 PolyLineControl::HandleReach(const PreviewInfo &info)
 {
     return PolyLineDrawing::MarkerSide(2.0 * info.HandleScale) + 2.0 * info.PickTolerance;
-}
-
-uint64 PolyLineControl::ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags)
-{
-    const uint64 result = HandleOverlay::ControlCommand(info, command, data, tags);
-    if (command == CCMD_HitTest) {
-        // Over the shape box its part's cursor shows.
-        const int32 boxCursor = IsAppending() ? -1 : mMouse.HoverCursor(*info);
-        if (boxCursor >= 0)
-            mCurrentCursor = &mCursors[std::size_t(boxCursor)];
-        else if (!IsAppending())
-            mCurrentCursor = &mCursors[0];
-        ShowCursor(*info, (IsAppending() && !(data & 1)) || boxCursor >= 0);
-        return boxCursor >= 0 ? result | 1 : result;
-    }
-    return result;
 }
 
 // The control's cursor while it takes the viewer's presses; the viewer's

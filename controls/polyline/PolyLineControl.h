@@ -6,6 +6,7 @@
 #include "polyline/PolyLineDrawing.h"
 #include "polyline/PolyLineEditor.h"
 #include "polyline/PolyLineMouse.h"
+#include "polyline/PolyLineSettings.h"
 
 #include "orbane/AutoRef.h"
 #include "orbane/LockableObject.h"
@@ -16,6 +17,7 @@
 #include <QElapsedTimer>
 
 #include <array>
+#include <memory>
 #include <vector>
 
 namespace Orbane {
@@ -83,6 +85,18 @@ public:
     uint64 ControlCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags) override;
     bool HoverBounds(const PreviewInfo &info, OrbRect &bounds) const override;
 
+    // The command surface: context menu, toolbar, keys and tips
+    // (PolyLineControlCommands.cpp; the commands run in PolyLineCommandRunner).
+    void AddToMenu(QMenu *menu, PreviewInfo *info, const TagList *tags) override;
+    bool HandleMenu(int32 id, PreviewInfo *info, const TagList *tags) override;
+    void GetAvailableEvents(std::vector<ToolbarEvent> &events, const TagList *tags) override;
+    bool HandleEvent(const OrbID &event, PreviewInfo *info, const TagList *tags) override;
+    bool ControlGetTip(PreviewInfo *info, char *buffer, const TagList *tags) override;
+    // One command of the menu, the toolbar or a key, with its argument;
+    // false where it did nothing (it then tells the user why).
+    bool RunCommand(int32 command, int32 arg, const TagList *tags);
+    const PolyLineSettings &Settings() const { return mSettings; }
+
     uint8 DrawMode() const { return mDrawMode; }
     uint8 ModeOf() const { return mDrawMode & 0x0F; }
     // Sets the low nibble, keeping the high one; mode 1 takes the append cursor.
@@ -124,9 +138,15 @@ protected:
     void BuildHandles(const PreviewInfo &info, HandleSet &handles) const override;
 
 private:
+    friend class PolyLineCommandRunner;
     friend class PolyLineEditor;
     friend class PolyLineMouse;
     static const LinkedInput<PolyLineControl> Links[];
+
+    uint64 KeyCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags);
+    void AddSurfaceState(ScriptVal &state) const;
+    bool RunWhole(PreviewInfo *info, int32 command, int32 arg, const TagList *tags);
+    void DrawExtras(Graphics::GPainter &p, const PolyLine &shape, const PolyLineStyle &style) const;
 
     void ReadFlags(const TagList &tags);
     void ReadDrawStyle(int64 style);
@@ -205,6 +225,9 @@ private:
     std::array<QCursor, 8> mCursors;
     const QCursor *mCurrentCursor = nullptr;
 
+    // --- the command surface ---
+    PolyLineSettings mSettings;
+    std::unique_ptr<QObject> mDialogs; // the parent of open dialogs: they go with the control
     // --- editing ---
     PolyLineEditor mEditor{*this};
     PolyLineMouse mMouse{*this};

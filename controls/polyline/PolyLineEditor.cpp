@@ -36,6 +36,8 @@ AutoRef<PolyLine> CloneOf(const PolyLine &shape)
 bool PolyLineEditor::Refuse(const char *why)
 {
     mMessage = why;
+    // The user hears of every refusal, whatever asked for the edit.
+    mControl.Tell(why);
     return false;
 }
 

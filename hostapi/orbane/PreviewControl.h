@@ -33,6 +33,11 @@ enum PreviewControlTag : Tag
     PCA_HideWhileDragging = 0x10048004, // the overlay is not drawn while its own drag runs
     PCA_GrabOffsetX = 0x2004800c,       // screen offset from the mouse to the handle at the press
     PCA_GrabOffsetY = 0x2004800d,
+    // HandleMenu and HandleEvent from a script: the value a dialog would ask
+    // for (a file path, a colour "#rrggbb", a number), as text; and that the
+    // command comes from a script, which no dialog may wait for.
+    PCA_CommandValue = 0x30010003,
+    PCA_FromScript = 0x10010004,
 };
 
 // Bits of PCA_EventFlags.
@@ -64,12 +69,20 @@ class PreviewControl : public Object, public InputWatcher
 public:
     // The viewer that shows the overlay redraws when asked through this.
     using RedrawHandler = std::function<void(PreviewControl *)>;
-    // An action the overlay offers on the viewer's toolbar.
+    // An action the overlay offers on the viewer's toolbar: a button with
+    // its short label and its tip. The id "ToolbarSeparator" is a separator;
+    // "ToolbarPopDown" is a button that drops down its `items`.
     struct ToolbarEvent
     {
         OrbID id;
         OrbString label;
+        OrbString tip;
+        std::vector<ToolbarEvent> items;
     };
+    static const OrbID ToolbarSeparator;
+    static const OrbID ToolbarPopDown;
+    // Shows the user a message of the overlay's (the viewer shows it).
+    using MessageHandler = std::function<void(PreviewControl *, const char *)>;
     // The size of ControlGetTip's buffer.
     static constexpr int32 TipSize = 256;
     // Coordinates that differ by no more than this are the same point: it
@@ -176,6 +189,12 @@ public:
     float64 DisplayOffsetY() const { return mDisplayOffsetY; }
     void SetDisplayOffset(float64 x, float64 y);
     void SetRedrawHandler(RedrawHandler handler) { mRedraw = std::move(handler); }
+    void SetMessageHandler(MessageHandler handler) { mTell = std::move(handler); }
+    // Tells the user why a command did nothing or what it is missing: the
+    // viewer shows it; without a viewer it goes to the log. The last one is
+    // kept for scripts (OverlayState's `message`).
+    void Tell(const char *message);
+    const OrbString &LastMessage() const { return mLastMessage; }
     // Asks the viewer for a redraw.
     void Redraw();
 
@@ -209,6 +228,8 @@ private:
     bool mUndoOpen = false;
     QPointer<OrbaneDoc> mUndoDoc;
     RedrawHandler mRedraw;
+    MessageHandler mTell;
+    OrbString mLastMessage;
 };
 
 } // namespace Orbane

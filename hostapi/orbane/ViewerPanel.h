@@ -136,6 +136,11 @@ public:
     void FillContextMenu(QMenu *menu);
     bool TriggerMenuAction(QAction *action);
     QToolBar *OverlayToolBar() const { return mToolBar; }
+    // The tags that menu choices and toolbar presses pass to the overlay
+    // (PCA_CommandValue, PCA_FromScript): a script sets them around a choice.
+    void SetCommandTags(const TagList &tags) { mCommandTags = tags; }
+    // The last message an overlay gave the user (PreviewControl::Tell).
+    const QString &LastMessage() const { return mLastMessage; }
     // The tip the overlays give at `widget`; empty where none.
     QString TipAt(QPointF widget);
     // How often the panel has painted itself.
@@ -145,6 +150,8 @@ signals:
     void toolShown(Orbane::Operator *tool);
     // The image's state changed: a read began, progressed or ended.
     void imageStateChanged();
+    // An overlay tells the user something (the window shows it).
+    void overlayMessage(const QString &message);
 
 protected:
     void paintEvent(QPaintEvent *event) override;
@@ -169,6 +176,8 @@ private:
     PreviewControl *CreateOverlay(Input *input, const char *classID);
     void Clear();
     void BuildToolBar();
+    void AddToolbarEvent(PreviewControl *overlay, const PreviewControl::ToolbarEvent &e);
+    void ToolbarAction(QAction *action, PreviewControl *overlay, const PreviewControl::ToolbarEvent &e);
     void SetMapping(const ViewMapping &mapping);
     void OnSizeKnown(QSize size);
     void OnImageReady(const QImage &display, const FloatImage &linear);
@@ -216,6 +225,8 @@ private:
 
     std::map<QAction *, PreviewControl *> mMenuOwners;
     QToolBar *mToolBar = nullptr;
+    TagList mCommandTags;
+    QString mLastMessage;
     bool mDirty = true;
     int32 mPaintCount = 0;
 };

@@ -14,6 +14,8 @@
 #include <cmath>
 #include <cstdio>
 
+#include <QtGlobal>
+
 namespace Orbane {
 
 const OrbID PreviewControl::ClassID("PreviewControl");
@@ -194,6 +196,8 @@ void PreviewControl::GetState(ScriptVal &state) const
 {
     state.SetKey(ScriptVal("highlight"), ScriptVal(mHighlighted));
     state.SetKey(ScriptVal("dragType"), ScriptVal(int64(mDragType)));
+    if (!mLastMessage.IsEmpty())
+        state.SetKey(ScriptVal("message"), ScriptVal(mLastMessage.c_str()));
 }
 
 void PreviewControl::GetName(char *buffer, int32 size, const TagList *) const
@@ -276,6 +280,18 @@ void PreviewControl::SetDisplayOffset(float64 x, float64 y)
     mDisplayOffsetX = x;
     mDisplayOffsetY = y;
     Redraw();
+}
+
+const OrbID PreviewControl::ToolbarSeparator("ToolbarSeparator");
+const OrbID PreviewControl::ToolbarPopDown("ToolbarPopDown");
+
+void PreviewControl::Tell(const char *message)
+{
+    mLastMessage = message;
+    if (mTell)
+        mTell(this, message);
+    else
+        qInfo("%s", message);
 }
 
 void PreviewControl::Redraw()

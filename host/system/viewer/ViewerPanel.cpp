@@ -19,12 +19,16 @@
 #include <QAccessible>
 #include <QAction>
 #include <QEventLoop>
+#include <QMenu>
 #include <QPainter>
 #include <QTimer>
 #include <QToolBar>
+#include <QToolButton>
 
 #include <algorithm>
 #include <cmath>
+#include <set>
+#include <string>
 
 namespace Orbane {
 
@@ -128,6 +132,10 @@ PreviewControl *ViewerPanel::CreateOverlay(Input *input, const char *classID)
         mHoverIndex->Touch(o);
         RequestRedraw();
     });
+    overlay->SetMessageHandler([this](PreviewControl *, const char *message) {
+        mLastMessage = QString::fromUtf8(message);
+        emit overlayMessage(mLastMessage);
+    });
     overlay->AddInput(input, &attrs);
     // Further Inputs the overlay edits (a rectangle's height), in the order named.
     for (const TagItem *item = attrs.Find(INPA_OverlayInput); item; item = attrs.FindNext(item))
@@ -154,6 +162,7 @@ void ViewerPanel::Clear()
     mInfo.HotControl = nullptr;
     for (PreviewControl *overlay : mOverlays) {
         overlay->SetRedrawHandler(nullptr);
+        overlay->SetMessageHandler(nullptr);
         const std::vector<Input *> inputs = overlay->Inputs();
         for (Input *in : inputs)
             overlay->RemoveInput(in, nullptr);
@@ -168,20 +177,58 @@ void ViewerPanel::Clear()
 void ViewerPanel::BuildToolBar()
 {
     mToolBar->clear();
+    // Overlays of one class offer the same buttons: the bar shows them once.
+    std::set<std::string> shown;
     for (PreviewControl *overlay : mOverlays) {
         std::vector<PreviewControl::ToolbarEvent> events;
         overlay->GetAvailableEvents(events, nullptr);
-        for (const PreviewControl::ToolbarEvent &e : events) {
-            QAction *action = mToolBar->addAction(QString::fromUtf8(e.label.c_str()));
-            const OrbID id = e.id;
-            connect(action, &QAction::triggered, this, [this, overlay, id]() {
-                if (IsOverlay(overlay))
-                    overlay->HandleEvent(id, &mInfo, nullptr);
-            });
-        }
+        if (events.empty() || !shown.insert(overlay->GetRegistry() ? overlay->GetRegistry()->Name() : "").second)
+            continue;
+        for (const PreviewControl::ToolbarEvent &e : events)
+            AddToolbarEvent(overlay, e);
     }
     mToolBar->adjustSize();
     mToolBar->setVisible(!mToolBar->actions().isEmpty());
+}
+
+// A button, a separator, or a pop-down whose menu holds its items. The
+// labels and tips of a button may change with what it does (a count in its
+// label), so the bar is built again after each press, once the press is over.
+void ViewerPanel::AddToolbarEvent(PreviewControl *overlay, const PreviewControl::ToolbarEvent &e)
+{
+    if (e.id == PreviewControl::ToolbarSeparator) {
+        mToolBar->addSeparator();
+        return;
+    }
+    QAction *action = mToolBar->addAction(QString::fromUtf8(e.label.c_str()));
+    action->setToolTip(QString::fromUtf8(e.tip.c_str()));
+    if (e.id == PreviewControl::ToolbarPopDown) {
+        auto *menu = new QMenu(mToolBar);
+        for (const PreviewControl::ToolbarEvent &item : e.items)
+            ToolbarAction(menu->addAction(QString::fromUtf8(item.label.c_str())), overlay, item);
+        action->setMenu(menu);
+        if (auto *button = qobject_cast<QToolButton *>(mToolBar->widgetForAction(action)))
+            button->setPopupMode(QToolButton::InstantPopup);
+        return;
+    }
+    ToolbarAction(action, overlay, e);
+}
+
+void ViewerPanel::ToolbarAction(QAction *action, PreviewControl *overlay, const PreviewControl::ToolbarEvent &e)
+{
+    action->setToolTip(QString::fromUtf8(e.tip.c_str()));
+    const OrbID id = e.id;
+    connect(action, &QAction::triggered, this, [this, overlay, id]() {
+        // A shared button acts on the overlay of its class that was pressed
+        // last, where there is one.
+        if (!IsOverlay(overlay))
+            return;
+        PreviewControl *target = overlay;
+        if (IsOverlay(mLastPressed) && mLastPressed->GetRegistry() == overlay->GetRegistry())
+            target = mLastPressed;
+        target->HandleEvent(id, &mInfo, &mCommandTags);
+        QTimer::singleShot(0, this, [this]() { BuildToolBar(); });
+    });
 }
 
 void ViewerPanel::OnToolRemoving(Operator *tool)

@@ -260,7 +260,14 @@ void ViewerPanel::FillContextMenu(QMenu *menu)
 {
     mMenuOwners.clear();
     SetMouse(mLastMouse);
-    for (PreviewControl *overlay : ByPriority()) {
+    // The overlay under the mouse offers its entries first, then the others
+    // from the topmost down.
+    std::vector<PreviewControl *> order = ByPriority();
+    if (PreviewControl *under = UnderMouse()) {
+        order.erase(std::remove(order.begin(), order.end(), under), order.end());
+        order.insert(order.begin(), under);
+    }
+    for (PreviewControl *overlay : order) {
         std::vector<QAction *> before;
         CollectActions(menu, before);
         overlay->AddToMenu(menu, &mInfo, nullptr);
@@ -277,7 +284,7 @@ bool ViewerPanel::TriggerMenuAction(QAction *action)
     const auto it = mMenuOwners.find(action);
     if (it == mMenuOwners.end() || !IsOverlay(it->second))
         return false;
-    return it->second->HandleMenu(action->data().toInt(), &mInfo, nullptr);
+    return it->second->HandleMenu(action->data().toInt(), &mInfo, &mCommandTags);
 }
 
 void ViewerPanel::contextMenuEvent(QContextMenuEvent *event)
