@@ -10,6 +10,7 @@
 #include "framework/CheckBoxTags.h"
 #include "framework/CheckListTags.h"
 #include "framework/ClipTags.h"
+#include "framework/ColorTags.h"
 #include "framework/ComboTags.h"
 #include "framework/ControlClasses.h"
 #include "framework/ControlRegistration.h"
@@ -88,7 +89,7 @@ ControlRegistration<CheckBoxControl> gCheckBox{
     D::Input("CheckBoxControl", CLSID_InputControl_Checkbox).Script("CheckboxControl").Tags<CheckBoxControlTags>()};
 ControlRegistration<CheckListControl> gCheckList{D::Input("CheckListControl").Tags<CheckListControlTags>()};
 ControlRegistration<ClipControl> gClip{D::Input("ClipControl").Tags<ClipControlTags>()};
-ControlRegistration<ColorControl> gColor{D::Input("ColorControl")};
+ControlRegistration<ColorControl> gColor{D::Input("ColorControl").Tags<ColorControlTags>()};
 ControlRegistration<ColorGamutControl> gColorGamut{D::Input("ColorGamutControl")};
 ControlRegistration<ColorRangesControl> gColorRanges{D::Input("ColorRangesControl")};
 ControlRegistration<ColorSuppressionControl> gColorSuppression{D::Input("ColorSuppressionControl")};

@@ -169,6 +169,28 @@ return {
         },
     },
 
+    -- The colour: the label, swatch, hex code and picker in a row; a slider
+    -- per channel (alpha only where the control has one); the second view.
+    ["Controls.Color.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 4,
+                label({ stretch = 1 }),
+                { name = "swatch", width = 48, height = 18 },
+                { name = "hex", width = 84 },
+                { name = "pick", width = 40 },
+            },
+            { name = "red", height = 18 },
+            { name = "green", height = 18 },
+            { name = "blue", height = 18 },
+            { name = "alpha", height = 18 },
+            { kind = "hbox", spacing = 4,
+                { name = "model", width = 44 },
+                { name = "space", stretch = 1 },
+            },
+            expression(),
+        },
+    },
+
     -- A text or a folding header, indented by its nest level; the
     -- separator's line and the spacer's gap are hidden unless the variant
     -- shows them.

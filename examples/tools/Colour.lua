@@ -1,0 +1,26 @@
+-- Colour controls. A colour is up to four Number Inputs: the control stands
+-- on red and names green, blue and alpha by their ids. Drag a channel's track,
+-- type a hex code (#RRGGBB, #RRGGBBAA, as the screen shows it) or three
+-- numbers of the second view (click "HSV" to go to HLS, then YUV), double
+-- click the swatch for the system colour dialog, or press "Pick" and click a
+-- pixel of the viewer (drag a box for its average). Values keep what the
+-- screen cannot show (above 1, below 0).
+return {
+  type = "Colour",
+  inputs = {
+    { id = "TintRed", name = "Tint", type = "Number", default = 1.0,
+      control = "ColorControl",
+      tags = { CLRCP_GreenInput = "TintGreen", CLRCP_BlueInput = "TintBlue",
+               CLRCP_AlphaInput = "TintAlpha", CLRC_ColorSpace = "HSV" } },
+    { id = "TintGreen", name = "Tint Green", type = "Number", default = 0.55 },
+    { id = "TintBlue", name = "Tint Blue", type = "Number", default = 0.2 },
+    { id = "TintAlpha", name = "Tint Alpha", type = "Number", default = 1.0 },
+    -- RGB only, sliders up to 4 for light above white, no picker.
+    { id = "GlowRed", name = "Glow", type = "Number", default = 2.0,
+      control = "ColorControl",
+      tags = { CLRCP_GreenInput = "GlowGreen", CLRCP_BlueInput = "GlowBlue",
+               CLRC_ColorSpace = "HLS", CLRC_ShowPicker = false, CLRCD_MaxScale = 4 } },
+    { id = "GlowGreen", name = "Glow Green", type = "Number", default = 1.5 },
+    { id = "GlowBlue", name = "Glow Blue", type = "Number", default = 0.5 },
+  },
+}

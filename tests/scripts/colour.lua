@@ -1,0 +1,46 @@
+-- The colour controls, driven as a person drives them and read back.
+local here = debug.getinfo(1, "S").source:match("^@(.*/)") or "./"
+orbane.LoadComp(here .. "../../examples/demo.lua")
+
+local function near(a, b) return math.abs(a - b) < 1e-4 end
+local T = "Colour1"
+
+-- Hex: one undo step for all four channels.
+local hex = { tool = T, input = "TintRed", child = "hex" }
+orbane.Key(hex, "A", "ctrl")
+orbane.Type(hex, "#0000FF80")
+orbane.Key(hex, "Return")
+assert(orbane.GetValue(T, "TintRed") == 0 and orbane.GetValue(T, "TintBlue") == 1)
+assert(near(orbane.GetValue(T, "TintAlpha"), 128 / 255))
+assert(#orbane.UndoNames() == 1 and orbane.UndoNames()[1] == "Change Tint")
+assert(orbane.State(hex).text == "#0000FF80")
+
+-- The second view: HLS after one click on "model".
+orbane.Click({ tool = T, input = "TintRed", child = "model" })
+assert(orbane.State({ tool = T, input = "TintRed", child = "model" }).text == "HLS")
+assert(orbane.State({ tool = T, input = "TintRed", child = "space" }).text == "240.0 0.500 1.000")
+
+-- A drag on the red track, Ctrl finer: one step.
+orbane.Drag({ tool = T, input = "TintRed", child = "red" }, { x = 10, y = 9 }, { x = 120, y = 9 })
+assert(orbane.GetValue(T, "TintRed") > 0.2)
+assert(#orbane.UndoNames() == 2)
+orbane.Undo()
+assert(orbane.GetValue(T, "TintRed") == 0)
+
+-- HDR values stay exact; the hex shows them clipped. No alpha on an RGB control.
+orbane.SetValue(T, "GlowRed", 3.25)
+assert(orbane.GetValue(T, "GlowRed") == 3.25)
+assert(orbane.State({ tool = T, input = "GlowRed", child = "hex" }).text == "#FFFFBC")
+assert(not orbane.State({ tool = T, input = "GlowRed", child = "alpha" }).visible)
+assert(not orbane.State({ tool = T, input = "GlowRed", child = "pick" }).visible)
+
+-- The picker samples the viewer's image in linear values.
+orbane.Click({ tool = T, input = "TintRed", child = "pick" })
+orbane.Click("viewer")
+local r, g, b = orbane.GetValue(T, "TintRed"), orbane.GetValue(T, "TintGreen"), orbane.GetValue(T, "TintBlue")
+assert(r >= 0 and r <= 1 and g >= 0 and b >= 0, "picked a colour of the image")
+assert(orbane.UndoNames()[#orbane.UndoNames()] == "Change Tint")
+assert(not orbane.State({ tool = T, input = "TintRed", child = "pick" }).check or
+       orbane.State({ tool = T, input = "TintRed", child = "pick" }).check == 0)
+orbane.Grab("inspector", os.getenv("TMPDIR") and (os.getenv("TMPDIR") .. "/colour.png") or "/tmp/colour.png")
+print("colour: ok")
