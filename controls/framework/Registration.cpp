@@ -11,6 +11,7 @@
 #include "framework/CheckListTags.h"
 #include "framework/ClipTags.h"
 #include "framework/ColorTags.h"
+#include "framework/ColorWheelTags.h"
 #include "framework/ComboTags.h"
 #include "framework/ControlClasses.h"
 #include "framework/ControlRegistration.h"
@@ -93,7 +94,7 @@ ControlRegistration<ColorControl> gColor{D::Input("ColorControl").Tags<ColorCont
 ControlRegistration<ColorGamutControl> gColorGamut{D::Input("ColorGamutControl")};
 ControlRegistration<ColorRangesControl> gColorRanges{D::Input("ColorRangesControl")};
 ControlRegistration<ColorSuppressionControl> gColorSuppression{D::Input("ColorSuppressionControl")};
-ControlRegistration<ColorWheelControl> gColorWheel{D::Input("ColorWheelControl")};
+ControlRegistration<ColorWheelControl> gColorWheel{D::Input("ColorWheelControl").Tags<ColorWheelControlTags>()};
 ControlRegistration<ComboControl> gCombo{ComboDesc()};
 VariantRegistration<ComboControl> gComboID{ComboDesc().Variant(CLSID_InputControl_ComboID, "ComboIDControl")};
 ControlRegistration<CropControl> gCrop{D::Preview("CropControl", CLSID_PreviewControl_Crop).NoScript().NoHook()};

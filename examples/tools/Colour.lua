@@ -22,5 +22,17 @@ return {
                CLRC_ColorSpace = "HLS", CLRC_ShowPicker = false, CLRCD_MaxScale = 4 } },
     { id = "GlowGreen", name = "Glow Green", type = "Number", default = 1.5 },
     { id = "GlowBlue", name = "Glow Blue", type = "Number", default = 0.5 },
+    -- Grading wheels: the puck is a Point (its angle the hue, its length the
+    -- saturation), the master a Number whose range follows the role. Drag
+    -- the puck (Ctrl finer, Shift along hue or saturation), double click to
+    -- centre it; Alt-click the master's track for its neutral value.
+    { id = "Lift", name = "Lift", type = "Point", default = { 0, 0 },
+      control = "ColorWheelControl",
+      tags = { CWCP_MasterInput = "LiftMaster", CWC_Role = "Lift" } },
+    { id = "LiftMaster", name = "Lift Master", type = "Number", default = 0 },
+    { id = "Gain", name = "Gain", type = "Point", default = { 0.1, 0.05 },
+      control = "ColorWheelControl",
+      tags = { CWCP_MasterInput = "GainMaster", CWC_Role = "Gain", CWCD_Rim = 0.5 } },
+    { id = "GainMaster", name = "Gain Master", type = "Number", default = 1 },
   },
 }

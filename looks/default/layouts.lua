@@ -191,6 +191,17 @@ return {
         },
     },
 
+    -- The grading wheel: the label over the disc, the master slider and
+    -- the readout under it.
+    ["Controls.ColorWheel.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            label(),
+            { name = "wheel", height = 120 },
+            { name = "master", height = 18 },
+            { name = "readout", height = 16 },
+        },
+    },
+
     -- A text or a folding header, indented by its nest level; the
     -- separator's line and the spacer's gap are hidden unless the variant
     -- shows them.

@@ -43,4 +43,16 @@ assert(orbane.UndoNames()[#orbane.UndoNames()] == "Change Tint")
 assert(not orbane.State({ tool = T, input = "TintRed", child = "pick" }).check or
        orbane.State({ tool = T, input = "TintRed", child = "pick" }).check == 0)
 orbane.Grab("inspector", os.getenv("TMPDIR") and (os.getenv("TMPDIR") .. "/colour.png") or "/tmp/colour.png")
+-- The lift wheel: a Shift drag round the centre keeps the saturation.
+local wheel = { tool = T, input = "Lift", child = "wheel" }
+orbane.SetValue(T, "Lift", { 0.5, 0 })
+local steps = #orbane.UndoNames()
+orbane.Drag(wheel, { x = 160, y = 60 }, { x = 160, y = 20 }, { mods = "shift" })
+local p = orbane.GetValue(T, "Lift")
+assert(near(math.sqrt(p[1] * p[1] + p[2] * p[2]), 0.5) and p[2] > 0.1, "hue turned, saturation kept")
+assert(#orbane.UndoNames() == steps + 1)
+orbane.DoubleClick(wheel)
+p = orbane.GetValue(T, "Lift")
+assert(p[1] == 0 and p[2] == 0 and orbane.UndoNames()[#orbane.UndoNames()] == "Reset Lift")
+assert(orbane.State({ tool = T, input = "Lift", child = "readout" }).text == "H 0.0  S 0.000  M 0.000")
 print("colour: ok")
