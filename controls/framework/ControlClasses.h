@@ -12,6 +12,7 @@
 #include "inputcontrols/ComboControl.h"
 #include "inputcontrols/FileControl.h"
 #include "inputcontrols/FontfileControl.h"
+#include "inputcontrols/GradientControl.h"
 #include "inputcontrols/LabelControl.h"
 #include "inputcontrols/ListControl.h"
 #include "inputcontrols/MultiButtonControl.h"
@@ -58,7 +59,6 @@ ORBANE_PENDING_INPUT(ColorRangesControl);
 ORBANE_PENDING_INPUT(ColorSuppressionControl);
 ORBANE_PENDING_INPUT(CustomFilterControl);
 ORBANE_PENDING_INPUT(GammaControl);
-ORBANE_PENDING_INPUT(GradientControl);
 ORBANE_PENDING_INPUT(HistogramControl);
 ORBANE_PENDING_INPUT(ImageControl);
 ORBANE_PENDING_INPUT(LevelsControl);

@@ -20,6 +20,7 @@
 #include "framework/FFICasts.h"
 #include "framework/FileTags.h"
 #include "framework/FontfileTags.h"
+#include "framework/GradientTags.h"
 #include "framework/ImgOverlayTags.h"
 #include "framework/LabelTags.h"
 #include "framework/ListTags.h"
@@ -108,7 +109,7 @@ ControlRegistration<FontfileControl> gFontfile{D::Input("FontfileControl", "Font
                                                    .Tags<FontfileControlTags>()
                                                    .Cleanup(&FontfileControl::RegCleanup)};
 ControlRegistration<GammaControl> gGamma{D::Input("GammaControl")};
-ControlRegistration<GradientControl> gGradient{D::Input("GradientControl")};
+ControlRegistration<GradientControl> gGradient{D::Input("GradientControl").Tags<GradientControlTags>()};
 ControlRegistration<HistogramControl> gHistogram{D::Input("HistogramControl")};
 ControlRegistration<ImageControl> gImage{D::Input("ImageControl")};
 ControlRegistration<ImgOverlayControl> gImgOverlay{D::Preview("ImgOverlayControl")

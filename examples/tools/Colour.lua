@@ -34,5 +34,11 @@ return {
       control = "ColorWheelControl",
       tags = { CWCP_MasterInput = "GainMaster", CWC_Role = "Gain", CWCD_Rim = 0.5 } },
     { id = "GainMaster", name = "Gain Master", type = "Number", default = 1 },
+    -- A gradient is a script table: click the bar to add a stop, drag a marker
+    -- to move it or off the bar to delete it, double click it for its colour.
+    { id = "Ramp", name = "Ramp", type = "ScriptVal", control = "GradientControl",
+      default = { interpolation = "smooth",
+                  stops = { { 0, 0.02, 0.02, 0.1, 1 }, { 0.45, 0.8, 0.25, 0.05, 1 }, { 1, 1, 0.95, 0.8, 1 } } },
+      tags = { GRDC_ShowAlpha = false, GRDC_MaxStops = 8 } },
   },
 }

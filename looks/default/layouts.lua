@@ -202,6 +202,20 @@ return {
         },
     },
 
+    -- The gradient: the label, interpolation and the selected stop's place
+    -- and colour in a row, the bar with its markers under them.
+    ["Controls.Gradient.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 4,
+                label({ stretch = 1 }),
+                { name = "interp", width = 72 },
+                { name = "position", width = 52 },
+                { name = "hex", width = 84 },
+            },
+            { name = "bar", height = 30 },
+        },
+    },
+
     -- A text or a folding header, indented by its nest level; the
     -- separator's line and the spacer's gap are hidden unless the variant
     -- shows them.

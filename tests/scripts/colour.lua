@@ -55,4 +55,14 @@ orbane.DoubleClick(wheel)
 p = orbane.GetValue(T, "Lift")
 assert(p[1] == 0 and p[2] == 0 and orbane.UndoNames()[#orbane.UndoNames()] == "Reset Lift")
 assert(orbane.State({ tool = T, input = "Lift", child = "readout" }).text == "H 0.0  S 0.000  M 0.000")
+-- The gradient: a click adds a stop, a drag off the bar deletes it.
+local bar = { tool = T, input = "Ramp", child = "bar" }
+local w = orbane.State(bar).width
+steps = #orbane.UndoNames()
+orbane.Click(bar, { x = math.floor(w * 0.75), y = 24 })
+assert(#orbane.GetValue(T, "Ramp").stops == 4 and #orbane.UndoNames() == steps + 1)
+orbane.Drag(bar, { x = math.floor(w * 0.75), y = 24 }, { x = math.floor(w * 0.75), y = 80 })
+assert(#orbane.GetValue(T, "Ramp").stops == 3 and #orbane.UndoNames() == steps + 2)
+orbane.SetValue(T, "Ramp", { stops = "broken" })
+assert(orbane.State(bar).visible)
 print("colour: ok")
