@@ -10,6 +10,7 @@
 #include "framework/CheckBoxTags.h"
 #include "framework/CheckListTags.h"
 #include "framework/ClipTags.h"
+#include "framework/ColorSuppressionTags.h"
 #include "framework/ColorTags.h"
 #include "framework/ColorWheelTags.h"
 #include "framework/ComboTags.h"
@@ -94,7 +95,8 @@ ControlRegistration<ClipControl> gClip{D::Input("ClipControl").Tags<ClipControlT
 ControlRegistration<ColorControl> gColor{D::Input("ColorControl").Tags<ColorControlTags>()};
 ControlRegistration<ColorGamutControl> gColorGamut{D::Input("ColorGamutControl")};
 ControlRegistration<ColorRangesControl> gColorRanges{D::Input("ColorRangesControl")};
-ControlRegistration<ColorSuppressionControl> gColorSuppression{D::Input("ColorSuppressionControl")};
+ControlRegistration<ColorSuppressionControl> gColorSuppression{
+    D::Input("ColorSuppressionControl").Tags<ColorSuppressionControlTags>()};
 ControlRegistration<ColorWheelControl> gColorWheel{D::Input("ColorWheelControl").Tags<ColorWheelControlTags>()};
 ControlRegistration<ComboControl> gCombo{ComboDesc()};
 VariantRegistration<ComboControl> gComboID{ComboDesc().Variant(CLSID_InputControl_ComboID, "ComboIDControl")};

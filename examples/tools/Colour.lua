@@ -40,5 +40,16 @@ return {
       default = { interpolation = "smooth",
                   stops = { { 0, 0.02, 0.02, 0.1, 1 }, { 0.45, 0.8, 0.25, 0.05, 1 }, { 1, 1, 0.95, 0.8, 1 } } },
       tags = { GRDC_ShowAlpha = false, GRDC_MaxStops = 8 } },
+    -- Suppression of six hues: press or drag along a spoke of the hexagon
+    -- (Ctrl finer), or type into the boxes.
+    { id = "SupRed", name = "Suppress", type = "Number", default = 0.2,
+      control = "ColorSuppressionControl",
+      tags = { CSCP_YellowInput = "SupYellow", CSCP_GreenInput = "SupGreen", CSCP_CyanInput = "SupCyan",
+               CSCP_BlueInput = "SupBlue", CSCP_MagentaInput = "SupMagenta", CSCD_Maximum = 1 } },
+    { id = "SupYellow", name = "Suppress Yellow", type = "Number", default = 0 },
+    { id = "SupGreen", name = "Suppress Green", type = "Number", default = 0.6 },
+    { id = "SupCyan", name = "Suppress Cyan", type = "Number", default = 0 },
+    { id = "SupBlue", name = "Suppress Blue", type = "Number", default = 0.3 },
+    { id = "SupMagenta", name = "Suppress Magenta", type = "Number", default = 0 },
   },
 }

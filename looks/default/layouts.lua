@@ -216,6 +216,26 @@ return {
         },
     },
 
+    -- Colour suppression: the hexagon of six hue spokes, the value boxes
+    -- in two columns beside it.
+    ["Controls.ColorSuppression.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            label(),
+            { kind = "hbox", spacing = 6,
+                { name = "hexagon", width = 120, height = 120 },
+                { kind = "grid", hspacing = 4, vspacing = 2,
+                    { name = "red", row = 1, col = 1 },
+                    { name = "yellow", row = 2, col = 1 },
+                    { name = "green", row = 3, col = 1 },
+                    { name = "cyan", row = 1, col = 2 },
+                    { name = "blue", row = 2, col = 2 },
+                    { name = "magenta", row = 3, col = 2 },
+                },
+            },
+            expression(),
+        },
+    },
+
     -- A text or a folding header, indented by its nest level; the
     -- separator's line and the spacer's gap are hidden unless the variant
     -- shows them.

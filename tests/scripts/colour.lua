@@ -65,4 +65,10 @@ orbane.Drag(bar, { x = math.floor(w * 0.75), y = 24 }, { x = math.floor(w * 0.75
 assert(#orbane.GetValue(T, "Ramp").stops == 3 and #orbane.UndoNames() == steps + 2)
 orbane.SetValue(T, "Ramp", { stops = "broken" })
 assert(orbane.State(bar).visible)
+-- Suppression: a press on the right half of the red spoke.
+local hex6 = { tool = T, input = "SupRed", child = "hexagon" }
+local st = orbane.State(hex6)
+orbane.Click(hex6, { x = math.floor(st.width / 2 + (st.width / 2 - 8) * 0.5), y = math.floor(st.height / 2) })
+assert(math.abs(orbane.GetValue(T, "SupRed") - 0.5) < 0.03, orbane.GetValue(T, "SupRed"))
+assert(orbane.GetValue(T, "SupGreen") == 0.6)
 print("colour: ok")
