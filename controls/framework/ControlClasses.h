@@ -8,6 +8,7 @@
 #include "inputcontrols/CheckListControl.h"
 #include "inputcontrols/ClipControl.h"
 #include "inputcontrols/ColorControl.h"
+#include "inputcontrols/ColorGamutControl.h"
 #include "inputcontrols/ColorSuppressionControl.h"
 #include "inputcontrols/ColorWheelControl.h"
 #include "inputcontrols/ComboControl.h"
@@ -55,7 +56,6 @@
 namespace Orbane {
 
 ORBANE_PENDING_DERIVED(CameraControl, TransformControl);
-ORBANE_PENDING_INPUT(ColorGamutControl);
 ORBANE_PENDING_INPUT(ColorRangesControl);
 ORBANE_PENDING_INPUT(CustomFilterControl);
 ORBANE_PENDING_INPUT(GammaControl);

@@ -51,5 +51,9 @@ return {
     { id = "SupCyan", name = "Suppress Cyan", type = "Number", default = 0 },
     { id = "SupBlue", name = "Suppress Blue", type = "Number", default = 0.3 },
     { id = "SupMagenta", name = "Suppress Magenta", type = "Number", default = 0 },
+    -- A working space's gamut on the CIE 1931 xy diagram: choose a space, or
+    -- drag a primary or the white point for a custom one.
+    { id = "Gamut", name = "Gamut", type = "ScriptVal", control = "ColorGamutControl",
+      default = { space = "Rec. 2020" } },
   },
 }

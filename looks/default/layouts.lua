@@ -236,6 +236,19 @@ return {
         },
     },
 
+    -- The gamut: the label and the list of spaces, the xy diagram, the
+    -- points as numbers.
+    ["Controls.ColorGamut.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 4,
+                label({ stretch = 1 }),
+                { name = "space", width = 110 },
+            },
+            { name = "diagram", height = 220 },
+            { name = "readout", height = 16 },
+        },
+    },
+
     -- A text or a folding header, indented by its nest level; the
     -- separator's line and the spacer's gap are hidden unless the variant
     -- shows them.

@@ -71,4 +71,12 @@ local st = orbane.State(hex6)
 orbane.Click(hex6, { x = math.floor(st.width / 2 + (st.width / 2 - 8) * 0.5), y = math.floor(st.height / 2) })
 assert(math.abs(orbane.GetValue(T, "SupRed") - 0.5) < 0.03, orbane.GetValue(T, "SupRed"))
 assert(orbane.GetValue(T, "SupGreen") == 0.6)
+-- The gamut: Rec. 2020 by name; the list chooses another space.
+local gamut = orbane.GetValue(T, "Gamut")
+assert(gamut.space == "Rec. 2020")
+local space = { tool = T, input = "Gamut", child = "space" }
+orbane.Key(space, "Home")
+assert(orbane.GetValue(T, "Gamut").space == "Rec. 709" and orbane.GetValue(T, "Gamut").red[1] == 0.64)
+assert(orbane.State({ tool = T, input = "Gamut", child = "readout" }).text:find("R 0.6400 0.3300", 1, true))
+orbane.Grab("inspector", "/tmp/colour.png")
 print("colour: ok")
