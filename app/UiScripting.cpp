@@ -228,6 +228,15 @@ int Click(lua_State *L)
     return 0;
 }
 
+// A double click as Qt delivers it: press, release, double-click, release.
+int DoubleClick(lua_State *L)
+{
+    QWidget *w = TargetOrRaise(L, 1);
+    const UiGesture g = UiGesture::Read(LuaArgs(L, "DoubleClick"), 2);
+    QTest::mouseDClick(w, g.button, g.mods, g.At(w));
+    return 0;
+}
+
 // Drag(target, {x =, y =}, {x =, y =}, {mods =, steps =}): press, moves in
 // steps, release; one gesture.
 int Drag(lua_State *L)
@@ -367,6 +376,7 @@ void UiScripting::Install(OrbaneDoc *doc, MainWindow *window)
     };
     for (const auto &[name, fn] : functions)
         LuaRuntime::Instance().AddModuleFunction(name, fn);
+    LuaRuntime::Instance().AddModuleFunction("DoubleClick", DoubleClick);
     // What content (a button script) may do: read and write the document,
     // each write an undo step like any other.
     for (const char *name : {"Tools", "GetValue", "SetValue", "GetTime", "SetTime", "UndoNames", "RedoNames"})

@@ -7,9 +7,14 @@
 #include "inputcontrols/CheckBoxControl.h"
 #include "inputcontrols/CheckListControl.h"
 #include "inputcontrols/ClipControl.h"
+#include "inputcontrols/ColorControl.h"
+#include "inputcontrols/ColorGamutControl.h"
+#include "inputcontrols/ColorSuppressionControl.h"
+#include "inputcontrols/ColorWheelControl.h"
 #include "inputcontrols/ComboControl.h"
 #include "inputcontrols/FileControl.h"
 #include "inputcontrols/FontfileControl.h"
+#include "inputcontrols/GradientControl.h"
 #include "inputcontrols/LabelControl.h"
 #include "inputcontrols/ListControl.h"
 #include "inputcontrols/MultiButtonControl.h"
@@ -51,14 +56,9 @@
 namespace Orbane {
 
 ORBANE_PENDING_DERIVED(CameraControl, TransformControl);
-ORBANE_PENDING_INPUT(ColorControl);
-ORBANE_PENDING_INPUT(ColorGamutControl);
 ORBANE_PENDING_INPUT(ColorRangesControl);
-ORBANE_PENDING_INPUT(ColorSuppressionControl);
-ORBANE_PENDING_INPUT(ColorWheelControl);
 ORBANE_PENDING_INPUT(CustomFilterControl);
 ORBANE_PENDING_INPUT(GammaControl);
-ORBANE_PENDING_INPUT(GradientControl);
 ORBANE_PENDING_INPUT(HistogramControl);
 ORBANE_PENDING_INPUT(ImageControl);
 ORBANE_PENDING_INPUT(LevelsControl);

@@ -10,6 +10,9 @@
 #include "framework/CheckBoxTags.h"
 #include "framework/CheckListTags.h"
 #include "framework/ClipTags.h"
+#include "framework/ColorSuppressionTags.h"
+#include "framework/ColorTags.h"
+#include "framework/ColorWheelTags.h"
 #include "framework/ComboTags.h"
 #include "framework/ControlClasses.h"
 #include "framework/ControlRegistration.h"
@@ -18,6 +21,7 @@
 #include "framework/FFICasts.h"
 #include "framework/FileTags.h"
 #include "framework/FontfileTags.h"
+#include "framework/GradientTags.h"
 #include "framework/ImgOverlayTags.h"
 #include "framework/LabelTags.h"
 #include "framework/ListTags.h"
@@ -88,11 +92,12 @@ ControlRegistration<CheckBoxControl> gCheckBox{
     D::Input("CheckBoxControl", CLSID_InputControl_Checkbox).Script("CheckboxControl").Tags<CheckBoxControlTags>()};
 ControlRegistration<CheckListControl> gCheckList{D::Input("CheckListControl").Tags<CheckListControlTags>()};
 ControlRegistration<ClipControl> gClip{D::Input("ClipControl").Tags<ClipControlTags>()};
-ControlRegistration<ColorControl> gColor{D::Input("ColorControl")};
+ControlRegistration<ColorControl> gColor{D::Input("ColorControl").Tags<ColorControlTags>()};
 ControlRegistration<ColorGamutControl> gColorGamut{D::Input("ColorGamutControl")};
 ControlRegistration<ColorRangesControl> gColorRanges{D::Input("ColorRangesControl")};
-ControlRegistration<ColorSuppressionControl> gColorSuppression{D::Input("ColorSuppressionControl")};
-ControlRegistration<ColorWheelControl> gColorWheel{D::Input("ColorWheelControl")};
+ControlRegistration<ColorSuppressionControl> gColorSuppression{
+    D::Input("ColorSuppressionControl").Tags<ColorSuppressionControlTags>()};
+ControlRegistration<ColorWheelControl> gColorWheel{D::Input("ColorWheelControl").Tags<ColorWheelControlTags>()};
 ControlRegistration<ComboControl> gCombo{ComboDesc()};
 VariantRegistration<ComboControl> gComboID{ComboDesc().Variant(CLSID_InputControl_ComboID, "ComboIDControl")};
 ControlRegistration<CropControl> gCrop{D::Preview("CropControl", CLSID_PreviewControl_Crop).NoScript().NoHook()};
@@ -106,7 +111,7 @@ ControlRegistration<FontfileControl> gFontfile{D::Input("FontfileControl", "Font
                                                    .Tags<FontfileControlTags>()
                                                    .Cleanup(&FontfileControl::RegCleanup)};
 ControlRegistration<GammaControl> gGamma{D::Input("GammaControl")};
-ControlRegistration<GradientControl> gGradient{D::Input("GradientControl")};
+ControlRegistration<GradientControl> gGradient{D::Input("GradientControl").Tags<GradientControlTags>()};
 ControlRegistration<HistogramControl> gHistogram{D::Input("HistogramControl")};
 ControlRegistration<ImageControl> gImage{D::Input("ImageControl")};
 ControlRegistration<ImgOverlayControl> gImgOverlay{D::Preview("ImgOverlayControl")

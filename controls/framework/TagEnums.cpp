@@ -3,13 +3,8 @@
 namespace Orbane {
 
 const EnumEntry AlignEnum[] = {
-    {ENUM_NameRow, "Align"},
-    {0, "Left"},
-    {1, "CenteredLeft"},
-    {2, "Center"},
-    {3, "CenteredRight"},
-    {4, "Right"},
-    {0, nullptr},
+    {ENUM_NameRow, "Align"}, {0, "Left"},  {1, "CenteredLeft"}, {2, "Center"},
+    {3, "CenteredRight"},    {4, "Right"}, {0, nullptr},
 };
 
 const EnumEntry LabelPositionEnum[] = {
@@ -17,6 +12,10 @@ const EnumEntry LabelPositionEnum[] = {
     {0, "Horizontal"},
     {1, "Vertical"},
     {0, nullptr},
+};
+
+const EnumEntry ColorSpaceEnum[] = {
+    {ENUM_NameRow, "ColorSpace"}, {0, "HSV"}, {1, "HLS"}, {2, "YUV"}, {0, nullptr},
 };
 
 } // namespace Orbane

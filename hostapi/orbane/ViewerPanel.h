@@ -11,6 +11,8 @@
 #include <QPointer>
 #include <QWidget>
 
+#include <array>
+
 #include <map>
 #include <memory>
 #include <set>
@@ -90,6 +92,12 @@ public:
     void SetImage(const QImage &image);
     bool HasImage() const;
     QSize ImageSize() const;
+    // The average of the image's pixels within `pixels` (the image's own
+    // grid, row 0 at the top; clipped to the image) as linear RGBA: 8-bit
+    // channels are decoded from sRGB, alpha is taken as it is. False, with
+    // `rgba` untouched, where no image pixel lies inside. What colour
+    // pickers sample, whatever the image's storage.
+    bool SampleLinear(const QRect &pixels, std::array<float64, 4> &rgba) const;
     // The width of one image pixel over its height; the view refits. Not
     // positive or not a number: 1.
     void SetPixelAspect(float64 aspect);

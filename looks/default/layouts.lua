@@ -169,6 +169,86 @@ return {
         },
     },
 
+    -- The colour: the label, swatch, hex code and picker in a row; a slider
+    -- per channel (alpha only where the control has one); the second view.
+    ["Controls.Color.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 4,
+                label({ stretch = 1 }),
+                { name = "swatch", width = 48, height = 18 },
+                { name = "hex", width = 84 },
+                { name = "pick", width = 40 },
+            },
+            { name = "red", height = 18 },
+            { name = "green", height = 18 },
+            { name = "blue", height = 18 },
+            { name = "alpha", height = 18 },
+            { kind = "hbox", spacing = 4,
+                { name = "model", width = 44 },
+                { name = "space", stretch = 1 },
+            },
+            expression(),
+        },
+    },
+
+    -- The grading wheel: the label over the disc, the master slider and
+    -- the readout under it.
+    ["Controls.ColorWheel.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            label(),
+            { name = "wheel", height = 120 },
+            { name = "master", height = 18 },
+            { name = "readout", height = 16 },
+        },
+    },
+
+    -- The gradient: the label, interpolation and the selected stop's place
+    -- and colour in a row, the bar with its markers under them.
+    ["Controls.Gradient.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 4,
+                label({ stretch = 1 }),
+                { name = "interp", width = 72 },
+                { name = "position", width = 52 },
+                { name = "hex", width = 84 },
+            },
+            { name = "bar", height = 30 },
+        },
+    },
+
+    -- Colour suppression: the hexagon of six hue spokes, the value boxes
+    -- in two columns beside it.
+    ["Controls.ColorSuppression.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            label(),
+            { kind = "hbox", spacing = 6,
+                { name = "hexagon", width = 120, height = 120 },
+                { kind = "grid", hspacing = 4, vspacing = 2,
+                    { name = "red", row = 1, col = 1 },
+                    { name = "yellow", row = 2, col = 1 },
+                    { name = "green", row = 3, col = 1 },
+                    { name = "cyan", row = 1, col = 2 },
+                    { name = "blue", row = 2, col = 2 },
+                    { name = "magenta", row = 3, col = 2 },
+                },
+            },
+            expression(),
+        },
+    },
+
+    -- The gamut: the label and the list of spaces, the xy diagram, the
+    -- points as numbers.
+    ["Controls.ColorGamut.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 4,
+                label({ stretch = 1 }),
+                { name = "space", width = 110 },
+            },
+            { name = "diagram", height = 220 },
+            { name = "readout", height = 16 },
+        },
+    },
+
     -- A text or a folding header, indented by its nest level; the
     -- separator's line and the spacer's gap are hidden unless the variant
     -- shows them.

@@ -263,7 +263,7 @@ TEST(TagMaps, PublishedMapsAreWellFormed)
                      reg->Kind() == REGKIND_InputControl ? "InputControl.Create" : "PreviewControl.Create");
         ExpectRowsWellFormed(map->Table());
     }
-    const std::map<std::string, int> published = {
+    std::map<std::string, int> published = {
         {"AngleControl", 16},         {"ButtonControl", 2}, {"CheckboxControl", 1},   {"CheckListControl", 7},
         {"ClipControl", 3},           {"ComboControl", 5},  {"ComboIDControl", 5},    {"CrosshairControl", 7},
         {"EllipseControl", 53},       {"FileControl", 4},   {"FontFileControl", 3},   {"ImageOverlayControl", 32},
@@ -271,6 +271,9 @@ TEST(TagMaps, PublishedMapsAreWellFormed)
         {"MultiButtonIDControl", 33}, {"OffsetControl", 2}, {"PointControl", 4},      {"PolylineControl", 56},
         {"PositionerControl", 16},    {"RangeControl", 14}, {"RectangleControl", 35}, {"ScriptValListControl", 4},
         {"ScrewControl", 1},          {"SliderControl", 4}, {"TransformControl", 10}, {"XYOffsetControl", 1}};
+    // The colour controls.
+    published.insert({{"ColorControl", 6}, {"ColorWheelControl", 3}, {"GradientControl", 2}});
+    published.insert({{"ColorSuppressionControl", 7}});
     EXPECT_EQ(counts, published);
     const auto table = [](const char *type) { return FFITagMap::ForType(FFIType::FindScriptName(type))->Table(); };
     EXPECT_EQ(table("ComboIDControl"), table("ComboControl")) << "variants share their primary's table";
