@@ -14,5 +14,6 @@ return {
     { file = "tools/Roto.lua", name = "Roto1" },
     { file = "tools/Layers.lua", name = "Layers1" },
     { file = "tools/Framing.lua", name = "Framing1" },
+    { file = "tools/Grading.lua", name = "Grading1" },
   },
 }

@@ -18,6 +18,7 @@
 #include "inputcontrols/ScrewControl.h"
 #include "inputcontrols/ScriptValListControl.h"
 #include "inputcontrols/SliderControl.h"
+#include "inputcontrols/SplineControl.h"
 #include "overlays/AngleControl.h"
 #include "overlays/CropControl.h"
 #include "overlays/CrosshairControl.h"
@@ -68,7 +69,6 @@ ORBANE_PENDING_INPUT(LogControl);
 ORBANE_PENDING_PREVIEW(MeshControl);
 ORBANE_PENDING_PREVIEW(ObloidControl);
 ORBANE_PENDING_INPUT(PatternControl);
-ORBANE_PENDING_INPUT(SplineControl);
 ORBANE_PENDING_PREVIEW(TrackerControl);
 
 } // namespace Orbane

@@ -29,6 +29,7 @@
 #include "framework/RectangleTags.h"
 #include "framework/ScrewTags.h"
 #include "framework/SliderTags.h"
+#include "framework/SplineTags.h"
 #include "framework/TransformTags.h"
 #include "framework/VariantRegistration.h"
 #include "framework/XYOffsetTags.h"
@@ -148,6 +149,7 @@ ControlRegistration<SliderOverlay, OverlayControl> gSliderOverlay{D::Preview("Sl
                                                                       .Flag(REG_PreviewFlag64)
                                                                       .Flag(REG_ClassFamily, kOverlayFamily)};
 ControlRegistration<SplineControl> gSpline{D::Input("SplineControl")
+                                               .Tags<SplineControlTags>()
                                                .Cleanup(&SplineControl::RegCleanup)
                                                .Flag(REG_SplineFlag)
                                                .Flag(REG_DisplayName, "Spline Control")

@@ -1,4 +1,5 @@
 #include "orbane/ViewerPanel.h"
+#include "orbane/ViewedImage.h"
 
 #include "HoverIndex.h"
 #include "QtGPainter.h"
@@ -185,6 +186,7 @@ bool ViewerPanel::LoadImage(const QString &path)
 void ViewerPanel::SetImage(const QImage &image)
 {
     mBackdrop->SetImage(image);
+    ViewedImage::Instance().Set(image);
     mUserView = false;
     FitImage();
     SendAll(CCMD_ImageChanged, 0);
