@@ -10,7 +10,10 @@
 #include "inputcontrols/ComboControl.h"
 #include "inputcontrols/FileControl.h"
 #include "inputcontrols/FontfileControl.h"
+#include "inputcontrols/HistogramControl.h"
 #include "inputcontrols/LabelControl.h"
+#include "inputcontrols/LevelsControl.h"
+#include "inputcontrols/LevelsOutputControl.h"
 #include "inputcontrols/ListControl.h"
 #include "inputcontrols/MultiButtonControl.h"
 #include "inputcontrols/OffsetControl.h"
@@ -60,10 +63,7 @@ ORBANE_PENDING_INPUT(ColorWheelControl);
 ORBANE_PENDING_INPUT(CustomFilterControl);
 ORBANE_PENDING_INPUT(GammaControl);
 ORBANE_PENDING_INPUT(GradientControl);
-ORBANE_PENDING_INPUT(HistogramControl);
 ORBANE_PENDING_INPUT(ImageControl);
-ORBANE_PENDING_INPUT(LevelsControl);
-ORBANE_PENDING_INPUT(LevelsOutputControl);
 ORBANE_PENDING_DERIVED(LightControl, TransformControl);
 ORBANE_PENDING_INPUT(LogControl);
 ORBANE_PENDING_PREVIEW(MeshControl);

@@ -30,6 +30,7 @@
 #include "framework/ScrewTags.h"
 #include "framework/SliderTags.h"
 #include "framework/SplineTags.h"
+#include "framework/LevelsTags.h"
 #include "framework/TransformTags.h"
 #include "framework/VariantRegistration.h"
 #include "framework/XYOffsetTags.h"
@@ -118,8 +119,9 @@ ControlRegistration<LabelControl> gLabel{LabelDesc()};
 VariantRegistration<LabelControl> gLabelNest{LabelDesc().Variant(CLSID_InputControl_Nest)};
 VariantRegistration<LabelControl> gLabelSeparator{LabelDesc().Variant(CLSID_InputControl_Separator)};
 VariantRegistration<LabelControl> gLabelSpacer{LabelDesc().Variant(CLSID_InputControl_Spacer)};
-ControlRegistration<LevelsControl> gLevels{D::Input("LevelsControl")};
-ControlRegistration<LevelsOutputControl> gLevelsOutput{D::Input("LevelsOutputControl")};
+ControlRegistration<LevelsControl> gLevels{D::Input("LevelsControl").Tags<LevelsControlTags>()};
+ControlRegistration<LevelsOutputControl> gLevelsOutput{
+    D::Input("LevelsOutputControl").Tags<LevelsOutputControlTags>()};
 ControlRegistration<LightControl, TransformControl> gLight{
     D::Preview("LightControl").Base(TransformControlID(), "TransformControl").Flag(REG_PreviewFlag65)};
 ControlRegistration<ListControl> gList{ListDesc()};

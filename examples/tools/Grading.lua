@@ -6,6 +6,11 @@
 -- point, drag to move it (Ctrl finer, Shift on the grid), double-click or
 -- Delete to remove it; the wheel zooms, a middle drag pans, Home resets the
 -- view. The buttons choose the curve.
+--
+-- Levels: the input black, gamma and white over the viewed image's
+-- histogram (choose its channel and scale); drag a handle (Ctrl finer),
+-- double-click it for its default, or type. Output levels map into black
+-- and white over a ramp. The histogram's Input holds the channel shown.
 return {
   type = "Grading",
   inputs = {
@@ -17,5 +22,16 @@ return {
         luma = { { 0, 0 }, { 0.25, 0.2 }, { 0.75, 0.82 }, { 1, 1 } },
         red = { { 0, 0.02 }, { 1, 1 } },
       } },
+    { id = "InBlack", name = "Input Levels", type = "Number", default = 0.02,
+      control = "LevelsControl",
+      tags = { LVLCP_GammaInput = "InGamma", LVLCP_WhiteInput = "InWhite", LVLC_LogScale = true } },
+    { id = "InGamma", name = "Gamma", type = "Number", default = 1.2 },
+    { id = "InWhite", name = "White", type = "Number", default = 0.95 },
+    { id = "OutBlack", name = "Output Levels", type = "Number", default = 0.05,
+      control = "LevelsOutputControl",
+      tags = { LVLOCP_WhiteInput = "OutWhite", LVLOC_GradientColor = { R = 1, G = 0.85, B = 0.6, A = 1 } } },
+    { id = "OutWhite", name = "Output White", type = "Number", default = 1 },
+    { id = "Channel", name = "Histogram", type = "Number", default = 0,
+      control = "HistogramControl" },
   },
 }
