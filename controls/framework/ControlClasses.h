@@ -10,11 +10,13 @@
 #include "inputcontrols/ComboControl.h"
 #include "inputcontrols/FileControl.h"
 #include "inputcontrols/FontfileControl.h"
+#include "inputcontrols/GammaControl.h"
 #include "inputcontrols/HistogramControl.h"
 #include "inputcontrols/LabelControl.h"
 #include "inputcontrols/LevelsControl.h"
 #include "inputcontrols/LevelsOutputControl.h"
 #include "inputcontrols/ListControl.h"
+#include "inputcontrols/LogControl.h"
 #include "inputcontrols/MultiButtonControl.h"
 #include "inputcontrols/OffsetControl.h"
 #include "inputcontrols/RangeControl.h"
@@ -61,11 +63,9 @@ ORBANE_PENDING_INPUT(ColorRangesControl);
 ORBANE_PENDING_INPUT(ColorSuppressionControl);
 ORBANE_PENDING_INPUT(ColorWheelControl);
 ORBANE_PENDING_INPUT(CustomFilterControl);
-ORBANE_PENDING_INPUT(GammaControl);
 ORBANE_PENDING_INPUT(GradientControl);
 ORBANE_PENDING_INPUT(ImageControl);
 ORBANE_PENDING_DERIVED(LightControl, TransformControl);
-ORBANE_PENDING_INPUT(LogControl);
 ORBANE_PENDING_PREVIEW(MeshControl);
 ORBANE_PENDING_PREVIEW(ObloidControl);
 ORBANE_PENDING_INPUT(PatternControl);

@@ -221,6 +221,14 @@ void CurveGraph::PaintPlot(QPainter &painter, const Plot &plot)
 // it smooth; beyond its points it runs flat to the edges.
 void CurveGraph::PaintLine(QPainter &painter, const Line &line, bool active)
 {
+    if (line.flags & Line_PointsOnly) {
+        painter.setPen(QPen(line.colour, 1.6));
+        for (const CurvePoint &p : line.curve.Points()) {
+            painter.setBrush(active && mDragging ? QBrush(line.colour) : QBrush(kGraphBackground));
+            painter.drawEllipse(ToPixel(p, mView, size()), kPointRadius, kPointRadius);
+        }
+        return;
+    }
     const int32 from = kMargin, to = width() - kMargin;
     QPolygonF poly;
     poly.reserve(to - from + 1);

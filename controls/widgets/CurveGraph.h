@@ -30,10 +30,11 @@ class CurveGraph : public CustomControl
 public:
     enum LineFlag : uint32
     {
-        Line_Fixed = 1,    // no point added or removed
-        Line_LockX = 2,    // points move up and down only
-        Line_LockY = 4,    // points move sideways only
-        Line_LockEnds = 8, // the first and last points move up and down only
+        Line_Fixed = 1,       // no point added or removed
+        Line_LockX = 2,       // points move up and down only
+        Line_LockY = 4,       // points move sideways only
+        Line_LockEnds = 8,    // the first and last points move up and down only
+        Line_PointsOnly = 16, // handles on a plot: the points without the curve
     };
     struct Line
     {

@@ -11,6 +11,10 @@
 -- histogram (choose its channel and scale); drag a handle (Ctrl finer),
 -- double-click it for its default, or type. Output levels map into black
 -- and white over a ramp. The histogram's Input holds the channel shown.
+--
+-- Gamma: type it or drag the handle over 0.5 up and down. Log: the
+-- conversion of 10-bit log code values to linear, a table of black and white
+-- code values, film gamma and soft clip, drawn as a curve.
 return {
   type = "Grading",
   inputs = {
@@ -33,5 +37,10 @@ return {
     { id = "OutWhite", name = "Output White", type = "Number", default = 1 },
     { id = "Channel", name = "Histogram", type = "Number", default = 0,
       control = "HistogramControl" },
+    { id = "Gamma", name = "Gamma", type = "Number", default = 2.2,
+      control = "GammaControl" },
+    { id = "Log", name = "Log to Linear", type = "ScriptVal",
+      control = "LogControl",
+      default = { black = 95, white = 685, filmGamma = 0.6, softClip = 0.2 } },
   },
 }
