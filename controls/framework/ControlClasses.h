@@ -7,6 +7,7 @@
 #include "inputcontrols/CheckBoxControl.h"
 #include "inputcontrols/CheckListControl.h"
 #include "inputcontrols/ClipControl.h"
+#include "inputcontrols/ColorRangesControl.h"
 #include "inputcontrols/ComboControl.h"
 #include "inputcontrols/FileControl.h"
 #include "inputcontrols/FontfileControl.h"
@@ -59,7 +60,6 @@ namespace Orbane {
 ORBANE_PENDING_DERIVED(CameraControl, TransformControl);
 ORBANE_PENDING_INPUT(ColorControl);
 ORBANE_PENDING_INPUT(ColorGamutControl);
-ORBANE_PENDING_INPUT(ColorRangesControl);
 ORBANE_PENDING_INPUT(ColorSuppressionControl);
 ORBANE_PENDING_INPUT(ColorWheelControl);
 ORBANE_PENDING_INPUT(CustomFilterControl);

@@ -31,6 +31,7 @@
 #include "framework/SliderTags.h"
 #include "framework/SplineTags.h"
 #include "framework/LevelsTags.h"
+#include "framework/ColorRangesTags.h"
 #include "framework/TransformTags.h"
 #include "framework/VariantRegistration.h"
 #include "framework/XYOffsetTags.h"
@@ -92,7 +93,7 @@ ControlRegistration<CheckListControl> gCheckList{D::Input("CheckListControl").Ta
 ControlRegistration<ClipControl> gClip{D::Input("ClipControl").Tags<ClipControlTags>()};
 ControlRegistration<ColorControl> gColor{D::Input("ColorControl")};
 ControlRegistration<ColorGamutControl> gColorGamut{D::Input("ColorGamutControl")};
-ControlRegistration<ColorRangesControl> gColorRanges{D::Input("ColorRangesControl")};
+ControlRegistration<ColorRangesControl> gColorRanges{D::Input("ColorRangesControl").Tags<ColorRangesControlTags>()};
 ControlRegistration<ColorSuppressionControl> gColorSuppression{D::Input("ColorSuppressionControl")};
 ControlRegistration<ColorWheelControl> gColorWheel{D::Input("ColorWheelControl")};
 ControlRegistration<ComboControl> gCombo{ComboDesc()};

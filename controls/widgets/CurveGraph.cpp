@@ -279,6 +279,21 @@ int32 CurveGraph::PointAt(QPointF pixel) const
     return mLines[std::size_t(mActive)].curve.Nearest(ToValue(pixel, mView, size()), sx, sy, kPickTolerance);
 }
 
+// The active line keeps a press on its own point; else the first line
+// with a point there takes it.
+void CurveGraph::PickAnyLine(QPointF pixel)
+{
+    if (PointAt(pixel) >= 0)
+        return;
+    const int32 was = mActive;
+    for (int32 i = 0; i < int32(mLines.size()); ++i) {
+        mActive = i;
+        if (mLines[std::size_t(i)].visible && PointAt(pixel) >= 0)
+            return;
+    }
+    mActive = was;
+}
+
 void CurveGraph::mousePressEvent(QMouseEvent *event)
 {
     mLastMouse = event->localPos();
@@ -286,6 +301,8 @@ void CurveGraph::mousePressEvent(QMouseEvent *event)
         mPanning = true;
         return;
     }
+    if (event->button() == Qt::LeftButton && mPickAnyLine)
+        PickAnyLine(event->localPos());
     Line *line = ActiveLine();
     if (event->button() != Qt::LeftButton || !line)
         return;

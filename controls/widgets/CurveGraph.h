@@ -79,6 +79,8 @@ public:
     void SetSnap(float64 stepX, float64 stepY);
     void SetDiagonal(bool on);
     void SetShowCoords(bool on);
+    // A press on a point of any visible line makes that line the active one.
+    void SetPickAnyLine(bool on) { mPickAnyLine = on; }
     // The most points a press may make a curve have.
     void SetMaxPoints(int32 count) { mMaxPoints = std::max(kMinPoints, count); }
 
@@ -111,6 +113,7 @@ private:
     void PaintCoords(QPainter &painter);
     Line *ActiveLine();
     int32 PointAt(QPointF pixel) const;
+    void PickAnyLine(QPointF pixel);
     void DragTo(QPointF pixel, Qt::KeyboardModifiers mods);
     void RemovePicked();
 
@@ -126,6 +129,7 @@ private:
     bool mDiagonal = true;
     bool mShowCoords = true;
     int32 mMaxPoints = 64;
+    bool mPickAnyLine = false;
     int32 mActive = 0;
     int32 mPicked = -1;
     bool mDragging = false;

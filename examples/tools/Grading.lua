@@ -15,6 +15,10 @@
 -- Gamma: type it or drag the handle over 0.5 up and down. Log: the
 -- conversion of 10-bit log code values to linear, a table of black and white
 -- code values, film gamma and soft clip, drawn as a curve.
+--
+-- Ranges: the shadows fall from lowStart to lowEnd, the highlights rise from
+-- highStart to highEnd; drag the four ends sideways. The midtones (dashed)
+-- are what is left.
 return {
   type = "Grading",
   inputs = {
@@ -42,5 +46,9 @@ return {
     { id = "Log", name = "Log to Linear", type = "ScriptVal",
       control = "LogControl",
       default = { black = 95, white = 685, filmGamma = 0.6, softClip = 0.2 } },
+    { id = "Ranges", name = "Ranges", type = "ScriptVal",
+      control = "ColorRangesControl",
+      tags = { CRC_SmoothFalloff = true, CRC_ShowMidtones = true, CRCD_SnapStep = 0.01 },
+      default = { lowStart = 0.05, lowEnd = 0.4, highStart = 0.55, highEnd = 0.95 } },
   },
 }
