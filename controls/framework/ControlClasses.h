@@ -9,6 +9,7 @@
 #include "inputcontrols/ClipControl.h"
 #include "inputcontrols/ColorRangesControl.h"
 #include "inputcontrols/ComboControl.h"
+#include "inputcontrols/CustomFilterControl.h"
 #include "inputcontrols/FileControl.h"
 #include "inputcontrols/FontfileControl.h"
 #include "inputcontrols/GammaControl.h"
@@ -62,7 +63,6 @@ ORBANE_PENDING_INPUT(ColorControl);
 ORBANE_PENDING_INPUT(ColorGamutControl);
 ORBANE_PENDING_INPUT(ColorSuppressionControl);
 ORBANE_PENDING_INPUT(ColorWheelControl);
-ORBANE_PENDING_INPUT(CustomFilterControl);
 ORBANE_PENDING_INPUT(GradientControl);
 ORBANE_PENDING_INPUT(ImageControl);
 ORBANE_PENDING_DERIVED(LightControl, TransformControl);

@@ -19,6 +19,9 @@
 -- Ranges: the shadows fall from lowStart to lowEnd, the highlights rise from
 -- highStart to highEnd; drag the four ends sideways. The midtones (dashed)
 -- are what is left.
+--
+-- Kernel: a convolution kernel as its rows; type the cells, choose its size,
+-- put in a preset or normalise it (refused where the cells sum to 0).
 return {
   type = "Grading",
   inputs = {
@@ -50,5 +53,8 @@ return {
       control = "ColorRangesControl",
       tags = { CRC_SmoothFalloff = true, CRC_ShowMidtones = true, CRCD_SnapStep = 0.01 },
       default = { lowStart = 0.05, lowEnd = 0.4, highStart = 0.55, highEnd = 0.95 } },
+    { id = "Kernel", name = "Kernel", type = "ScriptVal",
+      control = "CustomFilterControl",
+      default = { { 0, -1, 0 }, { -1, 5, -1 }, { 0, -1, 0 } } },
   },
 }
