@@ -29,6 +29,8 @@ const std::vector<Goal> &Goals()
          "a scan of every point"},
         {"V2", "hover over 100 each of six layer overlays (transform to image), one mouse event",
          "BM_Viewer_HoverLayers/100", nullptr, 0.5, ""},
+        {"H1", "histogram of a 4K RGBA float image", "BM_Histogram_4K", nullptr, 10.0, ""},
+        {"H2", "curve graph repaint while a point is dragged", "BM_CurveGraph_DragRepaint", nullptr, 1.0, ""},
     };
     return goals;
 }

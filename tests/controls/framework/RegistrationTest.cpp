@@ -271,7 +271,15 @@ TEST(TagMaps, PublishedMapsAreWellFormed)
         {"MultiButtonIDControl", 33}, {"OffsetControl", 2}, {"PointControl", 4},      {"PolylineControl", 56},
         {"PositionerControl", 16},    {"RangeControl", 14}, {"RectangleControl", 35}, {"ScriptValListControl", 4},
         {"ScrewControl", 1},          {"SliderControl", 4}, {"TransformControl", 10}, {"XYOffsetControl", 1}};
-    EXPECT_EQ(counts, published);
+    // The tone controls.
+    const std::map<std::string, int> tone = {
+        {"ColorRangesControl", 4}, {"LevelsControl", 3}, {"LevelsOutputControl", 3}, {"SplineControl", 21}};
+    for (const auto &[type, rows] : tone)
+        EXPECT_EQ(counts[type], rows) << type;
+    std::map<std::string, int> others = counts;
+    for (const auto &row : tone)
+        others.erase(row.first);
+    EXPECT_EQ(others, published);
     const auto table = [](const char *type) { return FFITagMap::ForType(FFIType::FindScriptName(type))->Table(); };
     EXPECT_EQ(table("ComboIDControl"), table("ComboControl")) << "variants share their primary's table";
     EXPECT_EQ(table("ListIDControl"), table("ListControl"));
