@@ -36,6 +36,8 @@ const std::vector<Goal> &Goals()
         {"E1", "drag one point of a 10,000-point shape: one mouse move with the repaint",
          "BM_Viewer_DragPolyLinePoint/10000", nullptr, 2.0, ""},
         {"E2", "select by box among 100,000 points, press to release", "BM_Viewer_BoxSelect/100000", nullptr, 5.0, ""},
+        {"H1", "histogram of a 4K RGBA float image", "BM_Histogram_4K", nullptr, 10.0, ""},
+        {"H2", "curve graph repaint while a point is dragged", "BM_CurveGraph_DragRepaint", nullptr, 1.0, ""},
     };
     return goals;
 }

@@ -15,5 +15,6 @@ return {
     { file = "tools/Layers.lua", name = "Layers1" },
     { file = "tools/Framing.lua", name = "Framing1" },
     { file = "tools/Colour.lua", name = "Colour1" },
+    { file = "tools/Grading.lua", name = "Grading1" },
   },
 }

@@ -9,20 +9,28 @@
 #include "inputcontrols/ClipControl.h"
 #include "inputcontrols/ColorControl.h"
 #include "inputcontrols/ColorGamutControl.h"
+#include "inputcontrols/ColorRangesControl.h"
 #include "inputcontrols/ColorSuppressionControl.h"
 #include "inputcontrols/ColorWheelControl.h"
 #include "inputcontrols/ComboControl.h"
+#include "inputcontrols/CustomFilterControl.h"
 #include "inputcontrols/FileControl.h"
 #include "inputcontrols/FontfileControl.h"
+#include "inputcontrols/GammaControl.h"
 #include "inputcontrols/GradientControl.h"
+#include "inputcontrols/HistogramControl.h"
 #include "inputcontrols/LabelControl.h"
+#include "inputcontrols/LevelsControl.h"
+#include "inputcontrols/LevelsOutputControl.h"
 #include "inputcontrols/ListControl.h"
+#include "inputcontrols/LogControl.h"
 #include "inputcontrols/MultiButtonControl.h"
 #include "inputcontrols/OffsetControl.h"
 #include "inputcontrols/RangeControl.h"
 #include "inputcontrols/ScrewControl.h"
 #include "inputcontrols/ScriptValListControl.h"
 #include "inputcontrols/SliderControl.h"
+#include "inputcontrols/SplineControl.h"
 #include "overlays/AngleControl.h"
 #include "overlays/CropControl.h"
 #include "overlays/CrosshairControl.h"
@@ -56,19 +64,11 @@
 namespace Orbane {
 
 ORBANE_PENDING_DERIVED(CameraControl, TransformControl);
-ORBANE_PENDING_INPUT(ColorRangesControl);
-ORBANE_PENDING_INPUT(CustomFilterControl);
-ORBANE_PENDING_INPUT(GammaControl);
-ORBANE_PENDING_INPUT(HistogramControl);
 ORBANE_PENDING_INPUT(ImageControl);
-ORBANE_PENDING_INPUT(LevelsControl);
-ORBANE_PENDING_INPUT(LevelsOutputControl);
 ORBANE_PENDING_DERIVED(LightControl, TransformControl);
-ORBANE_PENDING_INPUT(LogControl);
 ORBANE_PENDING_PREVIEW(MeshControl);
 ORBANE_PENDING_PREVIEW(ObloidControl);
 ORBANE_PENDING_INPUT(PatternControl);
-ORBANE_PENDING_INPUT(SplineControl);
 ORBANE_PENDING_PREVIEW(TrackerControl);
 
 } // namespace Orbane

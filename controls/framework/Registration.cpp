@@ -33,6 +33,9 @@
 #include "framework/RectangleTags.h"
 #include "framework/ScrewTags.h"
 #include "framework/SliderTags.h"
+#include "framework/SplineTags.h"
+#include "framework/LevelsTags.h"
+#include "framework/ColorRangesTags.h"
 #include "framework/TransformTags.h"
 #include "framework/VariantRegistration.h"
 #include "framework/XYOffsetTags.h"
@@ -94,7 +97,7 @@ ControlRegistration<CheckListControl> gCheckList{D::Input("CheckListControl").Ta
 ControlRegistration<ClipControl> gClip{D::Input("ClipControl").Tags<ClipControlTags>()};
 ControlRegistration<ColorControl> gColor{D::Input("ColorControl").Tags<ColorControlTags>()};
 ControlRegistration<ColorGamutControl> gColorGamut{D::Input("ColorGamutControl")};
-ControlRegistration<ColorRangesControl> gColorRanges{D::Input("ColorRangesControl")};
+ControlRegistration<ColorRangesControl> gColorRanges{D::Input("ColorRangesControl").Tags<ColorRangesControlTags>()};
 ControlRegistration<ColorSuppressionControl> gColorSuppression{
     D::Input("ColorSuppressionControl").Tags<ColorSuppressionControlTags>()};
 ControlRegistration<ColorWheelControl> gColorWheel{D::Input("ColorWheelControl").Tags<ColorWheelControlTags>()};
@@ -122,8 +125,9 @@ ControlRegistration<LabelControl> gLabel{LabelDesc()};
 VariantRegistration<LabelControl> gLabelNest{LabelDesc().Variant(CLSID_InputControl_Nest)};
 VariantRegistration<LabelControl> gLabelSeparator{LabelDesc().Variant(CLSID_InputControl_Separator)};
 VariantRegistration<LabelControl> gLabelSpacer{LabelDesc().Variant(CLSID_InputControl_Spacer)};
-ControlRegistration<LevelsControl> gLevels{D::Input("LevelsControl")};
-ControlRegistration<LevelsOutputControl> gLevelsOutput{D::Input("LevelsOutputControl")};
+ControlRegistration<LevelsControl> gLevels{D::Input("LevelsControl").Tags<LevelsControlTags>()};
+ControlRegistration<LevelsOutputControl> gLevelsOutput{
+    D::Input("LevelsOutputControl").Tags<LevelsOutputControlTags>()};
 ControlRegistration<LightControl, TransformControl> gLight{
     D::Preview("LightControl").Base(TransformControlID(), "TransformControl").Flag(REG_PreviewFlag65)};
 ControlRegistration<ListControl> gList{ListDesc()};
@@ -153,6 +157,7 @@ ControlRegistration<SliderOverlay, OverlayControl> gSliderOverlay{D::Preview("Sl
                                                                       .Flag(REG_PreviewFlag64)
                                                                       .Flag(REG_ClassFamily, kOverlayFamily)};
 ControlRegistration<SplineControl> gSpline{D::Input("SplineControl")
+                                               .Tags<SplineControlTags>()
                                                .Cleanup(&SplineControl::RegCleanup)
                                                .Flag(REG_SplineFlag)
                                                .Flag(REG_DisplayName, "Spline Control")

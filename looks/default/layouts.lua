@@ -327,4 +327,123 @@ return {
             expression(),
         },
     },
+
+    -- The curves editor: the name and the curve buttons on one line, the
+    -- graph under them (the control sets its height).
+    ["Controls.Spline.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 2,
+                { name = "label", stretch = 1 },
+                { name = "luma", width = 22 },
+                { name = "red", width = 22 },
+                { name = "green", width = 22 },
+                { name = "blue", width = 22 },
+                { name = "alpha", width = 22 },
+                { name = "linear", width = 48 },
+                { name = "reset", width = 44 },
+            },
+            { name = "graph", minheight = 60 },
+            expression(),
+        },
+    },
+
+    -- Levels: the name and the channel over the histogram with its
+    -- handles, the three values under it.
+    ["Controls.Levels.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 4,
+                { name = "label", stretch = 1 },
+                { name = "scale", width = 40 },
+                { name = "channel", width = 70 },
+            },
+            { name = "histogram", height = 90 },
+            { kind = "hbox", spacing = 4,
+                { name = "black", stretch = 1, minwidth = 40 },
+                { name = "gamma", stretch = 1, minwidth = 40 },
+                { name = "white", stretch = 1, minwidth = 40 },
+            },
+        },
+    },
+
+    -- Output levels: the name, the ramp with its two handles, the values.
+    ["Controls.LevelsOutput.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { name = "label" },
+            { name = "ramp", height = 24 },
+            { kind = "hbox", spacing = 4,
+                { name = "black", stretch = 1, minwidth = 40 },
+                { name = "white", stretch = 1, minwidth = 40 },
+            },
+        },
+    },
+
+    ["Controls.Histogram.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 4,
+                { name = "label", stretch = 1 },
+                { name = "scale", width = 40 },
+                { name = "channel", width = 70 },
+            },
+            { name = "histogram", height = 90 },
+        },
+    },
+
+    ["Controls.ColorRanges.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 4,
+                { name = "label", stretch = 1 },
+                { name = "reset", width = 44 },
+            },
+            { name = "graph", height = 110 },
+        },
+    },
+
+    -- Gamma and log: the values over the transfer curve.
+    ["Controls.Gamma.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 4,
+                { name = "label", stretch = 1 },
+                { name = "edit", width = 70 },
+            },
+            { name = "graph", height = 100 },
+            expression(),
+        },
+    },
+
+    ["Controls.Log.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { name = "label" },
+            { kind = "grid", hspacing = 4, vspacing = 2, colstretch = { 0, 1, 0, 1 },
+                { name = "blackcaption", row = 1, col = 1 },
+                { name = "black", row = 1, col = 2 },
+                { name = "whitecaption", row = 1, col = 3 },
+                { name = "white", row = 1, col = 4 },
+                { name = "gammacaption", row = 2, col = 1 },
+                { name = "gamma", row = 2, col = 2 },
+                { name = "softclipcaption", row = 2, col = 3 },
+                { name = "softclip", row = 2, col = 4 },
+            },
+            { name = "graph", height = 100 },
+        },
+    },
+
+    -- The kernel: size and presets on one line, the grid of cells and its
+    -- preview side by side, the message under them.
+    ["Controls.CustomFilter.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 4,
+                { name = "label", stretch = 1 },
+                { name = "size", width = 48 },
+                { name = "blur", width = 40 },
+                { name = "sharpen", width = 56 },
+                { name = "edge", width = 40 },
+                { name = "normalise", width = 64 },
+            },
+            { kind = "hbox", spacing = 6,
+                { kind = "grid", name = "cells", stretch = 1 },
+                { name = "preview", width = 72, height = 72 },
+            },
+            { name = "message" },
+        },
+    },
 }

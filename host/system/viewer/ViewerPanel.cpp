@@ -1,4 +1,5 @@
 #include "orbane/ViewerPanel.h"
+#include "orbane/ViewedImage.h"
 
 #include "HoverIndex.h"
 #include "QtGPainter.h"
@@ -284,6 +285,7 @@ void ViewerPanel::SetImage(const QImage &image)
     mBackdrop->SetImage(image);
     mLinear = FloatImage();
     mLinearStale = !image.isNull();
+    ViewedImage::Instance().Set(image);
     mUserView = false;
     FitImage();
     SendAll(CCMD_ImageChanged, 0);
@@ -314,6 +316,7 @@ void ViewerPanel::OnImageReady(const QImage &display, const FloatImage &linear)
     mBackdrop->SetImage(display);
     mLinear = linear;
     mLinearStale = false;
+    ViewedImage::Instance().Set(display);
     if (refit)
         FitImage();
     SendAll(CCMD_ImageChanged, 0);
@@ -329,6 +332,7 @@ void ViewerPanel::OnImageCleared()
     mBackdrop->SetPlaceholderSize(size);
     mLinear = FloatImage();
     mLinearStale = false;
+    ViewedImage::Instance().Set(QImage());
     if (ImageSize() != QSize(Mapping().ImageWidth(), Mapping().ImageHeight()))
         FitImage();
     SendAll(CCMD_ImageChanged, 0);

@@ -271,9 +271,10 @@ TEST(TagMaps, PublishedMapsAreWellFormed)
         {"MultiButtonIDControl", 33}, {"OffsetControl", 2}, {"PointControl", 4},      {"PolylineControl", 56},
         {"PositionerControl", 16},    {"RangeControl", 14}, {"RectangleControl", 35}, {"ScriptValListControl", 4},
         {"ScrewControl", 1},          {"SliderControl", 4}, {"TransformControl", 10}, {"XYOffsetControl", 1}};
-    // The colour controls.
+    // The colour and tone controls.
     published.insert({{"ColorControl", 6}, {"ColorWheelControl", 3}, {"GradientControl", 2}});
-    published.insert({{"ColorSuppressionControl", 7}});
+    published.insert({{"ColorSuppressionControl", 7}, {"ColorRangesControl", 4}, {"LevelsControl", 3}});
+    published.insert({{"LevelsOutputControl", 3}, {"SplineControl", 21}});
     EXPECT_EQ(counts, published);
     const auto table = [](const char *type) { return FFITagMap::ForType(FFIType::FindScriptName(type))->Table(); };
     EXPECT_EQ(table("ComboIDControl"), table("ComboControl")) << "variants share their primary's table";

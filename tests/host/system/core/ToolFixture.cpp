@@ -6,6 +6,7 @@
 #include "orbane/Operator.h"
 #include "orbane/RegistryList.h"
 #include "orbane/ScriptVal.h"
+#include "orbane/ScriptValParam.h"
 
 #include <QApplication>
 #include <QMouseEvent>
@@ -41,6 +42,17 @@ Input *ToolFixture::AddNumber(const char *id, float64 value, const TagList &attr
 Input *ToolFixture::AddPoint(const char *id, float64 x, float64 y, const TagList &attrs)
 {
     return tool->AddInput(OrbID(id), id, CLSID_DataType_Point, attrs, AutoPoint(x, y));
+}
+
+Input *ToolFixture::AddTable(const char *id, const ScriptVal &value, const TagList &attrs)
+{
+    return tool->AddInput(OrbID(id), id, CLSID_DataType_ScriptVal, attrs, AutoScriptValParam(value));
+}
+
+ScriptVal ToolFixture::TableOf(const Input *input) const
+{
+    const AutoScriptValParam value(const_cast<Input *>(input), doc.GetCurrentTime());
+    return value ? value->Value : ScriptVal();
 }
 
 InputControl *ToolFixture::Bind(InputControl *control, const std::vector<Input *> &inputs, int32 width)

@@ -2,6 +2,7 @@
 
 #include "orbane/InputControl.h"
 #include "orbane/OrbaneDoc.h"
+#include "orbane/ScriptVal.h"
 #include "orbane/TagList.h"
 
 #include <QWidget>
@@ -27,6 +28,9 @@ public:
 
     Input *AddNumber(const char *id, float64 value, const TagList &attrs = TagList());
     Input *AddPoint(const char *id, float64 x, float64 y, const TagList &attrs = TagList());
+    // A script-table Input, and its value at the document's time (nil where none).
+    Input *AddTable(const char *id, const ScriptVal &value, const TagList &attrs = TagList());
+    ScriptVal TableOf(const Input *input) const;
 
     // Adopts the control's reference and binds it to `inputs`; null stays null.
     InputControl *Bind(InputControl *control, const std::vector<Input *> &inputs, int32 width = kWidth);
