@@ -36,6 +36,11 @@ orbane.Click("stepForward")
 check.eq(orbane.GetTime(), 21, "step forward")
 orbane.Click("last")
 check.eq(orbane.GetTime(), 100, "last frame")
+orbane.Click("play")
+check.eq(orbane.Ruler().playing, true, "Play starts playback")
+check.eq(orbane.State("play").text, "Stop", "the button offers Stop")
+orbane.Click("play")
+check.eq(orbane.Ruler().playing, false, "Stop ends it")
 
 -- Remove Animation keeps the value now, and undo brings both keys back.
 orbane.SetTime(20)
