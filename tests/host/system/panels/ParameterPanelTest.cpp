@@ -162,7 +162,7 @@ private slots:
         QTest::addColumn<QString>("warning");
         QTest::newRow("unknown class") << "NoSuchControl"
                                        << "Input \"Blend Gain\" .*\"NoSuchControl\", which is unknown";
-        QTest::newRow("unwritten control") << "LogControl"
+        QTest::newRow("unwritten control") << "PatternControl"
                                            << "";
     }
 
