@@ -66,7 +66,8 @@ public:
     // After a save (or an open): the document is `path` and unmodified.
     void MarkSaved(const std::string &path);
     // New work: removes every tool (toolRemoving first), empties the undo
-    // history, time 0, no viewer image, no comp path, unmodified.
+    // history, time 0, no viewer image (pixel aspect 1), no comp path,
+    // unmodified.
     void Clear();
 
     QUndoStack *UndoStack() const noexcept { return mUndoStack.get(); }

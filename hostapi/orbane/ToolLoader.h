@@ -57,7 +57,9 @@ public:
     static bool LoadComp(OrbaneDoc &doc, const std::string &path, std::string *error);
     // Reads and checks the comp in full, and only then clears the document
     // (OrbaneDoc::Clear) and loads it: File > Open. A refused comp leaves
-    // the document as it was.
+    // the document as it was; only expressions are checked after the clear
+    // (they may name any tool of the comp), so a comp refused for one of
+    // them leaves the document empty.
     static bool OpenComp(OrbaneDoc &doc, const std::string &path, std::string *error);
     // Writes the document as a comp, atomically (a temporary file renamed
     // over `path` once complete; a failed write leaves the old file). Leaves

@@ -152,6 +152,7 @@ void OrbaneDoc::Clear()
     mUndoStack->clear();
     SetCurrentTime(0.0);
     SetPref(PREF_ViewerImage, "");
+    SetPref(PREF_ViewerPixelAspect, 1.0);
     MarkSaved(std::string());
 }
 

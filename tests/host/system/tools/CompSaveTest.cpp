@@ -164,13 +164,15 @@ void ExpectSame(const Input &a, const Input &b)
     EXPECT_EQ(a.GetInterpolation(), b.GetInterpolation()) << a.GetID().c_str();
     EXPECT_STREQ(a.GetExpression(), b.GetExpression()) << a.GetID().c_str();
     ASSERT_EQ(a.KeyTimes(), b.KeyTimes()) << a.GetID().c_str();
-    for (const float64 time : a.KeyTimes())
+    for (const float64 time : a.KeyTimes()) {
         EXPECT_TRUE(AutoParameter(a.GetKey(time))->Equals(*AutoParameter(b.GetKey(time))))
             << a.GetID().c_str() << " key at " << time;
+    }
     const AutoParameter va(a.GetValue(3.0)), vb(b.GetValue(3.0));
     ASSERT_EQ(bool(va), bool(vb)) << a.GetID().c_str();
-    if (va)
+    if (va) {
         EXPECT_TRUE(va->Equals(*vb)) << a.GetID().c_str();
+    }
 }
 
 TEST_P(CompRoundTrip, OpeningTheSavedCompRestoresItExactly)
