@@ -59,22 +59,22 @@ std::unique_ptr<OIIO::ImageInput> Open(const QString &path, QString *error)
     return in;
 }
 
-bool CheckSpec(const QString &path, const OIIO::ImageSpec &spec, QString *error)
+bool CheckHeader(const QString &path, const OIIO::ImageSpec &desc, QString *error)
 {
-    if (spec.width <= 0 || spec.height <= 0 || spec.depth > 1 || spec.nchannels <= 0)
+    if (desc.width <= 0 || desc.height <= 0 || desc.depth > 1 || desc.nchannels <= 0)
         return Fail(error, QString("%1: not a flat image of at least one pixel").arg(path));
-    return CheckSize(path, spec.width, spec.height, error);
+    return CheckSize(path, desc.width, desc.height, error);
 }
 
 // Does the file hold sRGB-encoded values (rather than linear light)?
-bool IsEncoded(const OIIO::ImageSpec &spec)
+bool IsEncoded(const OIIO::ImageSpec &desc)
 {
-    const QString space = QString::fromStdString(spec.get_string_attribute("oiio:ColorSpace")).toLower();
+    const QString space = QString::fromStdString(desc.get_string_attribute("oiio:ColorSpace")).toLower();
     if (space.contains("linear"))
         return false;
     if (space.contains("srgb"))
         return true;
-    return !spec.format.is_floating_point();
+    return !desc.format.is_floating_point();
 }
 
 // Read values to premultiplied linear light, in place.
@@ -107,16 +107,16 @@ constexpr int kBandRows = 64;
 // files are read whole.
 bool ReadPixels(OIIO::ImageInput &in, int channels, float *data, const ImageFile::Progress &progress, bool *stopped)
 {
-    const OIIO::ImageSpec &spec = in.spec();
-    if (spec.tile_width > 0)
+    const OIIO::ImageSpec &desc = in.spec();
+    if (desc.tile_width > 0)
         return in.read_image(0, 0, 0, channels, OIIO::TypeDesc::FLOAT, data);
-    const std::size_t rowValues = std::size_t(spec.width) * std::size_t(channels);
-    for (int y = 0; y < spec.height; y += kBandRows) {
-        const int end = std::min(spec.height, y + kBandRows);
-        if (!in.read_scanlines(0, 0, spec.y + y, spec.y + end, 0, 0, channels, OIIO::TypeDesc::FLOAT,
+    const std::size_t rowValues = std::size_t(desc.width) * std::size_t(channels);
+    for (int y = 0; y < desc.height; y += kBandRows) {
+        const int end = std::min(desc.height, y + kBandRows);
+        if (!in.read_scanlines(0, 0, desc.y + y, desc.y + end, 0, 0, channels, OIIO::TypeDesc::FLOAT,
                                data + std::size_t(y) * rowValues))
             return false;
-        if (progress && !progress(float(end) / float(spec.height)))
+        if (progress && !progress(float(end) / float(desc.height)))
             return !(*stopped = true);
     }
     return true;
@@ -149,13 +149,13 @@ QImage ImageFile::Read(const QString &path, QString *error)
 bool ImageFile::ReadHeader(const QString &path, Header *header, QString *error)
 {
     const auto in = Open(path, error);
-    if (!in || !CheckSpec(path, in->spec(), error))
+    if (!in || !CheckHeader(path, in->spec(), error))
         return false;
-    const OIIO::ImageSpec &spec = in->spec();
-    header->width = spec.width;
-    header->height = spec.height;
-    header->channels = spec.nchannels;
-    header->isFloat = spec.format.is_floating_point();
+    const OIIO::ImageSpec &desc = in->spec();
+    header->width = desc.width;
+    header->height = desc.height;
+    header->channels = desc.nchannels;
+    header->isFloat = desc.format.is_floating_point();
     header->format = QString::fromUtf8(in->format_name());
     return true;
 }
@@ -163,11 +163,11 @@ bool ImageFile::ReadHeader(const QString &path, Header *header, QString *error)
 FloatImage ImageFile::ReadLinear(const QString &path, QString *error, const Progress &progress)
 {
     const auto in = Open(path, error);
-    if (!in || !CheckSpec(path, in->spec(), error))
+    if (!in || !CheckHeader(path, in->spec(), error))
         return FloatImage();
-    const OIIO::ImageSpec &spec = in->spec();
-    const int channels = std::min(spec.nchannels, 4);
-    std::vector<float> pixels(std::size_t(spec.width) * std::size_t(spec.height) * std::size_t(channels));
+    const OIIO::ImageSpec &desc = in->spec();
+    const int channels = std::min(desc.nchannels, 4);
+    std::vector<float> pixels(std::size_t(desc.width) * std::size_t(desc.height) * std::size_t(channels));
     bool stopped = false;
     const bool read = ReadPixels(*in, channels, pixels.data(), progress, &stopped);
     if (stopped)
@@ -178,9 +178,9 @@ FloatImage ImageFile::ReadLinear(const QString &path, QString *error, const Prog
     }
     // Of two or four channels the last is taken as alpha, as the files
     // these readers see order them.
-    const bool straight = spec.get_int_attribute("oiio:UnassociatedAlpha", 0) != 0;
-    MakeLinear(pixels, channels, IsEncoded(spec), straight);
-    return FloatImage(spec.width, spec.height, channels, std::move(pixels));
+    const bool straight = desc.get_int_attribute("oiio:UnassociatedAlpha", 0) != 0;
+    MakeLinear(pixels, channels, IsEncoded(desc), straight);
+    return FloatImage(desc.width, desc.height, channels, std::move(pixels));
 }
 
 } // namespace Orbane

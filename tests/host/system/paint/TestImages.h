@@ -18,13 +18,13 @@ inline bool WriteTestImage(const std::string &path, int width, int height, int c
     auto out = OIIO::ImageOutput::create(path);
     if (!out)
         return false;
-    OIIO::ImageSpec spec(width, height, channels, type);
+    OIIO::ImageSpec desc(width, height, channels, type);
     if (bits)
-        spec.attribute("oiio:BitsPerSample", bits);
+        desc.attribute("oiio:BitsPerSample", bits);
     if (channels == 4)
-        spec.alpha_channel = 3;
-    spec.attribute("oiio:UnassociatedAlpha", 1);
-    return out->open(path, spec) && out->write_image(OIIO::TypeDesc::FLOAT, pixels.data()) && out->close();
+        desc.alpha_channel = 3;
+    desc.attribute("oiio:UnassociatedAlpha", 1);
+    return out->open(path, desc) && out->write_image(OIIO::TypeDesc::FLOAT, pixels.data()) && out->close();
 }
 
 // A picture of one flat value in every channel.
