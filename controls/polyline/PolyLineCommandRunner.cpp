@@ -69,7 +69,7 @@ bool PolyLineCommandRunner::Run(int32 command, int32 arg)
     case PLCMD_ToggleMarkers:
         return Display(command, arg);
     case PLCMD_PointNumbers:
-        return Toggle(c.mSettings.pointNumbers);
+        return Toggle(c.mSurface->settings.pointNumbers);
     case PLCMD_CurrentTimeOnly:
         c.mEditor.SetCurrentTimeOnly(!c.mEditor.CurrentTimeOnly());
         c.Redraw();
@@ -81,7 +81,7 @@ bool PolyLineCommandRunner::Run(int32 command, int32 arg)
         c.mEditor.SetSelectionLocked(!c.mEditor.IsSelectionLocked());
         return true;
     case PLCMD_PublishPathPoints:
-        return Toggle(c.mSettings.publishPathPoints);
+        return Toggle(c.mSurface->settings.publishPathPoints);
     case PLCMD_LockPointPairs:
         c.mEditor.SetLockPairs(!c.mEditor.LockPairs());
         return true;
@@ -179,7 +179,7 @@ bool PolyLineCommandRunner::Display(int32 command, int32 arg)
         break;
     case PLCMD_ShowHandles:
         if (arg == 1)
-            return Toggle(c.mSettings.hull);
+            return Toggle(c.mSurface->settings.hull);
         bit = PLD_Handles;
         break;
     case PLCMD_ShowPolygon:
@@ -302,14 +302,14 @@ std::string PolyLineCommandRunner::Value() const
 void PolyLineCommandRunner::AskFile(bool save, const char *title, std::function<void(const std::string &)> done)
 {
     PolyLineControl &c = mControl;
-    if (!c.mDialogs)
-        c.mDialogs = std::make_unique<QObject>();
+    if (!c.mSurface->dialogs)
+        c.mSurface->dialogs = std::make_unique<QObject>();
     auto *dialog = new QFileDialog(nullptr, QString::fromUtf8(title));
     dialog->setAcceptMode(save ? QFileDialog::AcceptSave : QFileDialog::AcceptOpen);
     dialog->setNameFilters({"Shapes (*.shape *.svg)", "All files (*)"});
     dialog->setAttribute(Qt::WA_DeleteOnClose);
-    QObject::connect(c.mDialogs.get(), &QObject::destroyed, dialog, &QObject::deleteLater);
-    QObject::connect(dialog, &QFileDialog::fileSelected, c.mDialogs.get(),
+    QObject::connect(c.mSurface->dialogs.get(), &QObject::destroyed, dialog, &QObject::deleteLater);
+    QObject::connect(dialog, &QFileDialog::fileSelected, c.mSurface->dialogs.get(),
                      [done](const QString &path) { done(path.toStdString()); });
     dialog->open();
 }
@@ -317,13 +317,13 @@ void PolyLineCommandRunner::AskFile(bool save, const char *title, std::function<
 void PolyLineCommandRunner::AskColor(OrbColor current, std::function<void(OrbColor)> done)
 {
     PolyLineControl &c = mControl;
-    if (!c.mDialogs)
-        c.mDialogs = std::make_unique<QObject>();
+    if (!c.mSurface->dialogs)
+        c.mSurface->dialogs = std::make_unique<QObject>();
     const QColor start = current.IsNone() ? QColor(Qt::white) : QColor(current.R(), current.G(), current.B());
     auto *dialog = new QColorDialog(start);
     dialog->setAttribute(Qt::WA_DeleteOnClose);
-    QObject::connect(c.mDialogs.get(), &QObject::destroyed, dialog, &QObject::deleteLater);
-    QObject::connect(dialog, &QColorDialog::colorSelected, c.mDialogs.get(), [done](const QColor &q) {
+    QObject::connect(c.mSurface->dialogs.get(), &QObject::destroyed, dialog, &QObject::deleteLater);
+    QObject::connect(dialog, &QColorDialog::colorSelected, c.mSurface->dialogs.get(), [done](const QColor &q) {
         done(OrbColor(uint8(q.red()), uint8(q.green()), uint8(q.blue()), 255));
     });
     dialog->open();
@@ -439,7 +439,7 @@ bool PolyLineCommandRunner::Import(int32 command)
 
 bool PolyLineCommandRunner::Onion(int32 command)
 {
-    PolyLineSettings &s = mControl.mSettings;
+    PolyLineSettings &s = mControl.mSurface->settings;
     switch (command) {
     case PLCMD_OnionEnable:
         return Toggle(s.onionEnabled);
@@ -461,7 +461,7 @@ bool PolyLineCommandRunner::Onion(int32 command)
             return Tell("Set prev skin color: give the colour as \"#rrggbb\"");
         PolyLineControl *c = &mControl;
         AskColor(s.onionPrevColor, [c](OrbColor colour) {
-            c->mSettings.onionPrevColor = colour;
+            c->mSurface->settings.onionPrevColor = colour;
             c->Redraw();
         });
         return true;
@@ -479,7 +479,7 @@ bool PolyLineCommandRunner::Onion(int32 command)
 // a tracker, which there is not yet.
 bool PolyLineCommandRunner::Roto(int32 command)
 {
-    PolyLineSettings &s = mControl.mSettings;
+    PolyLineSettings &s = mControl.mSurface->settings;
     switch (command) {
     case PLCMD_RotoEnable:
         return Toggle(s.rotoEnabled);
@@ -634,8 +634,8 @@ bool PolyLineCommandRunner::Reduce()
     }
     if (FromScript())
         return Edited(c->mEditor.Reduce(c->ReduceTolerance()));
-    if (!c->mDialogs)
-        c->mDialogs = std::make_unique<QObject>();
+    if (!c->mSurface->dialogs)
+        c->mSurface->dialogs = std::make_unique<QObject>();
     auto *dialog = new QInputDialog;
     dialog->setWindowTitle("Reduce Points");
     dialog->setLabelText("Tolerance in pixels");
@@ -643,13 +643,14 @@ bool PolyLineCommandRunner::Reduce()
     dialog->setDoubleRange(0.01, 1000.0);
     dialog->setDoubleValue(c->ReduceTolerance());
     dialog->setAttribute(Qt::WA_DeleteOnClose);
-    QObject::connect(c->mDialogs.get(), &QObject::destroyed, dialog, &QObject::deleteLater);
-    QObject::connect(dialog, &QInputDialog::doubleValueSelected, c->mDialogs.get(), [c](double px) {
+    QObject::connect(c->mSurface->dialogs.get(), &QObject::destroyed, dialog, &QObject::deleteLater);
+    QObject::connect(dialog, &QInputDialog::doubleValueSelected, c->mSurface->dialogs.get(), [c](double px) {
         c->mEditor.Reduce(px);
         c->ResetUndo(nullptr);
     });
-    QObject::connect(dialog, &QDialog::finished, c->mDialogs.get(), [c](int) { c->mSettings.reduceOpen = false; });
-    c->mSettings.reduceOpen = true;
+    QObject::connect(dialog, &QDialog::finished, c->mSurface->dialogs.get(),
+                     [c](int) { c->mSurface->settings.reduceOpen = false; });
+    c->mSurface->settings.reduceOpen = true;
     dialog->open();
     return true;
 }

@@ -456,7 +456,7 @@ void PolyLineControl::DrawCentre(GPainter &p, const PreviewInfo &info) const
 void PolyLineControl::DrawOnionSkins(GPainter &p, const PreviewInfo &info, const PolyLineStyle &style) const
 {
     Input *main = GetMainInput();
-    if (!main || !main->IsAnimated() || !mSettings.onionEnabled)
+    if (!main || !main->IsAnimated() || !mSurface->settings.onionEnabled)
         return;
     const float64 now = GetCurrentTime();
     p.PushAttrib();
@@ -467,8 +467,8 @@ void PolyLineControl::DrawOnionSkins(GPainter &p, const PreviewInfo &info, const
             continue;
         const AutoParam<PolyLine> skin(main, time);
         // The skins before now in their own colour, where one is set.
-        const bool prev = time < now && !mSettings.onionPrevColor.IsNone();
-        p.Color(prev ? GColor::FromOrb(mSettings.onionPrevColor) : kOnionColor, info.GetShadow(OrbColor()).Faded(0.5f));
+        const bool prev = time < now && !mSurface->settings.onionPrevColor.IsNone();
+        p.Color(prev ? GColor::FromOrb(mSurface->settings.onionPrevColor) : kOnionColor, info.GetShadow(OrbColor()).Faded(0.5f));
         if (skin)
             PolyLineDrawing::DrawCurve(p, *skin, style.span);
     }

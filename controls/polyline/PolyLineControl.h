@@ -95,7 +95,7 @@ public:
     // One command of the menu, the toolbar or a key, with its argument;
     // false where it did nothing (it then tells the user why).
     bool RunCommand(int32 command, int32 arg, const TagList *tags);
-    const PolyLineSettings &Settings() const { return mSettings; }
+    const PolyLineSettings &Settings() const { return mSurface->settings; }
 
     uint8 DrawMode() const { return mDrawMode; }
     uint8 ModeOf() const { return mDrawMode & 0x0F; }
@@ -226,8 +226,7 @@ private:
     const QCursor *mCurrentCursor = nullptr;
 
     // --- the command surface ---
-    PolyLineSettings mSettings;
-    std::unique_ptr<QObject> mDialogs; // the parent of open dialogs: they go with the control
+    std::unique_ptr<PolyLineSurface> mSurface = std::make_unique<PolyLineSurface>();
     // --- editing ---
     PolyLineEditor mEditor{*this};
     PolyLineMouse mMouse{*this};

@@ -56,20 +56,20 @@ void PolyLineControl::AddToMenu(QMenu *menu, PreviewInfo *info, const TagList *t
     s.lockPointPairs = mEditor.LockPairs();
     s.currentTimeOnly = mEditor.CurrentTimeOnly();
     s.canPublish = mCanPublishPoints;
-    s.reduceVisible = mSettings.reduceOpen;
-    s.pointNumbers = mSettings.pointNumbers;
+    s.reduceVisible = mSurface->settings.reduceOpen;
+    s.pointNumbers = mSurface->settings.pointNumbers;
     s.lockSelection = mEditor.IsSelectionLocked();
-    s.publishPathPoints = mSettings.publishPathPoints;
+    s.publishPathPoints = mSurface->settings.publishPathPoints;
     s.displayFlags = mDisplayFlags;
-    s.hull = mSettings.hull;
-    s.onionEnabled = mSettings.onionEnabled;
-    s.onionClickTime = mSettings.onionClickTime;
-    s.rotoEnabled = mSettings.rotoEnabled;
-    s.rotoMultiple = mSettings.rotoMultiple;
-    s.rotoTrackPoints = mSettings.rotoTrackPoints;
-    s.rotoShowArea = mSettings.rotoShowArea;
-    s.rotoPatternEdit = mSettings.rotoPatternEdit;
-    s.rotoDistance = mSettings.rotoDistance;
+    s.hull = mSurface->settings.hull;
+    s.onionEnabled = mSurface->settings.onionEnabled;
+    s.onionClickTime = mSurface->settings.onionClickTime;
+    s.rotoEnabled = mSurface->settings.rotoEnabled;
+    s.rotoMultiple = mSurface->settings.rotoMultiple;
+    s.rotoTrackPoints = mSurface->settings.rotoTrackPoints;
+    s.rotoShowArea = mSurface->settings.rotoShowArea;
+    s.rotoPatternEdit = mSurface->settings.rotoPatternEdit;
+    s.rotoDistance = mSurface->settings.rotoDistance;
     s.editMultiplePolys = doc && doc->GetPrefs().GetLong(PREF_SelectPointsFromMultiPolies, 0) != 0;
     s.multiFrame = mEditor.GetMultiFrame();
     s.stopRendering = mStopRendering != 0;
@@ -105,7 +105,7 @@ bool PolyLineControl::RunWhole(PreviewInfo *info, int32 command, int32 arg, cons
 void PolyLineControl::GetAvailableEvents(std::vector<ToolbarEvent> &events, const TagList *tags)
 {
     HandleOverlay::GetAvailableEvents(events, tags);
-    for (ToolbarEvent &e : PolyLineToolbar::Events({mSettings.rotoDistance, mSettings.rotoFrameSkip}))
+    for (ToolbarEvent &e : PolyLineToolbar::Events({mSurface->settings.rotoDistance, mSurface->settings.rotoFrameSkip}))
         events.push_back(std::move(e));
 }
 
@@ -207,7 +207,7 @@ bool PolyLineControl::ControlGetTip(PreviewInfo *info, char *buffer, const TagLi
         p.animated = main->IsAnimated();
         p.time = GetCurrentTime();
         tip = PolyLineTips::ForPoint(p);
-    } else if (mSettings.onionEnabled && main->IsAnimated()) {
+    } else if (mSurface->settings.onionEnabled && main->IsAnimated()) {
         const OrbPoint mouse = info->MouseInViewer();
         for (const float64 time : main->KeyTimes()) {
             if (std::fabs(time - GetCurrentTime()) < 1e-9)
@@ -231,7 +231,7 @@ bool PolyLineControl::ControlGetTip(PreviewInfo *info, char *buffer, const TagLi
 // What the menu's own settings show, for scripts.
 void PolyLineControl::AddSurfaceState(ScriptVal &state) const
 {
-    const PolyLineSettings &s = mSettings;
+    const PolyLineSettings &s = mSurface->settings;
     for (auto [key, on] : {std::pair{"pointNumbers", s.pointNumbers},
                            {"hull", s.hull},
                            {"onionSkins", s.onionEnabled},
@@ -240,6 +240,8 @@ void PolyLineControl::AddSurfaceState(ScriptVal &state) const
                            {"reduceDialog", s.reduceOpen},
                            {"stopRendering", mStopRendering != 0}})
         state.SetKey(ScriptVal(key), ScriptVal(on));
+    // Always there, empty until the overlay has told the user something.
+    state.SetKey(ScriptVal("message"), ScriptVal(LastMessage().c_str()));
     state.SetKey(ScriptVal("rotoDistance"), ScriptVal(s.rotoDistance));
     state.SetKey(ScriptVal("rotoFrameSkip"), ScriptVal(s.rotoFrameSkip));
     const bool record[6] = {mRecordTime,    mRecordPressure, mRecordHeight,
@@ -257,7 +259,7 @@ void PolyLineControl::AddSurfaceState(ScriptVal &state) const
 void PolyLineControl::DrawExtras(Graphics::GPainter &p, const PolyLine &shape, const PolyLineStyle &style) const
 {
     const int32 n = shape.GetCount();
-    if (mSettings.hull && n > 1) {
+    if (mSurface->settings.hull && n > 1) {
         p.Color(style.handle, style.shadow);
         p.Begin(Graphics::GP_LineStrip);
         for (int32 i = 0; i < n; ++i) {
@@ -273,7 +275,7 @@ void PolyLineControl::DrawExtras(Graphics::GPainter &p, const PolyLine &shape, c
                 p.Vertex(shape.GetPoint(0)->X, shape.GetPoint(0)->Y);
         p.End();
     }
-    if (mSettings.pointNumbers) {
+    if (mSurface->settings.pointNumbers) {
         p.Color(style.keyPoint, style.shadow);
         for (int32 i = 0; i < n; ++i) {
             const PolyPoint &pt = *shape.GetPoint(i);

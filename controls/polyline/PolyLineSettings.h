@@ -3,6 +3,10 @@
 #include "orbane/OrbColor.h"
 #include "orbane/Types.h"
 
+#include <QObject>
+
+#include <memory>
+
 namespace Orbane {
 
 // What the polyline overlay's menu, toolbar and keys switch that is neither
@@ -21,6 +25,14 @@ struct PolyLineSettings
     bool rotoShowArea = false, rotoPatternEdit = false;
     int32 rotoDistance = 5;  // frames between tracked keys
     int32 rotoFrameSkip = 1; // frames the tracker steps
+};
+
+// The command surface's own part of the overlay, held apart so that the
+// overlay stays small enough for the host's pooled allocator.
+struct PolyLineSurface
+{
+    PolyLineSettings settings;
+    std::unique_ptr<QObject> dialogs; // the parent of open dialogs: they go with the control
 };
 
 } // namespace Orbane
