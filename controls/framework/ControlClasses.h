@@ -15,10 +15,12 @@
 #include "inputcontrols/FileControl.h"
 #include "inputcontrols/FontfileControl.h"
 #include "inputcontrols/GradientControl.h"
+#include "inputcontrols/ImageControl.h"
 #include "inputcontrols/LabelControl.h"
 #include "inputcontrols/ListControl.h"
 #include "inputcontrols/MultiButtonControl.h"
 #include "inputcontrols/OffsetControl.h"
+#include "inputcontrols/PatternControl.h"
 #include "inputcontrols/RangeControl.h"
 #include "inputcontrols/ScrewControl.h"
 #include "inputcontrols/ScriptValListControl.h"
@@ -60,14 +62,12 @@ ORBANE_PENDING_INPUT(ColorRangesControl);
 ORBANE_PENDING_INPUT(CustomFilterControl);
 ORBANE_PENDING_INPUT(GammaControl);
 ORBANE_PENDING_INPUT(HistogramControl);
-ORBANE_PENDING_INPUT(ImageControl);
 ORBANE_PENDING_INPUT(LevelsControl);
 ORBANE_PENDING_INPUT(LevelsOutputControl);
 ORBANE_PENDING_DERIVED(LightControl, TransformControl);
 ORBANE_PENDING_INPUT(LogControl);
 ORBANE_PENDING_PREVIEW(MeshControl);
 ORBANE_PENDING_PREVIEW(ObloidControl);
-ORBANE_PENDING_INPUT(PatternControl);
 ORBANE_PENDING_INPUT(SplineControl);
 ORBANE_PENDING_PREVIEW(TrackerControl);
 

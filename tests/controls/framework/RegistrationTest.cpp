@@ -273,7 +273,7 @@ TEST(TagMaps, PublishedMapsAreWellFormed)
         {"ScrewControl", 1},          {"SliderControl", 4}, {"TransformControl", 10}, {"XYOffsetControl", 1}};
     // The colour controls.
     published.insert({{"ColorControl", 6}, {"ColorWheelControl", 3}, {"GradientControl", 2}});
-    published.insert({{"ColorSuppressionControl", 7}});
+    published.insert({{"ColorSuppressionControl", 7}, {"PatternControl", 2}});
     EXPECT_EQ(counts, published);
     const auto table = [](const char *type) { return FFITagMap::ForType(FFIType::FindScriptName(type))->Table(); };
     EXPECT_EQ(table("ComboIDControl"), table("ComboControl")) << "variants share their primary's table";
