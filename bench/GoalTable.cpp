@@ -29,6 +29,8 @@ const std::vector<Goal> &Goals()
          "a scan of every point"},
         {"V2", "hover over 100 each of six layer overlays (transform to image), one mouse event",
          "BM_Viewer_HoverLayers/100", nullptr, 0.5, ""},
+        {"C1", "inspector build, 200 colour controls (four channel Inputs each)", "BM_Inspector_BuildColours/200",
+         "BM_StockColourRows_Build/200", 1.0, "stock Qt rows"},
     };
     return goals;
 }
