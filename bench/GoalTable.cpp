@@ -38,6 +38,8 @@ const std::vector<Goal> &Goals()
         {"E2", "select by box among 100,000 points, press to release", "BM_Viewer_BoxSelect/100000", nullptr, 5.0, ""},
         {"H1", "histogram of a 4K RGBA float image", "BM_Histogram_4K", nullptr, 10.0, ""},
         {"H2", "curve graph repaint while a point is dragged", "BM_CurveGraph_DragRepaint", nullptr, 1.0, ""},
+        {"C1", "inspector build, 200 colour controls (four channel Inputs each)", "BM_Inspector_BuildColours/200",
+         "BM_StockColourRows_Build/200", 1.0, "stock Qt rows"},
     };
     return goals;
 }

@@ -1,6 +1,5 @@
 #pragma once
 
-#include "framework/PendingInputControl.h"
 #include "framework/PendingPreviewControl.h"
 
 #include "inputcontrols/ButtonControl.h"
@@ -19,6 +18,7 @@
 #include "inputcontrols/GammaControl.h"
 #include "inputcontrols/GradientControl.h"
 #include "inputcontrols/HistogramControl.h"
+#include "inputcontrols/ImageControl.h"
 #include "inputcontrols/LabelControl.h"
 #include "inputcontrols/LevelsControl.h"
 #include "inputcontrols/LevelsOutputControl.h"
@@ -26,6 +26,7 @@
 #include "inputcontrols/LogControl.h"
 #include "inputcontrols/MultiButtonControl.h"
 #include "inputcontrols/OffsetControl.h"
+#include "inputcontrols/PatternControl.h"
 #include "inputcontrols/RangeControl.h"
 #include "inputcontrols/ScrewControl.h"
 #include "inputcontrols/ScriptValListControl.h"
@@ -53,9 +54,6 @@
 // `static bool RegCleanup(Registry *)` where the pending one declares a
 // class-specific clean-up (Angle, Ellipse, Fontfile, Spline). The registration
 // in Registration.cpp stays as it is.
-#define ORBANE_PENDING_INPUT(Class)                                                                                    \
-    struct Class##Marker;                                                                                              \
-    using Class = PendingInputControl<Class##Marker>
 #define ORBANE_PENDING_PREVIEW(Class) ORBANE_PENDING_DERIVED(Class, PreviewControl)
 #define ORBANE_PENDING_DERIVED(Class, Base)                                                                            \
     struct Class##Marker;                                                                                              \
@@ -64,11 +62,9 @@
 namespace Orbane {
 
 ORBANE_PENDING_DERIVED(CameraControl, TransformControl);
-ORBANE_PENDING_INPUT(ImageControl);
 ORBANE_PENDING_DERIVED(LightControl, TransformControl);
 ORBANE_PENDING_PREVIEW(MeshControl);
 ORBANE_PENDING_PREVIEW(ObloidControl);
-ORBANE_PENDING_INPUT(PatternControl);
 ORBANE_PENDING_PREVIEW(TrackerControl);
 
 } // namespace Orbane

@@ -27,6 +27,7 @@
 #include "framework/ListTags.h"
 #include "framework/MultiButtonTags.h"
 #include "framework/OffsetTags.h"
+#include "framework/PatternTags.h"
 #include "framework/PointTags.h"
 #include "framework/PositionerTags.h"
 #include "framework/RangeTags.h"
@@ -139,7 +140,7 @@ VariantRegistration<MultiButtonControl> gMultiButtonID{
     MultiButtonDesc().Variant(CLSID_InputControl_MultiButtonID, "MultiButtonIDControl")};
 ControlRegistration<ObloidControl> gObloid{D::Preview("ObloidControl", "CubeControl")};
 ControlRegistration<OffsetControl> gOffset{D::Input("OffsetControl").Tags<OffsetControlTags>()};
-ControlRegistration<PatternControl> gPattern{D::Input("PatternControl")};
+ControlRegistration<PatternControl> gPattern{D::Input("PatternControl").Tags<PatternControlTags>()};
 ControlRegistration<PointControl> gPoint{D::Preview("PointControl").Tags<PointControlTags>()};
 ControlRegistration<PolyLineControl> gPolyLine{
     D::Preview("PolyLineControl", "PolylineControl").Script("PolylineControl").Tags<PolyLineControlTags>()};

@@ -55,5 +55,10 @@ return {
     -- drag a primary or the white point for a custom one.
     { id = "Gamut", name = "Gamut", type = "ScriptVal", control = "ColorGamutControl",
       default = { space = "Rec. 2020" } },
+    -- A tiled pattern, chosen by clicking its preview (the value is its index).
+    { id = "Fill", name = "Fill", type = "Number", default = 0, control = "PatternControl",
+      tags = { PTNC_TileSize = 8, PTNC_InkColor = 0xFF66CCFF } },
+    -- An image Input shown as a thumbnail with its size and channels.
+    { id = "Plate", name = "Plate", type = "Image", default = "../images/dusk.png", control = "ImageControl" },
   },
 }

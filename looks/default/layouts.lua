@@ -249,6 +249,35 @@ return {
         },
     },
 
+    -- The pattern chooser: the label over a row of square previews.
+    ["Controls.Pattern.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            label(),
+            { kind = "hbox", spacing = 4,
+                { name = "pattern1", width = 40, height = 40 },
+                { name = "pattern2", width = 40, height = 40 },
+                { name = "pattern3", width = 40, height = 40 },
+                { name = "pattern4", width = 40, height = 40 },
+                { name = "pattern5", width = 40, height = 40 },
+                { name = "pattern6", width = 40, height = 40 },
+                { kind = "stretch" },
+            },
+            expression(),
+        },
+    },
+
+    -- The image: the label and the image's size and channels in a row, the
+    -- thumbnail under them.
+    ["Controls.Image.Layout"] = {
+        { kind = "vbox", spacing = 2,
+            { kind = "hbox", spacing = 4,
+                label({ stretch = 1 }),
+                { name = "info", stretch = 1 },
+            },
+            { name = "thumbnail", height = 72 },
+        },
+    },
+
     -- A text or a folding header, indented by its nest level; the
     -- separator's line and the spacer's gap are hidden unless the variant
     -- shows them.

@@ -78,5 +78,8 @@ local space = { tool = T, input = "Gamut", child = "space" }
 orbane.Key(space, "Home")
 assert(orbane.GetValue(T, "Gamut").space == "Rec. 709" and orbane.GetValue(T, "Gamut").red[1] == 0.64)
 assert(orbane.State({ tool = T, input = "Gamut", child = "readout" }).text:find("R 0.6400 0.3300", 1, true))
-orbane.Grab("inspector", "/tmp/colour.png")
+-- The pattern and the image.
+orbane.Click({ tool = T, input = "Fill", child = "pattern5" })
+assert(orbane.GetValue(T, "Fill") == 4)
+assert(orbane.State({ tool = T, input = "Plate", child = "info" }).text:find("^%d+ x %d+, RGB"))
 print("colour: ok")

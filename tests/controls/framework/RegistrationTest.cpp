@@ -275,6 +275,7 @@ TEST(TagMaps, PublishedMapsAreWellFormed)
     published.insert({{"ColorControl", 6}, {"ColorWheelControl", 3}, {"GradientControl", 2}});
     published.insert({{"ColorSuppressionControl", 7}, {"ColorRangesControl", 4}, {"LevelsControl", 3}});
     published.insert({{"LevelsOutputControl", 3}, {"SplineControl", 21}});
+    published.insert({"PatternControl", 2});
     EXPECT_EQ(counts, published);
     const auto table = [](const char *type) { return FFITagMap::ForType(FFIType::FindScriptName(type))->Table(); };
     EXPECT_EQ(table("ComboIDControl"), table("ComboControl")) << "variants share their primary's table";

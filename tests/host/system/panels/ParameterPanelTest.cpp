@@ -154,29 +154,14 @@ private slots:
                 qPrintable(QString("control %1 wide in a view of %2").arg(c->width()).arg(panel.viewport()->width())));
     }
 
-    // An unknown class gets the fallback and a warning; a registered class
-    // whose control is not written yet shows its Input read-only, unwarned.
-    void fallbackShowsTheValueReadOnly_data()
-    {
-        QTest::addColumn<QString>("control");
-        QTest::addColumn<QString>("warning");
-        QTest::newRow("unknown class") << "NoSuchControl"
-                                       << "Input \"Blend Gain\" .*\"NoSuchControl\", which is unknown";
-        QTest::newRow("unwritten control") << "PatternControl"
-                                           << "";
-    }
-
+    // An unknown class gets the fallback, which shows its Input read-only, and a warning.
     void fallbackShowsTheValueReadOnly()
     {
-        QFETCH(QString, control);
-        QFETCH(QString, warning);
-        if (!warning.isEmpty())
-            QTest::ignoreMessage(QtWarningMsg, QRegularExpression(warning));
-        const QByteArray lua = QString(R"(return { inputs = { { id = "Gain", name = "Blend Gain", type = "Number",
-            default = 0.25, control = "%1" } }})")
-                                   .arg(control)
-                                   .toUtf8();
-        Shown s(lua.constData());
+        QTest::ignoreMessage(QtWarningMsg,
+                             QRegularExpression("Input \"Blend Gain\" .*\"NoSuchControl\", which is unknown"));
+        const char *lua = R"(return { inputs = { { id = "Gain", name = "Blend Gain", type = "Number",
+            default = 0.25, control = "NoSuchControl" } }})";
+        Shown s(lua);
         QCOMPARE(s.panel.Controls().size(), size_t(1));
         auto *fallback = dynamic_cast<FallbackControl *>(s.panel.Controls().front());
         QVERIFY(fallback);
