@@ -83,8 +83,10 @@ void *CDataPointer(lua_State *L, int idx)
 int ReleaseObject(lua_State *L)
 {
     if (lua_type(L, 1) == kTypeCData)
-        if (auto *obj = static_cast<ScriptObject *>(CDataPointer(L, 1)))
+        if (auto *obj = static_cast<ScriptObject *>(CDataPointer(L, 1))) {
+            LuaSandbox::Refund(L, obj->SizeOf());
             obj->DecRef();
+        }
     return 0;
 }
 
@@ -362,6 +364,8 @@ void LuaRuntime::PushObject(lua_State *L, ScriptObject *obj)
         return;
     }
     obj->IncRef();
+    // Charged to a content run while the script holds it.
+    LuaSandbox::Charge(L, obj->SizeOf());
     PushKey(L, kWrapKey);
     lua_pushlightuserdata(L, obj);
     lua_call(L, 1, 1);

@@ -2,6 +2,7 @@
 
 #include <luajit.h>
 
+#include <algorithm>
 #include <cstdlib>
 #include <set>
 #include <string>
@@ -221,6 +222,28 @@ lua_State *LuaSandbox::NewState()
     }
     luaL_openlibs(L);
     return L;
+}
+
+void LuaSandbox::Charge(lua_State *L, std::size_t bytes)
+{
+    Meter *meter = MeterOf(L);
+    if (!meter)
+        return;
+    meter->used += bytes;
+    if (!meter->cap || meter->used <= meter->cap)
+        return;
+    // Objects the script has let go of are paid back only when the collector
+    // finalises them, which Lua paces by its own small heap: collect before
+    // calling the run too big.
+    lua_gc(L, LUA_GCCOLLECT, 0);
+    if (meter->used > meter->cap)
+        meter->outOfMemory = true;
+}
+
+void LuaSandbox::Refund(lua_State *L, std::size_t bytes)
+{
+    if (Meter *meter = MeterOf(L))
+        meter->used -= std::min(bytes, meter->used);
 }
 
 void LuaSandbox::CloseState(lua_State *L)

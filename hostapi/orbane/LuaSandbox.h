@@ -47,6 +47,15 @@ public:
     // LoadFile and Call in one.
     static bool RunFile(lua_State *L, const std::string &path, int results, std::string *error);
 
+    // Host memory a script holds through its objects (a control it made),
+    // which Lua's allocator does not see: counted against the run's memory
+    // cap like Lua's own, so a loop that makes objects stops at the cap. Over
+    // the cap (after a collection) the run stops at its next instruction count check. Every
+    // Charge is paid back by one Refund of the same bytes when the script
+    // lets go. Nothing happens in a state that NewState did not make.
+    static void Charge(lua_State *L, std::size_t bytes);
+    static void Refund(lua_State *L, std::size_t bytes);
+
     // Lets content call the `orbane` function of this name. Only functions
     // that read or write the document (and so are undone like any edit) may
     // be allowed; none that touch files, load libraries or drive the window.

@@ -27,7 +27,7 @@ public:
     static void operator delete(void *, void *) noexcept {}
 
     // The number of bytes the factory allocated for this object.
-    virtual std::size_t SizeOf() const { return sizeof(Object); }
+    std::size_t SizeOf() const override { return sizeof(Object); }
     // Applies attributes; the base applies none.
     virtual bool SetAttrsTagList(const TagList &tags);
     // Writes a readable attribute through `out` and returns false (a value was
@@ -49,8 +49,7 @@ private:
 // The factory every registered class uses: allocates from the pool, returns
 // null where the pool gives nothing, and returns the memory if the
 // constructor throws before letting the exception pass.
-template <class T>
-ScriptObject *NewObject(const Registry *reg, const ScriptVal &args, const TagList &tags);
+template <class T> ScriptObject *NewObject(const Registry *reg, const ScriptVal &args, const TagList &tags);
 
 } // namespace Orbane
 

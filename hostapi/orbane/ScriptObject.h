@@ -2,6 +2,8 @@
 
 #include "orbane/Types.h"
 
+#include <cstddef>
+
 namespace Orbane {
 
 class ScriptInfo;
@@ -21,6 +23,8 @@ public:
 
     virtual void IncRef() noexcept {}
     virtual void DecRef() noexcept {}
+    // The bytes the object itself takes (what it owns besides not counted).
+    virtual std::size_t SizeOf() const { return sizeof(ScriptObject); }
     // The name scripts know this object's type by ("Input", "CheckboxControl").
     virtual const char *ScriptTypeName() const { return "Object"; }
     virtual const Registry *GetRegistry() const { return nullptr; }

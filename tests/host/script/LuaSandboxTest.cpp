@@ -1,5 +1,6 @@
 #include "orbane/LuaSandbox.h"
 #include "orbane/LuaRuntime.h"
+#include "orbane/ScriptObject.h"
 #include "orbane/ScriptVal.h"
 
 #include <gtest/gtest.h>
@@ -46,6 +47,24 @@ int RunItself(lua_State *L)
     return lua_error(L);
 }
 
+// A host object much larger than the Lua value that holds it, as a control is.
+class Bulky : public RefObject
+{
+public:
+    std::size_t SizeOf() const override { return sizeof(Bulky); }
+
+private:
+    char mPayload[4000] = {};
+};
+
+int MakeBulky(lua_State *L)
+{
+    auto *bulky = new Bulky;
+    LuaRuntime::PushObject(L, bulky);
+    bulky->DecRef();
+    return 1;
+}
+
 struct Case
 {
     const char *name;
@@ -59,6 +78,8 @@ protected:
     void SetUp() override
     {
         LuaRuntime::Instance().Reset();
+        LuaRuntime::Instance().AddModuleFunction("MakeBulky", MakeBulky);
+        LuaSandbox::AllowCall("MakeBulky");
         // Low limits keep the runs short under the sanitizers.
         LuaSandbox::SetLimits({1'000'000, std::size_t(32) << 20});
     }
@@ -137,6 +158,7 @@ const Case kLimits[] = {
     {"huge_rep", "local s = string.rep('x', 2 ^ 30)", "MB of memory"},
     {"pcall_swallows_memory", "local t = {}\nwhile true do pcall(function() t[#t + 1] = ('y'):rep(1e5) .. #t end) end",
      "MB of memory"},
+    {"host_objects_held", "local t = {}\nwhile true do t[#t + 1] = orbane.MakeBulky() end", "MB of memory"},
 };
 
 INSTANTIATE_TEST_SUITE_P(Limits, SandboxLimit, testing::ValuesIn(kLimits),
@@ -158,6 +180,13 @@ TEST_F(LuaSandboxTest, ContentStillComputes)
         assert(type(c) == "table")
     )"),
               "");
+}
+
+// Objects let go of are paid back: many times the cap made and dropped is fine.
+TEST_F(LuaSandboxTest, HostObjectsLetGoAreNotCounted)
+{
+    EXPECT_EQ(Content("for i = 1, 30000 do local o = orbane.MakeBulky() end"), "");
+    EXPECT_EQ(Content("local t = {}\nfor i = 1, 6000 do t[i] = orbane.MakeBulky() end"), "") << "24 MB held fits in 32";
 }
 
 TEST_F(LuaSandboxTest, EveryRunStartsFresh)
