@@ -34,7 +34,8 @@ int RaiseStoreError(lua_State *L, Input *input)
 }
 
 // orbane.SetKey(tool, input, value, time): animates the Input if it is not
-// yet (keeping its value as a key at the current time) and stores the key.
+// yet (keeping its value as a key at the current time) and stores the key,
+// both one undo step "Set Key", so that undo also takes back the animation.
 int SetKey(lua_State *L)
 {
     const LuaArgs args(L, "SetKey");
@@ -50,8 +51,11 @@ int SetKey(lua_State *L)
         return Hands::Raise(L, QString("Input \"%1\": %2").arg(input->GetName(), QString::fromStdString(why)));
     if (time <= TIME_UNDEFINED)
         return Hands::Raise(L, QString("Input \"%1\": a key needs a set time").arg(input->GetName()));
-    input->SetAnimated(true);
-    if (!input->SetValue(value.get(), time))
+    gDoc->StartUndo("Set Key");
+    input->Animate(true);
+    const bool stored = input->SetValue(value.get(), time);
+    gDoc->EndUndo(stored);
+    if (!stored)
         return RaiseStoreError(L, input);
     return 0;
 }

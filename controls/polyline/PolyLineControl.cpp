@@ -69,9 +69,9 @@ const LinkedInput<PolyLineControl> PolyLineControl::Links[] = {
 PolyLineControl::PolyLineControl(const Registry *reg, const ScriptVal &args, const TagList &tags)
     : HandleOverlay(reg, args, tags), mShapeBox(new ShapeBox(nullptr, args, TagList()))
 {
-    for (std::size_t i = 0; i < mCursors.size(); ++i)
-        mCursors[i] = QCursor(CursorShapes[i]);
-    mCurrentCursor = &mCursors[0];
+    for (std::size_t i = 0; i < mCursors->size(); ++i)
+        (*mCursors)[i] = QCursor(CursorShapes[i]);
+    mCurrentCursor = &(*mCursors)[0];
     PolyLineControl::SetAttrsTagList(nullptr, tags);
 }
 
@@ -214,7 +214,7 @@ void PolyLineControl::SetMode(uint8 mode)
 {
     mDrawMode = uint8((mDrawMode & 0xF0) | (mode & 0x0F));
     const uint8 now = ModeOf();
-    mCurrentCursor = &mCursors[now == PLM_ClickAppend ? 2 : now == PLM_DrawAppend ? 1 : 0];
+    mCurrentCursor = &(*mCursors)[now == PLM_ClickAppend ? 2 : now == PLM_DrawAppend ? 1 : 0];
 }
 
 bool PolyLineControl::GetAttrsTagList(TagList &tags) const
@@ -468,7 +468,8 @@ void PolyLineControl::DrawOnionSkins(GPainter &p, const PreviewInfo &info, const
         const AutoParam<PolyLine> skin(main, time);
         // The skins before now in their own colour, where one is set.
         const bool prev = time < now && !mSurface->settings.onionPrevColor.IsNone();
-        p.Color(prev ? GColor::FromOrb(mSurface->settings.onionPrevColor) : kOnionColor, info.GetShadow(OrbColor()).Faded(0.5f));
+        p.Color(prev ? GColor::FromOrb(mSurface->settings.onionPrevColor) : kOnionColor,
+                info.GetShadow(OrbColor()).Faded(0.5f));
         if (skin)
             PolyLineDrawing::DrawCurve(p, *skin, style.span);
     }

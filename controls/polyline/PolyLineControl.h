@@ -222,7 +222,8 @@ private:
     bool mCursorShown = false;
     QElapsedTimer mStrokeClock;
     ShapeBox *mShapeBox = nullptr; // one reference
-    std::array<QCursor, 8> mCursors;
+    // Held apart so that the control stays small enough for the script object pool.
+    std::unique_ptr<std::array<QCursor, 8>> mCursors = std::make_unique<std::array<QCursor, 8>>();
     const QCursor *mCurrentCursor = nullptr;
 
     // --- the command surface ---

@@ -153,9 +153,9 @@ uint64 PolyLineControl::ControlCommand(PreviewInfo *info, const OrbID &command, 
         // Over the shape box its part's cursor shows.
         const int32 boxCursor = IsAppending() ? -1 : mMouse.HoverCursor(*info);
         if (boxCursor >= 0)
-            mCurrentCursor = &mCursors[std::size_t(boxCursor)];
+            mCurrentCursor = &(*mCursors)[std::size_t(boxCursor)];
         else if (!IsAppending())
-            mCurrentCursor = &mCursors[0];
+            mCurrentCursor = &(*mCursors)[0];
         ShowCursor(*info, (IsAppending() && !(data & 1)) || boxCursor >= 0);
         return boxCursor >= 0 ? result | 1 : result;
     }

@@ -34,7 +34,8 @@ assert(orbane.State({ tool = T, input = "GlowRed", child = "hex" }).text == "#FF
 assert(not orbane.State({ tool = T, input = "GlowRed", child = "alpha" }).visible)
 assert(not orbane.State({ tool = T, input = "GlowRed", child = "pick" }).visible)
 
--- The picker samples the viewer's image in linear values.
+-- The picker samples the viewer's image in linear values, once its pixels are read.
+orbane.WaitImage()
 orbane.Click({ tool = T, input = "TintRed", child = "pick" })
 orbane.Click("viewer")
 local r, g, b = orbane.GetValue(T, "TintRed"), orbane.GetValue(T, "TintGreen"), orbane.GetValue(T, "TintBlue")

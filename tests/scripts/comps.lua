@@ -6,7 +6,14 @@ local here = debug.getinfo(1, "S").source:match("^@(.*/)") or "./"
 orbane.LoadComp(here .. "../../examples/demo.lua")
 check.eq(orbane.IsModified(), false, "the opened demo is unchanged")
 
--- A key on an Input that is not animated animates it with that one key.
+-- A key on an Input that is not animated animates it with that one key;
+-- undo takes back both.
+local plain = orbane.GetValue("Sliders1", "Blend")
+orbane.SetKey("Sliders1", "Blend", 0.3, 5)
+check.eq(orbane.UndoNames()[#orbane.UndoNames()], "Set Key", "one step")
+orbane.Undo()
+check.eq(#orbane.Keys("Sliders1", "Blend"), 0, "undo takes the animation back")
+check.eq(orbane.GetValue("Sliders1", "Blend"), plain, "and leaves the plain value")
 orbane.SetKey("Sliders1", "Blend", 0.2, 0)
 orbane.SetKey("Sliders1", "Blend", 0.8, 10)
 orbane.SetKey("Sliders1", "Blend", 0.4, 20)

@@ -131,7 +131,7 @@ void ExpectPooledObjectOfItsKind(const Registry *reg)
     }
     const std::size_t size = dynamic_cast<Object &>(*obj).SizeOf();
     EXPECT_GE(size, input ? sizeof(InputControl) : sizeof(PreviewControl));
-    ASSERT_NE(Reuser::ClassSize(size), 0u) << "small enough to be pooled";
+    ASSERT_NE(Reuser::ClassSize(size), 0u) << size << " bytes: small enough to be pooled";
     void *address = obj.get();
     const std::size_t waiting = Reuser::FreeBlocks(size);
     obj.reset();

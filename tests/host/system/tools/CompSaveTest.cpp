@@ -141,8 +141,9 @@ protected:
             ASSERT_TRUE(v) << why;
             ASSERT_TRUE(in.SetValue(v.get(), 0.0));
         }
-        if (c.expression)
+        if (c.expression) {
             ASSERT_TRUE(in.SetExpression(c.expression, 0, &why)) << why;
+        }
         if (!c.keys)
             return;
         in.SetAnimated(true);
