@@ -324,9 +324,11 @@ void ViewerPanel::OnImageCleared()
 }
 
 // The one place the viewer's linear pixels change: what is published is
-// what the viewer holds.
+// what the viewer holds. Nothing after nothing is no change to tell of.
 void ViewerPanel::SetLinear(const FloatImage &linear)
 {
+    if (linear.IsNull() && mLinear.IsNull())
+        return;
     mLinear = linear;
     ViewedImage::Instance().Set(mLinear);
 }
