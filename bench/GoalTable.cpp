@@ -40,6 +40,8 @@ const std::vector<Goal> &Goals()
         {"H2", "curve graph repaint while a point is dragged", "BM_CurveGraph_DragRepaint", nullptr, 1.0, ""},
         {"C1", "inspector build, 200 colour controls (four channel Inputs each)", "BM_Inspector_BuildColours/200",
          "BM_StockColourRows_Build/200", 1.0, "stock Qt rows"},
+        {"C2", "decode a 1080p 8-bit sRGB image through the table OpenColorIO fills once", "BM_Srgb8Decode_Table",
+         "BM_Srgb8Decode_Processor", 0.2, "OpenColorIO's processor over every value"},
     };
     return goals;
 }

@@ -3,7 +3,7 @@
 #include "widgets/CurveGraph.h"
 #include "widgets/Histogram.h"
 
-#include "orbane/ViewedImage.h"
+#include "orbane/FloatImage.h"
 
 #include <benchmark/benchmark.h>
 
@@ -14,23 +14,20 @@
 
 namespace {
 
-Orbane::FloatRGBAImage NoiseImage(int width, int height)
+Orbane::FloatImage NoiseImage(int width, int height)
 {
-    Orbane::FloatRGBAImage image;
-    image.width = width;
-    image.height = height;
-    image.rgba.resize(image.PixelCount() * 4);
+    std::vector<float> rgba(std::size_t(width) * std::size_t(height) * 4);
     std::mt19937 random(7);
     std::uniform_real_distribution<float> value(-0.1f, 1.2f);
-    for (float &v : image.rgba)
+    for (float &v : rgba)
         v = value(random);
-    return image;
+    return Orbane::FloatImage(width, height, 4, std::move(rgba));
 }
 
 // Shared out over the machine's threads, as the histogram feed counts.
 void BM_Histogram_4K(benchmark::State &state)
 {
-    static const Orbane::FloatRGBAImage image = NoiseImage(3840, 2160);
+    static const Orbane::FloatImage image = NoiseImage(3840, 2160);
     const int threads = std::max(1, QThread::idealThreadCount());
     for (auto _ : state)
         benchmark::DoNotOptimize(Orbane::Histogram::CountParallel(image, threads));
@@ -40,9 +37,9 @@ BENCHMARK(BM_Histogram_4K)->Unit(benchmark::kMillisecond)->UseRealTime();
 // The same on one thread: what the sharing saves.
 void BM_Histogram_4K_OneThread(benchmark::State &state)
 {
-    static const Orbane::FloatRGBAImage image = NoiseImage(3840, 2160);
+    static const Orbane::FloatImage image = NoiseImage(3840, 2160);
     for (auto _ : state)
-        benchmark::DoNotOptimize(Orbane::Histogram::Count(image.rgba.data(), image.PixelCount()));
+        benchmark::DoNotOptimize(Orbane::Histogram::Count(image));
 }
 BENCHMARK(BM_Histogram_4K_OneThread)->Unit(benchmark::kMillisecond)->UseRealTime();
 

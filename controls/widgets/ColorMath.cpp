@@ -1,5 +1,7 @@
 #include "widgets/ColorMath.h"
 
+#include "orbane/ColourSpaces.h"
+
 #include <algorithm>
 #include <cmath>
 
@@ -111,16 +113,6 @@ const char *ModelName(int32 model)
     return model == Model_HLS ? "HLS" : model == Model_YUV ? "YUV" : "HSV";
 }
 
-float64 SrgbToLinear(float64 v)
-{
-    return v <= 0.04045 ? v / 12.92 : std::pow((v + 0.055) / 1.055, 2.4);
-}
-
-float64 LinearToSrgb(float64 v)
-{
-    return v <= 0.0031308 ? v * 12.92 : 1.055 * std::pow(v, 1.0 / 2.4) - 0.055;
-}
-
 float64 Clip(float64 v)
 {
     return std::isnan(v) ? 0.0 : std::clamp(v, 0.0, 1.0);
@@ -128,12 +120,14 @@ float64 Clip(float64 v)
 
 QColor ToDisplay(const ColorRGBA &c)
 {
-    return QColor::fromRgbF(LinearToSrgb(Clip(c.r)), LinearToSrgb(Clip(c.g)), LinearToSrgb(Clip(c.b)), Clip(c.a));
+    return QColor::fromRgbF(ColourSpaces::LinearToSrgb(Clip(c.r)), ColourSpaces::LinearToSrgb(Clip(c.g)),
+                            ColourSpaces::LinearToSrgb(Clip(c.b)), Clip(c.a));
 }
 
 ColorRGBA FromQColor(const QColor &q)
 {
-    return {SrgbToLinear(q.redF()), SrgbToLinear(q.greenF()), SrgbToLinear(q.blueF()), q.alphaF()};
+    return {ColourSpaces::SrgbToLinear(q.redF()), ColourSpaces::SrgbToLinear(q.greenF()),
+            ColourSpaces::SrgbToLinear(q.blueF()), q.alphaF()};
 }
 
 QString ToHex(const ColorRGBA &c, bool withAlpha)
@@ -156,9 +150,9 @@ bool FromHex(const QString &text, ColorRGBA &out)
     const int a = n == 8 ? HexDigits(t, 6, 2) : 0;
     if (r < 0 || g < 0 || b < 0 || a < 0)
         return false;
-    out.r = SrgbToLinear(r / 255.0);
-    out.g = SrgbToLinear(g / 255.0);
-    out.b = SrgbToLinear(b / 255.0);
+    out.r = ColourSpaces::SrgbToLinear(r / 255.0);
+    out.g = ColourSpaces::SrgbToLinear(g / 255.0);
+    out.b = ColourSpaces::SrgbToLinear(b / 255.0);
     if (n == 8)
         out.a = a / 255.0;
     return true;

@@ -56,10 +56,6 @@ QString ToHex(const ColorRGBA &c, bool withAlpha);
 // not such a text. Without alpha digits the alpha of `out` stays.
 bool FromHex(const QString &text, ColorRGBA &out);
 
-// The sRGB transfer function: an 8-bit display value to linear light and back.
-float64 SrgbToLinear(float64 v);
-float64 LinearToSrgb(float64 v);
-
 // One channel clipped for the screen: NaN shows as 0, the rest clamps to 0..1.
 float64 Clip(float64 v);
 // What a swatch paints: the clipped colour sRGB-encoded, straight alpha.

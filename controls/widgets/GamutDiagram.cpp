@@ -1,7 +1,6 @@
 #include "widgets/GamutDiagram.h"
 
-#include "widgets/ColorMath.h"
-
+#include "orbane/ColourSpaces.h"
 #include "orbane/ScriptVal.h"
 #include "orbane/TagList.h"
 
@@ -10,8 +9,9 @@
 #include <QPainter>
 #include <QPainterPath>
 
-#include <array>
+#include <algorithm>
 #include <cmath>
+#include <vector>
 
 namespace Orbane {
 
@@ -33,60 +33,32 @@ QPainterPath LocusPath(const QRectF &plot)
     return path;
 }
 
-using Matrix = std::array<std::array<float64, 3>, 3>;
-
-Matrix Inverse(const Matrix &m)
+// CIE XYZ at Y = 1 of a chromaticity; nothing below the x axis.
+void XyzOf(XY xy, float *xyz)
 {
-    const float64 det = m[0][0] * (m[1][1] * m[2][2] - m[1][2] * m[2][1]) -
-                        m[0][1] * (m[1][0] * m[2][2] - m[1][2] * m[2][0]) +
-                        m[0][2] * (m[1][0] * m[2][1] - m[1][1] * m[2][0]);
-    Matrix r{};
-    for (int32 i = 0; i < 3; ++i)
-        for (int32 j = 0; j < 3; ++j) {
-            // The cofactor of (j, i), by cyclic indices.
-            const int32 a = (j + 1) % 3, b = (j + 2) % 3, c = (i + 1) % 3, d = (i + 2) % 3;
-            r[size_t(i)][size_t(j)] = (m[size_t(a)][size_t(c)] * m[size_t(b)][size_t(d)] -
-                                       m[size_t(a)][size_t(d)] * m[size_t(b)][size_t(c)]) /
-                                      det;
-        }
-    return r;
-}
-
-// XYZ to linear RGB of a gamut, derived from its primaries and white point
-// (the usual construction: primaries as columns, scaled so that RGB 1, 1, 1
-// is the white at Y = 1), so no matrix is typed in by hand.
-Matrix XyzToRgb(const Chromaticity::Gamut &g)
-{
-    const auto column = [](XY p) { return std::array<float64, 3>{p.x / p.y, 1.0, (1.0 - p.x - p.y) / p.y}; };
-    const std::array<float64, 3> cr = column(g.red), cg = column(g.green), cb = column(g.blue), w = column(g.white);
-    const Matrix primaries{{{cr[0], cg[0], cb[0]}, {cr[1], cg[1], cb[1]}, {cr[2], cg[2], cb[2]}}};
-    const Matrix inv = Inverse(primaries);
-    Matrix m{};
-    for (size_t i = 0; i < 3; ++i) {
-        const float64 scale = inv[i][0] * w[0] + inv[i][1] * w[1] + inv[i][2] * w[2];
-        for (size_t row = 0; row < 3; ++row)
-            m[row][i] = primaries[row][i] * scale;
+    if (xy.y <= 0.0) {
+        std::fill_n(xyz, 3, 0.0f);
+        return;
     }
-    return Inverse(m);
+    xyz[0] = float(xy.x / xy.y);
+    xyz[1] = 1.0f;
+    xyz[2] = float((1.0 - xy.x - xy.y) / xy.y);
 }
 
-// A picture of the colour at xy through linear Rec. 709, negative channels
-// dropped and normalised to the largest: a map of hues, not a measurement.
-QRgb ColourAt(XY xy)
+// A picture of a linear Rec. 709 colour, in place: negative channels
+// dropped and normalised to the largest, a map of hues, not a measurement.
+void Normalise(float *rgb)
 {
-    static const Matrix toRgb = [] {
-        Chromaticity::Gamut rec709;
-        Chromaticity::StandardGamut("Rec. 709", rec709);
-        return XyzToRgb(rec709);
-    }();
-    if (xy.y <= 0.0)
-        return qRgb(0, 0, 0);
-    const std::array<float64, 3> xyz{xy.x / xy.y, 1.0, (1.0 - xy.x - xy.y) / xy.y};
-    float64 rgb[3];
-    for (size_t i = 0; i < 3; ++i)
-        rgb[i] = std::max(0.0, toRgb[i][0] * xyz[0] + toRgb[i][1] * xyz[1] + toRgb[i][2] * xyz[2]);
-    const float64 m = std::max({rgb[0], rgb[1], rgb[2], 1e-9});
-    return ColorMath::ToDisplay({rgb[0] / m, rgb[1] / m, rgb[2] / m, 1.0}).rgb();
+    for (int32 c = 0; c < 3; ++c)
+        rgb[c] = std::max(0.0f, rgb[c]);
+    const float m = std::max({rgb[0], rgb[1], rgb[2], 1e-9f});
+    for (int32 c = 0; c < 3; ++c)
+        rgb[c] /= m;
+}
+
+int32 Code8(float encoded)
+{
+    return int32(std::lround(std::clamp(encoded, 0.0f, 1.0f) * 255.0f));
 }
 
 } // namespace
@@ -146,10 +118,22 @@ const QImage &GamutDiagram::Fill(const QRectF &plot, qreal ratio)
         return mFill;
     mFill = QImage(size, QImage::Format_ARGB32_Premultiplied);
     mFill.fill(Qt::transparent);
+    // Every pixel's XYZ, converted in one pass.
+    std::vector<float> colours(std::size_t(size.width()) * std::size_t(size.height()) * 3);
+    float *at = colours.data();
+    for (int32 y = 0; y < size.height(); ++y)
+        for (int32 x = 0; x < size.width(); ++x, at += 3)
+            XyzOf(FromPixel(QPointF((x + 0.5) / ratio, (y + 0.5) / ratio), plot), at);
+    const std::size_t count = colours.size() / 3;
+    ColourSpaces::XyzToRec709(colours.data(), count);
+    for (std::size_t i = 0; i < count; ++i)
+        Normalise(&colours[3 * i]);
+    ColourSpaces::LinearToSrgb(colours.data(), count, 3, false);
+    at = colours.data();
     for (int32 y = 0; y < size.height(); ++y) {
         auto *line = reinterpret_cast<QRgb *>(mFill.scanLine(y));
-        for (int32 x = 0; x < size.width(); ++x)
-            line[x] = ColourAt(FromPixel(QPointF((x + 0.5) / ratio, (y + 0.5) / ratio), plot));
+        for (int32 x = 0; x < size.width(); ++x, at += 3)
+            line[x] = qRgb(Code8(at[0]), Code8(at[1]), Code8(at[2]));
     }
     // Only the inside of the locus keeps its colour.
     QImage mask(size, QImage::Format_ARGB32_Premultiplied);

@@ -1,6 +1,6 @@
 #include "widgets/Histogram.h"
 
-#include "orbane/ViewedImage.h"
+#include "orbane/FloatImage.h"
 
 #include <algorithm>
 #include <cmath>
@@ -12,11 +12,59 @@ namespace {
 
 // Rec. 709 luma coefficients (ITU-R BT.709-6, item 3.2).
 constexpr float kLumaR = 0.2126f, kLumaG = 0.7152f, kLumaB = 0.0722f;
+// Pixels whose bins are found before they are counted: finding is plain
+// arithmetic that the compiler turns into vector code, counting is not.
+constexpr std::size_t kChunk = 512;
 
-inline std::size_t BinOf(float v, float scale, float last)
+inline int32 BinOf(float v, float scale, float last)
 {
     // max first: NaN compares false and leaves 0.
-    return std::size_t(std::min(std::max(0.0f, v * scale), last));
+    return int32(std::min(std::max(0.0f, v * scale), last));
+}
+
+// Counts `pixels` pixels of C channels: grey spreads over red, green and
+// blue, a missing alpha is 1.
+template <int C>
+void CountPixels(const float *p, std::size_t pixels, float scale, float last, uint32 *const (&counts)[5])
+{
+    int32 bins[5][kChunk];
+    while (pixels > 0) {
+        const std::size_t n = std::min(pixels, kChunk);
+        for (std::size_t i = 0; i < n; ++i) {
+            const float *q = p + i * C;
+            const float r = q[0], g = q[C >= 3 ? 1 : 0], b = q[C >= 3 ? 2 : 0];
+            const float a = C == 2 ? q[1] : C == 4 ? q[3] : 1.0f;
+            bins[0][i] = BinOf(r, scale, last);
+            bins[1][i] = BinOf(g, scale, last);
+            bins[2][i] = BinOf(b, scale, last);
+            bins[3][i] = BinOf(a, scale, last);
+            bins[4][i] = BinOf(kLumaR * r + kLumaG * g + kLumaB * b, scale, last);
+        }
+        for (int c = 0; c < 5; ++c)
+            for (std::size_t i = 0; i < n; ++i)
+                ++counts[c][bins[c][i]];
+        p += n * C;
+        pixels -= n;
+    }
+}
+
+// Counts the rows first .. first + rows - 1 of `image` in `bins` bins.
+void CountRows(const FloatImage &image, int32 first, int32 rows, int32 bins, uint32 *const (&counts)[5])
+{
+    const std::size_t rowValues = std::size_t(image.Width()) * std::size_t(image.Channels());
+    const float *p = image.Pixels() + std::size_t(first) * rowValues;
+    const std::size_t pixels = std::size_t(image.Width()) * std::size_t(rows);
+    const float scale = float(bins), last = float(bins - 1);
+    switch (image.Channels()) {
+    case 1:
+        return CountPixels<1>(p, pixels, scale, last, counts);
+    case 2:
+        return CountPixels<2>(p, pixels, scale, last, counts);
+    case 3:
+        return CountPixels<3>(p, pixels, scale, last, counts);
+    default:
+        return CountPixels<4>(p, pixels, scale, last, counts);
+    }
 }
 
 } // namespace
@@ -27,36 +75,34 @@ Histogram::Histogram(int32 bins) : mBins(std::max(1, bins))
         counts.assign(std::size_t(mBins), 0);
 }
 
-Histogram Histogram::Count(const float *rgba, std::size_t pixelCount, int32 bins)
+Histogram Histogram::CountBand(const FloatImage &image, int32 first, int32 rows, int32 bins)
 {
     Histogram h(bins);
-    const float scale = float(h.mBins), last = float(h.mBins - 1);
-    uint32 *r = h.mCounts[Red].data(), *g = h.mCounts[Green].data(), *b = h.mCounts[Blue].data();
-    uint32 *a = h.mCounts[Alpha].data(), *l = h.mCounts[Luma].data();
-    for (std::size_t i = 0; i < pixelCount; ++i, rgba += 4) {
-        ++r[BinOf(rgba[0], scale, last)];
-        ++g[BinOf(rgba[1], scale, last)];
-        ++b[BinOf(rgba[2], scale, last)];
-        ++a[BinOf(rgba[3], scale, last)];
-        ++l[BinOf(kLumaR * rgba[0] + kLumaG * rgba[1] + kLumaB * rgba[2], scale, last)];
-    }
-    h.mPixels = pixelCount;
+    if (image.IsNull() || rows <= 0)
+        return h;
+    uint32 *const counts[5] = {h.mCounts[Red].data(), h.mCounts[Green].data(), h.mCounts[Blue].data(),
+                               h.mCounts[Alpha].data(), h.mCounts[Luma].data()};
+    CountRows(image, first, rows, h.mBins, counts);
+    h.mPixels = uint64(image.Width()) * uint64(rows);
     return h;
 }
 
-Histogram Histogram::CountParallel(const FloatRGBAImage &image, int32 threads, int32 bins)
+Histogram Histogram::Count(const FloatImage &image, int32 bins)
 {
-    const std::size_t pixels = image.PixelCount();
-    const std::size_t parts = std::size_t(std::max(1, threads));
-    const std::size_t step = (pixels + parts - 1) / parts;
+    return CountBand(image, 0, image.Height(), bins);
+}
+
+Histogram Histogram::CountParallel(const FloatImage &image, int32 threads, int32 bins)
+{
+    const int32 height = image.Height();
+    const int32 parts = std::clamp(threads, 1, std::max(1, height));
+    const int32 step = (height + parts - 1) / std::max(1, parts);
     std::vector<std::future<Histogram>> others;
-    for (std::size_t start = step; start < pixels; start += step) {
-        const std::size_t count = std::min(step, pixels - start);
-        others.push_back(std::async(std::launch::async, [&image, start, count, bins] {
-            return Count(image.rgba.data() + start * 4, count, bins);
+    for (int32 first = step; first < height; first += step)
+        others.push_back(std::async(std::launch::async, [&image, first, step, height, bins] {
+            return CountBand(image, first, std::min(step, height - first), bins);
         }));
-    }
-    Histogram total = Count(image.rgba.data(), std::min(step, pixels), bins);
+    Histogram total = CountBand(image, 0, std::min(step, height), bins);
     for (auto &other : others)
         total.Add(other.get());
     return total;

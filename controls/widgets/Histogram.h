@@ -7,12 +7,14 @@
 
 namespace Orbane {
 
-struct FloatRGBAImage;
+class FloatImage;
 
 // Counts of an image's values per channel, in equal bins over 0..1. Values
 // below 0 fall in the first bin, above 1 in the last (HDR values pile up at
 // the top, where the user sees them), and NaN in the first. Luminance is
-// the Rec. 709 weighting of red, green and blue.
+// the Rec. 709 weighting of red, green and blue. The values counted are the
+// image's as stored: linear light, premultiplied; a grey image counts its
+// grey as red, green and blue, one without alpha counts alpha 1.
 class Histogram
 {
 public:
@@ -31,10 +33,10 @@ public:
 
     explicit Histogram(int32 bins = kDefaultBins);
 
-    // Counts `pixelCount` pixels of four floats each.
-    static Histogram Count(const float *rgba, std::size_t pixelCount, int32 bins = kDefaultBins);
-    // The same, shared out over `threads` threads (at least one).
-    static Histogram CountParallel(const FloatRGBAImage &image, int32 threads, int32 bins = kDefaultBins);
+    // Counts every pixel of `image` (none of a null one).
+    static Histogram Count(const FloatImage &image, int32 bins = kDefaultBins);
+    // The same, its rows shared out over `threads` threads (at least one).
+    static Histogram CountParallel(const FloatImage &image, int32 threads, int32 bins = kDefaultBins);
 
     int32 Bins() const noexcept { return mBins; }
     uint64 Pixels() const noexcept { return mPixels; }
@@ -49,6 +51,9 @@ public:
     void Add(const Histogram &other);
 
 private:
+    // Counts the rows first .. first + rows - 1.
+    static Histogram CountBand(const FloatImage &image, int32 first, int32 rows, int32 bins);
+
     int32 mBins;
     uint64 mPixels = 0;
     std::array<std::vector<uint32>, ChannelCount> mCounts;

@@ -38,17 +38,16 @@ void HistogramFeed::Refresh()
     if (viewed.Serial() == mCountedSerial)
         return;
     mCountedSerial = viewed.Serial();
-    const QImage image = viewed.Image();
+    const FloatImage image = viewed.Image();
     const uint64 serial = mCountedSerial;
-    if (std::size_t(image.width()) * std::size_t(image.height()) <= Histogram::kSmallImage) {
-        const FloatRGBAImage pixels = ViewedImage::ToFloatRGBA(image);
-        Take(serial, std::make_shared<Histogram>(Histogram::Count(pixels.rgba.data(), pixels.PixelCount())));
+    if (std::size_t(image.Width()) * std::size_t(image.Height()) <= Histogram::kSmallImage) {
+        Take(serial, std::make_shared<Histogram>(Histogram::Count(image)));
         return;
     }
+    // The copy shares the pixels, which nobody changes once made.
     mPool.start([this, image, serial] {
-        const FloatRGBAImage pixels = ViewedImage::ToFloatRGBA(image);
         auto counted = std::make_shared<const Histogram>(
-            Histogram::CountParallel(pixels, std::max(1, QThread::idealThreadCount())));
+            Histogram::CountParallel(image, std::max(1, QThread::idealThreadCount())));
         QMetaObject::invokeMethod(
             this, [this, serial, counted] { Take(serial, counted); }, Qt::QueuedConnection);
     });

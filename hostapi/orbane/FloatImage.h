@@ -42,12 +42,13 @@ public:
     // For the screen: sRGB-encoded 8 bits, values clamped to 0..1 (no
     // exposure or tone mapping: what is above 1 shows white).
     QImage ToDisplay() const;
-    // An 8-bit image as read for the screen, its sRGB values made linear.
+    // An 8-bit image as read for the screen, its sRGB values made linear
+    // (ColourSpaces::Srgb8ToLinear).
     static FloatImage FromDisplay(const QImage &image);
 
-    static float SrgbToLinear(float encoded);
-    // The nearest 8-bit code of a linear value, exact for every value
-    // SrgbToLinear gives for a code: 8-bit files show as they were.
+    // The nearest 8-bit sRGB code of a linear value, exact for every value
+    // ColourSpaces::Srgb8ToLinear gives for a code: 8-bit files show as
+    // they were.
     static uint8 LinearToSrgb8(float linear);
 
 private:

@@ -82,9 +82,11 @@ public:
     // passes; true where no read is under way any more. For headless runs
     // and tests: a window never needs to wait.
     bool WaitForImage(int32 timeoutMs);
-    // The pixels shown, as linear light (colour pickers, histograms); null
-    // with no image.
-    const FloatImage &LinearImage() const;
+    // The pixels shown, as linear light: a file's values as read, an image
+    // set from Qt decoded from sRGB (ColourSpaces). Colour pickers sample
+    // it and the histograms count it (published as ViewedImage); null with
+    // no image.
+    const FloatImage &LinearImage() const { return mLinear; }
     // Reads the file now, on this thread. False where it cannot be read;
     // what was shown stays.
     bool LoadImage(const QString &path);
@@ -92,11 +94,10 @@ public:
     void SetImage(const QImage &image);
     bool HasImage() const;
     QSize ImageSize() const;
-    // The average of the image's pixels within `pixels` (the image's own
-    // grid, row 0 at the top; clipped to the image) as linear RGBA: 8-bit
-    // channels are decoded from sRGB, alpha is taken as it is. False, with
-    // `rgba` untouched, where no image pixel lies inside. What colour
-    // pickers sample, whatever the image's storage.
+    // The average of LinearImage's pixels within `pixels` (the image's own
+    // grid, row 0 at the top; clipped to the image) as straight linear
+    // RGBA. False, with `rgba` untouched, where no image pixel lies inside.
+    // What colour pickers sample, whatever the image's storage.
     bool SampleLinear(const QRect &pixels, std::array<float64, 4> &rgba) const;
     // The width of one image pixel over its height; the view refits. Not
     // positive or not a number: 1.
@@ -190,6 +191,7 @@ private:
     void OnSizeKnown(QSize size);
     void OnImageReady(const QImage &display, const FloatImage &linear);
     void OnImageCleared();
+    void SetLinear(const FloatImage &linear);
     void SendAll(const OrbID &command, uint64 data);
     void RequestRedraw();
     void DrawPass(int32 pass, bool active);
@@ -209,9 +211,8 @@ private:
     Operator *mTool = nullptr;
     std::vector<PreviewControl *> mOverlays; // one reference each
     std::unique_ptr<ViewerBackdrop> mBackdrop;
-    ViewerImageFeed *mFeed;     // a child
-    mutable FloatImage mLinear; // made from the shown image when it came from Qt
-    mutable bool mLinearStale = false;
+    ViewerImageFeed *mFeed; // a child
+    FloatImage mLinear;     // what is shown, as linear light
     std::unique_ptr<HoverIndex> mHoverIndex;
     bool mPlainHover = false;
     int32 mHoverAsked = 0;

@@ -1,5 +1,7 @@
 #include "orbane/FloatImage.h"
 
+#include "orbane/ColourSpaces.h"
+
 #include <algorithm>
 #include <cmath>
 
@@ -8,27 +10,18 @@ namespace Orbane {
 namespace {
 
 // The linear values halfway between neighbouring 8-bit codes: the code of a
-// value is how many of them lie at or below it.
+// value is how many of them lie at or below it. Searching these is the same
+// as encoding and rounding, at a fraction of the cost of the curve's power.
 const std::array<float, 255> &CodeThresholds()
 {
     static const std::array<float, 255> thresholds = [] {
         std::array<float, 255> t{};
         for (int i = 0; i < 255; ++i)
-            t[i] = FloatImage::SrgbToLinear((i + 0.5f) / 255.0f);
+            t[std::size_t(i)] = (float(i) + 0.5f) / 255.0f;
+        ColourSpaces::SrgbToLinear(t.data(), t.size(), 1, false);
         return t;
     }();
     return thresholds;
-}
-
-const std::array<float, 256> &CodeToLinear()
-{
-    static const std::array<float, 256> table = [] {
-        std::array<float, 256> t{};
-        for (int i = 0; i < 256; ++i)
-            t[i] = FloatImage::SrgbToLinear(i / 255.0f);
-        return t;
-    }();
-    return table;
 }
 
 uint8 Alpha8(float alpha)
@@ -125,23 +118,19 @@ FloatImage FloatImage::FromDisplay(const QImage &image)
     const QImage straight = image.convertToFormat(QImage::Format_RGBA8888);
     const int32 channels = alpha ? 4 : 3;
     std::vector<float> pixels(std::size_t(image.width()) * image.height() * channels);
+    const std::array<float, 256> &toLinear = ColourSpaces::Srgb8ToLinear();
     float *out = pixels.data();
     for (int32 y = 0; y < straight.height(); ++y) {
         const uchar *row = straight.constScanLine(y);
         for (int32 x = 0; x < straight.width(); ++x, out += channels) {
             const float a = row[4 * x + 3] / 255.0f;
             for (int c = 0; c < 3; ++c)
-                out[c] = CodeToLinear()[row[4 * x + c]] * (alpha ? a : 1.0f);
+                out[c] = toLinear[row[4 * x + c]] * (alpha ? a : 1.0f);
             if (alpha)
                 out[3] = a;
         }
     }
     return FloatImage(image.width(), image.height(), channels, std::move(pixels));
-}
-
-float FloatImage::SrgbToLinear(float encoded)
-{
-    return encoded <= 0.04045f ? encoded / 12.92f : std::pow((encoded + 0.055f) / 1.055f, 2.4f);
 }
 
 uint8 FloatImage::LinearToSrgb8(float linear)

@@ -1,5 +1,7 @@
 #include "orbane/ImageFile.h"
 
+#include "orbane/ColourSpaces.h"
+
 #include <OpenImageIO/imageio.h>
 
 #include <QFileInfo>
@@ -77,25 +79,29 @@ bool IsEncoded(const OIIO::ImageSpec &desc)
     return !desc.format.is_floating_point();
 }
 
-// Read values to premultiplied linear light, in place.
+// Colour values of pixels with alpha multiplied by it, or divided by it
+// (colour under no alpha is lost either way: 0).
+void ScaleByAlpha(std::vector<float> &pixels, int channels, bool divide)
+{
+    for (std::size_t i = 0; i < pixels.size(); i += std::size_t(channels)) {
+        float *p = &pixels[i];
+        const float a = p[channels - 1];
+        for (int c = 0; c < channels - 1; ++c)
+            p[c] = divide ? (a > 0.0f ? p[c] / a : 0.0f) : p[c] * a;
+    }
+}
+
+// Read values to premultiplied linear light, in place. The sRGB curve
+// applies to straight colour.
 void MakeLinear(std::vector<float> &pixels, int channels, bool encoded, bool straight)
 {
     const bool alpha = channels == 2 || channels == 4;
-    const int colours = alpha ? channels - 1 : channels;
-    for (std::size_t i = 0; i < pixels.size(); i += std::size_t(channels)) {
-        float *p = &pixels[i];
-        const float a = alpha ? p[channels - 1] : 1.0f;
-        for (int c = 0; c < colours; ++c) {
-            float v = p[c];
-            if (encoded && !straight)
-                v = a > 0.0f ? v / a : 0.0f;
-            if (encoded)
-                v = FloatImage::SrgbToLinear(v);
-            if (encoded || straight)
-                v *= a;
-            p[c] = v;
-        }
-    }
+    if (alpha && encoded && !straight)
+        ScaleByAlpha(pixels, channels, true);
+    if (encoded)
+        ColourSpaces::SrgbToLinear(pixels.data(), pixels.size() / std::size_t(channels), channels, alpha);
+    if (alpha && (encoded || straight))
+        ScaleByAlpha(pixels, channels, false);
 }
 
 // Rows read between progress reports: small enough for a smooth bar, large

@@ -264,15 +264,6 @@ bool ViewerPanel::WaitForImage(int32 timeoutMs)
     return !ImageState().loading;
 }
 
-const FloatImage &ViewerPanel::LinearImage() const
-{
-    if (mLinearStale) {
-        mLinear = FloatImage::FromDisplay(mBackdrop->Image());
-        mLinearStale = false;
-    }
-    return mLinear;
-}
-
 bool ViewerPanel::LoadImage(const QString &path)
 {
     return mFeed->LoadNow(path, nullptr);
@@ -283,9 +274,7 @@ void ViewerPanel::SetImage(const QImage &image)
     mFeed->Forget();
     mBackdrop->SetPlaceholderSize(QSize());
     mBackdrop->SetImage(image);
-    mLinear = FloatImage();
-    mLinearStale = !image.isNull();
-    ViewedImage::Instance().Set(image);
+    SetLinear(FloatImage::FromDisplay(image));
     mUserView = false;
     FitImage();
     SendAll(CCMD_ImageChanged, 0);
@@ -301,8 +290,7 @@ void ViewerPanel::OnSizeKnown(QSize size)
         return;
     mBackdrop->SetImage(QImage());
     mBackdrop->SetPlaceholderSize(size);
-    mLinear = FloatImage();
-    mLinearStale = false;
+    SetLinear(FloatImage());
     if (!sameSize)
         FitImage();
     SendAll(CCMD_ImageChanged, 0);
@@ -314,9 +302,7 @@ void ViewerPanel::OnImageReady(const QImage &display, const FloatImage &linear)
 {
     const bool refit = display.size() != ImageSize();
     mBackdrop->SetImage(display);
-    mLinear = linear;
-    mLinearStale = false;
-    ViewedImage::Instance().Set(display);
+    SetLinear(linear);
     if (refit)
         FitImage();
     SendAll(CCMD_ImageChanged, 0);
@@ -330,13 +316,21 @@ void ViewerPanel::OnImageCleared()
     const QSize size = ImageState().source.isEmpty() ? QSize() : ImageSize();
     mBackdrop->SetImage(QImage());
     mBackdrop->SetPlaceholderSize(size);
-    mLinear = FloatImage();
-    mLinearStale = false;
-    ViewedImage::Instance().Set(QImage());
+    SetLinear(FloatImage());
     if (ImageSize() != QSize(Mapping().ImageWidth(), Mapping().ImageHeight()))
         FitImage();
     SendAll(CCMD_ImageChanged, 0);
     RequestRedraw();
+}
+
+// The one place the viewer's linear pixels change: what is published is
+// what the viewer holds. Nothing after nothing is no change to tell of.
+void ViewerPanel::SetLinear(const FloatImage &linear)
+{
+    if (linear.IsNull() && mLinear.IsNull())
+        return;
+    mLinear = linear;
+    ViewedImage::Instance().Set(mLinear);
 }
 
 bool ViewerPanel::HasImage() const

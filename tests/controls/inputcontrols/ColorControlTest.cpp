@@ -1,6 +1,7 @@
 #include "ToolFixture.h"
 
 #include "orbane/AutoParam.h"
+#include "orbane/ColourSpaces.h"
 #include "orbane/Input.h"
 #include "orbane/Operator.h"
 #include "orbane/ViewerPanel.h"
@@ -23,8 +24,7 @@ const OrbID kColor("ColorControl");
 
 double Linear(int code)
 {
-    const double v = code / 255.0;
-    return v <= 0.04045 ? v / 12.92 : std::pow((v + 0.055) / 1.055, 2.4);
+    return ColourSpaces::SrgbToLinear(code / 255.0);
 }
 
 // A tool with four channel Inputs; the control stands on "Red".

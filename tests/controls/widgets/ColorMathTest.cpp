@@ -1,5 +1,7 @@
 #include "widgets/ColorMath.h"
 
+#include "orbane/ColourSpaces.h"
+
 #include <QtTest>
 
 #include <cmath>
@@ -88,7 +90,7 @@ void ColorMathTest::hex()
     QFETCH(bool, valid);
     QFETCH(QString, written);
     QFETCH(double, red);
-    const double grey = ColorMath::SrgbToLinear(0x33 / 255.0);
+    const double grey = ColourSpaces::SrgbToLinear(0x33 / 255.0);
     ColorRGBA c{grey, grey, grey, 1.0};
     QCOMPARE(ColorMath::FromHex(text, c), valid);
     QVERIFY2(std::fabs(c.r - red) < 1e-6, qPrintable(QString::number(c.r, 'g', 8)));

@@ -1,6 +1,7 @@
 #include "TestImages.h"
 
 #include "orbane/ClipSequence.h"
+#include "orbane/ColourSpaces.h"
 #include "orbane/FloatImage.h"
 #include "orbane/ImageFile.h"
 
@@ -48,7 +49,7 @@ float TopCode(const FormatRow &row)
 // linear.
 float Expected(const FormatRow &row, float written)
 {
-    return row.encoded ? FloatImage::SrgbToLinear(std::round(written * TopCode(row)) / TopCode(row)) : written;
+    return row.encoded ? float(ColourSpaces::SrgbToLinear(std::round(written * TopCode(row)) / TopCode(row))) : written;
 }
 
 // The file's precision: half a float's ten bits; one code of an integer
@@ -60,8 +61,8 @@ float Tolerance(const FormatRow &row, float written)
     if (!row.encoded)
         return 1e-6f;
     const float code = 1.0f / TopCode(row);
-    return FloatImage::SrgbToLinear(std::min(1.0f, written + code)) -
-           FloatImage::SrgbToLinear(std::max(0.0f, written - code));
+    return float(ColourSpaces::SrgbToLinear(std::min(1.0f, written + code))) -
+           float(ColourSpaces::SrgbToLinear(std::max(0.0f, written - code)));
 }
 
 class ImageFormats : public ::testing::TestWithParam<FormatRow>
