@@ -40,6 +40,8 @@ const std::vector<Goal> &Goals()
         {"H2", "curve graph repaint while a point is dragged", "BM_CurveGraph_DragRepaint", nullptr, 1.0, ""},
         {"C1", "inspector build, 200 colour controls (four channel Inputs each)", "BM_Inspector_BuildColours/200",
          "BM_StockColourRows_Build/200", 1.0, "stock Qt rows"},
+        {"V3", "hover over 100 each of the cube, camera and light overlays, one mouse event", "BM_Viewer_Hover3D/100",
+         nullptr, 0.5, ""},
     };
     return goals;
 }

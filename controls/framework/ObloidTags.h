@@ -10,24 +10,25 @@ namespace Orbane {
 // displayed, the origin at the image's centre); the _Input tags say which of
 // its Inputs hold the three sizes and the three turns (-1, or an index with
 // no Input: the Set tag's value, not draggable).
-constexpr Tag OBC_SizeXInput = 0x10058000;        // default 1
-constexpr Tag OBC_SizeYInput = 0x10058001;        // default 2
-constexpr Tag OBC_SizeZInput = 0x10058002;        // default 3
-constexpr Tag OBC_RotXInput = 0x10058003;         // default 4 (degrees)
-constexpr Tag OBC_RotYInput = 0x10058004;         // default 5
-constexpr Tag OBC_RotZInput = 0x10058005;         // default 6
-constexpr Tag OBC_Uniform = 0x10058006;           // face drags scale all three sizes alike, as with Shift
-constexpr Tag OBC_AboutCenter = 0x10058007;       // face drags move the opposite face too, as with Ctrl
-constexpr Tag OBC_Cube = 0x10058008;              // one size, X, for all three axes
-constexpr Tag OBC_ShowFaces = 0x10058009;         // the six face handles (default on)
-constexpr Tag OBC_ShowCenter = 0x1005800a;        // the centre handle (default on)
-constexpr Tag OBC_ShowAxes = 0x1005800b;          // the box's own axes from its centre, X red, Y green, Z blue
-constexpr Tag OBC_ShowHidden = 0x1005800c;        // edges behind the box drawn dashed (default on); off: left out
-constexpr Tag OBC_PenStyle = 0x1005800d;          // the visible edges' pen: 0 solid, 1..4 dashed as the rectangle's
-constexpr Tag OBC_FillFaces = 0x1005800e;         // shade the faces that face the camera
-constexpr Tag OBC_Color = 0x1005800f;             // the edges' colour (default: the overlay's)
-constexpr Tag OBC_FillColor = 0x10058010;         // the shade's colour
-constexpr Tag OBC_AxisMove = 0x10058011;          // centre drags: 0 in the view's plane, 1 along X, 2 Y, 3 Z, 4 on the ground (XZ)
+constexpr Tag OBC_SizeXInput = 0x10058000;  // default 1
+constexpr Tag OBC_SizeYInput = 0x10058001;  // default 2
+constexpr Tag OBC_SizeZInput = 0x10058002;  // default 3
+constexpr Tag OBC_RotXInput = 0x10058003;   // default 4 (degrees)
+constexpr Tag OBC_RotYInput = 0x10058004;   // default 5
+constexpr Tag OBC_RotZInput = 0x10058005;   // default 6
+constexpr Tag OBC_Uniform = 0x10058006;     // face drags scale all three sizes alike, as with Shift
+constexpr Tag OBC_AboutCenter = 0x10058007; // face drags move the opposite face too, as with Ctrl
+constexpr Tag OBC_Cube = 0x10058008;        // one size, X, for all three axes
+constexpr Tag OBC_ShowFaces = 0x10058009;   // the six face handles (default on)
+constexpr Tag OBC_ShowCenter = 0x1005800a;  // the centre handle (default on)
+constexpr Tag OBC_ShowAxes = 0x1005800b;    // the box's own axes from its centre, X red, Y green, Z blue
+constexpr Tag OBC_ShowHidden = 0x1005800c;  // edges behind the box drawn dashed (default on); off: left out
+constexpr Tag OBC_PenStyle = 0x1005800d;    // the visible edges' pen: 0 solid, 1..4 dashed as the rectangle's
+constexpr Tag OBC_FillFaces = 0x1005800e;   // shade the faces that face the camera
+constexpr Tag OBC_Color = 0x1005800f;       // the edges' colour (default: the overlay's)
+constexpr Tag OBC_FillColor = 0x10058010;   // the shade's colour
+constexpr Tag OBC_AxisMove =
+    0x10058011; // centre drags: 0 in the view's plane, 1 along X, 2 Y, 3 Z, 4 on the ground (XZ)
 constexpr Tag OBC_HideWhileDragging = 0x10058012; // only the handles are drawn while the box is dragged
 constexpr Tag OBC_KeysDepth = 0x10058013;         // Up and Down move the centre in Z (away, nearer) instead of Y
 constexpr Tag OBCD_SetSizeX = 0x20058000;         // where no Input gives it (0.5)

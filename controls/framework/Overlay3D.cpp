@@ -70,8 +70,7 @@ bool Overlay3D::ToViewer(const PreviewInfo &info, const ViewCamera &camera, OrbV
     return OverlayValue::OnScreen(viewer);
 }
 
-void Overlay3D::Segment(Graphics::GPainter &p, const PreviewInfo &info, const ViewCamera &camera, OrbVec3 a,
-                        OrbVec3 b)
+void Overlay3D::Segment(Graphics::GPainter &p, const PreviewInfo &info, const ViewCamera &camera, OrbVec3 a, OrbVec3 b)
 {
     OrbPoint ia, ib;
     if (!camera.ProjectSegment(a, b, info.Mapping(), ia, ib))

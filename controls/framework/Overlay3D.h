@@ -48,8 +48,7 @@ public:
     static bool ToViewer(const PreviewInfo &info, const ViewCamera &camera, OrbVec3 world, OrbPoint &viewer);
     // Draws the segment a-b clipped at the camera's near plane (a GP_Lines
     // pair); nothing where none of it is in front.
-    static void Segment(Graphics::GPainter &p, const PreviewInfo &info, const ViewCamera &camera, OrbVec3 a,
-                        OrbVec3 b);
+    static void Segment(Graphics::GPainter &p, const PreviewInfo &info, const ViewCamera &camera, OrbVec3 a, OrbVec3 b);
     // The world point under the mouse on the plane through `through` that
     // faces the camera (a drag in the view's plane at that depth).
     static bool MouseOnViewPlane(const PreviewInfo &info, const ViewCamera &camera, OrbVec3 through, OrbVec3 &hit);

@@ -11,6 +11,7 @@
 #include "framework/CheckBoxTags.h"
 #include "framework/CheckListTags.h"
 #include "framework/ClipTags.h"
+#include "framework/ColorRangesTags.h"
 #include "framework/ColorSuppressionTags.h"
 #include "framework/ColorTags.h"
 #include "framework/ColorWheelTags.h"
@@ -25,6 +26,7 @@
 #include "framework/GradientTags.h"
 #include "framework/ImgOverlayTags.h"
 #include "framework/LabelTags.h"
+#include "framework/LevelsTags.h"
 #include "framework/ListTags.h"
 #include "framework/MultiButtonTags.h"
 #include "framework/ObloidTags.h"
@@ -37,8 +39,6 @@
 #include "framework/ScrewTags.h"
 #include "framework/SliderTags.h"
 #include "framework/SplineTags.h"
-#include "framework/LevelsTags.h"
-#include "framework/ColorRangesTags.h"
 #include "framework/TransformTags.h"
 #include "framework/VariantRegistration.h"
 #include "framework/XYOffsetTags.h"
@@ -130,11 +130,11 @@ VariantRegistration<LabelControl> gLabelNest{LabelDesc().Variant(CLSID_InputCont
 VariantRegistration<LabelControl> gLabelSeparator{LabelDesc().Variant(CLSID_InputControl_Separator)};
 VariantRegistration<LabelControl> gLabelSpacer{LabelDesc().Variant(CLSID_InputControl_Spacer)};
 ControlRegistration<LevelsControl> gLevels{D::Input("LevelsControl").Tags<LevelsControlTags>()};
-ControlRegistration<LevelsOutputControl> gLevelsOutput{
-    D::Input("LevelsOutputControl").Tags<LevelsOutputControlTags>()};
-ControlRegistration<LightControl, TransformControl> gLight{
-    D::Preview("LightControl").Base(TransformControlID(), "TransformControl").Tags<LightControlTags>().Flag(
-        REG_PreviewFlag65)};
+ControlRegistration<LevelsOutputControl> gLevelsOutput{D::Input("LevelsOutputControl").Tags<LevelsOutputControlTags>()};
+ControlRegistration<LightControl, TransformControl> gLight{D::Preview("LightControl")
+                                                               .Base(TransformControlID(), "TransformControl")
+                                                               .Tags<LightControlTags>()
+                                                               .Flag(REG_PreviewFlag65)};
 ControlRegistration<ListControl> gList{ListDesc()};
 VariantRegistration<ListControl> gListID{ListDesc().Variant(CLSID_InputControl_ListID, "ListIDControl")};
 ControlRegistration<LogControl> gLog{D::Input("LogControl")};

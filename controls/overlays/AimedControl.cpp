@@ -38,10 +38,9 @@ void AimedControl::GetState(ScriptVal &state) const
 {
     HandleOverlay::GetState(state);
     const OrbVec3 aim = AimPoint();
-    const std::pair<const char *, float64> fields[] = {{"posX", mPosition.x}, {"posY", mPosition.y},
-                                                       {"posZ", mPosition.z}, {"aimX", aim.x},
-                                                       {"aimY", aim.y},       {"aimZ", aim.z},
-                                                       {"dragPart", float64(mPart)}};
+    const std::pair<const char *, float64> fields[] = {
+        {"posX", mPosition.x}, {"posY", mPosition.y}, {"posZ", mPosition.z},       {"aimX", aim.x},
+        {"aimY", aim.y},       {"aimZ", aim.z},       {"dragPart", float64(mPart)}};
     for (const auto &[key, value] : fields)
         state.SetKey(ScriptVal(key), ScriptVal(value));
     PreviewInfo info;

@@ -50,18 +50,8 @@ std::array<OrbVec3, 8> BoxGeometry::Corners(const Box3 &box) noexcept
 const std::array<std::array<int32, 2>, 12> &BoxGeometry::Edges() noexcept
 {
     // Four along X, four along Y, four along Z.
-    static const std::array<std::array<int32, 2>, 12> edges = {{{0, 1},
-                                                                 {2, 3},
-                                                                 {4, 5},
-                                                                 {6, 7},
-                                                                 {0, 2},
-                                                                 {1, 3},
-                                                                 {4, 6},
-                                                                 {5, 7},
-                                                                 {0, 4},
-                                                                 {1, 5},
-                                                                 {2, 6},
-                                                                 {3, 7}}};
+    static const std::array<std::array<int32, 2>, 12> edges = {
+        {{0, 1}, {2, 3}, {4, 5}, {6, 7}, {0, 2}, {1, 3}, {4, 6}, {5, 7}, {0, 4}, {1, 5}, {2, 6}, {3, 7}}};
     return edges;
 }
 

@@ -18,11 +18,11 @@ struct Box3
 // What a face drag makes of a box: the sizes and the centre.
 struct BoxResize
 {
-    bool uniform = false;      // all three sizes by the dragged axis's factor
-    bool aboutCenter = false;  // the opposite face moves too; the centre stays
-    float64 minSize = 0.0;     // each size kept at least this
-    float64 maxSize = 0.0;     // and at most this (0: no limit)
-    float64 step = 0.0;        // the dragged size snapped to multiples (0: none)
+    bool uniform = false;     // all three sizes by the dragged axis's factor
+    bool aboutCenter = false; // the opposite face moves too; the centre stays
+    float64 minSize = 0.0;    // each size kept at least this
+    float64 maxSize = 0.0;    // and at most this (0: no limit)
+    float64 step = 0.0;       // the dragged size snapped to multiples (0: none)
 };
 
 // The box's corners, edges and faces, pure functions of a Box3, so the

@@ -44,10 +44,14 @@ const std::pair<Tag, bool CameraControl::*> CameraControl::BoolAttrs[] = {
     {CC_KeysAim, &CameraControl::mKeysAim},
 };
 const std::pair<Tag, float64 CameraControl::*> CameraControl::DoubleAttrs[] = {
-    {CCD_Focal, &CameraControl::mFocal},         {CCD_Aperture, &CameraControl::mAperture},
-    {CCD_Near, &CameraControl::mNear},           {CCD_Far, &CameraControl::mFar},
-    {CCD_FilmAspect, &CameraControl::mFilmAspect}, {CCD_AimDistance, &CameraControl::mAimDistance},
-    {CCD_BodySize, &CameraControl::mBodySize},   {CCD_LineWidth, &CameraControl::mLineWidth},
+    {CCD_Focal, &CameraControl::mFocal},
+    {CCD_Aperture, &CameraControl::mAperture},
+    {CCD_Near, &CameraControl::mNear},
+    {CCD_Far, &CameraControl::mFar},
+    {CCD_FilmAspect, &CameraControl::mFilmAspect},
+    {CCD_AimDistance, &CameraControl::mAimDistance},
+    {CCD_BodySize, &CameraControl::mBodySize},
+    {CCD_LineWidth, &CameraControl::mLineWidth},
     {CCD_KnobSize, &CameraControl::mAimKnob},
 };
 const std::pair<Tag, OrbColor CameraControl::*> CameraControl::ColorAttrs[] = {
@@ -87,9 +91,9 @@ void CameraControl::GetState(ScriptVal &state) const
 {
     AimedControl::GetState(state);
     const ViewCamera own = Own();
-    const std::pair<const char *, float64> fields[] = {
-        {"rotX", own.rotation.x}, {"rotY", own.rotation.y},     {"rotZ", own.rotation.z},
-        {"focal", own.focal},     {"aperture", own.aperture}, {"fov", own.FieldOfView()}};
+    const std::pair<const char *, float64> fields[] = {{"rotX", own.rotation.x},   {"rotY", own.rotation.y},
+                                                       {"rotZ", own.rotation.z},   {"focal", own.focal},
+                                                       {"aperture", own.aperture}, {"fov", own.FieldOfView()}};
     for (const auto &[key, value] : fields)
         state.SetKey(ScriptVal(key), ScriptVal(value));
 }
@@ -159,8 +163,7 @@ bool CameraControl::StoreMore(int32 index, const Parameter *value)
     bool moved = false;
     for (int32 r = 0; r < CR_Count; ++r)
         if (index == mRoleIndex[r] && HasRole(Role(r)))
-            moved = (r == CR_Target ? Overlay3D::TakePoint(mTarget, value) : OV::TakeNumber(mInput[r], value)) ||
-                    moved;
+            moved = (r == CR_Target ? Overlay3D::TakePoint(mTarget, value) : OV::TakeNumber(mInput[r], value)) || moved;
     return moved;
 }
 
@@ -279,8 +282,7 @@ void CameraControl::DrawFrustum(GPainter &p, const PreviewInfo &info, const View
 
 // A box behind the lens, turned as the camera is, with a triangle on top
 // that shows which way is up.
-void CameraControl::DrawBody(GPainter &p, const PreviewInfo &info, const ViewCamera &view,
-                             const ViewCamera &own) const
+void CameraControl::DrawBody(GPainter &p, const PreviewInfo &info, const ViewCamera &view, const ViewCamera &own) const
 {
     const float64 b = std::fabs(mBodySize);
     Box3 body;
@@ -288,8 +290,8 @@ void CameraControl::DrawBody(GPainter &p, const PreviewInfo &info, const ViewCam
     body.size = OrbVec3(kBodyWide * b, kBodyHigh * b, b);
     body.rotation = own.rotation;
     const auto corners = BoxGeometry::Corners(body);
-    const OrbVec3 up[3] = {own.ToWorld({-0.2 * b, kBodyHigh * b / 2, 0.0}), own.ToWorld({0.2 * b, kBodyHigh * b / 2, 0.0}),
-                           own.ToWorld({0.0, kBodyHigh * b, 0.0})};
+    const OrbVec3 up[3] = {own.ToWorld({-0.2 * b, kBodyHigh * b / 2, 0.0}),
+                           own.ToWorld({0.2 * b, kBodyHigh * b / 2, 0.0}), own.ToWorld({0.0, kBodyHigh * b, 0.0})};
     p.Color(info.GetColor(mColor), info.GetShadow(mColor));
     p.Begin(Graphics::GP_Lines);
     for (const auto &edge : BoxGeometry::Edges())

@@ -125,11 +125,11 @@ void ObloidControl::GetState(ScriptVal &state) const
 {
     HandleOverlay::GetState(state);
     const Box3 b = Drawn();
-    const std::pair<const char *, float64> fields[] = {
-        {"centerX", b.center.x},   {"centerY", b.center.y},   {"centerZ", b.center.z},
-        {"sizeX", b.size.x},       {"sizeY", b.size.y},       {"sizeZ", b.size.z},
-        {"rotX", b.rotation.x},    {"rotY", b.rotation.y},    {"rotZ", b.rotation.z},
-        {"dragPart", float64(mDragPart)}};
+    const std::pair<const char *, float64> fields[] = {{"centerX", b.center.x}, {"centerY", b.center.y},
+                                                       {"centerZ", b.center.z}, {"sizeX", b.size.x},
+                                                       {"sizeY", b.size.y},     {"sizeZ", b.size.z},
+                                                       {"rotX", b.rotation.x},  {"rotY", b.rotation.y},
+                                                       {"rotZ", b.rotation.z},  {"dragPart", float64(mDragPart)}};
     for (const auto &[key, value] : fields)
         state.SetKey(ScriptVal(key), ScriptVal(value));
     // Where each handle was last put, for scripts that grab them.

@@ -108,7 +108,7 @@ private:
     OrbVec3 mCenter;
     bool mVisible = true, mLocked = false;
     float64 mSizeMul = 1.0;
-    ScriptVal mCameraTable; // the camera Input's table, nil for none
+    ScriptVal mCameraTable;   // the camera Input's table, nil for none
     ViewMapping mViewMapping; // the viewer's view and camera as last set
     ViewCamera mViewCamera = ViewCamera::Default();
     // Tags.
@@ -122,8 +122,8 @@ private:
     // The drag.
     uint32 mDragPart = 0;
     Box3 mAtPress;
-    OrbVec3 mGrab;          // centre minus the grabbed world point
-    float64 mGrabT = 0.0;   // where along the dragged line the press was
+    OrbVec3 mGrab;        // centre minus the grabbed world point
+    float64 mGrabT = 0.0; // where along the dragged line the press was
 };
 
 } // namespace Orbane

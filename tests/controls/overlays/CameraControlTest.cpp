@@ -28,7 +28,8 @@ Input *AddCamera(ViewerFixture &f, OrbVec3 at, double pan, const TagList &more =
     for (const char *id : {"RotX", "RotY", "RotZ", "Focal", "Target"})
         attrs.Add(INPA_OverlayInput, OrbID(id));
     attrs.Append(more);
-    Input *p = f.tool->AddInput(OrbID("Position"), "Position", CLSID_DataType_Point, attrs, AutoPoint(at.x, at.y, at.z));
+    Input *p =
+        f.tool->AddInput(OrbID("Position"), "Position", CLSID_DataType_Point, attrs, AutoPoint(at.x, at.y, at.z));
     for (auto [id, value] : {std::pair{"RotX", 0.0}, {"RotY", pan}, {"RotZ", 0.0}, {"Focal", 50.0}})
         f.tool->AddInput(OrbID(id), id, CLSID_DataType_Number, TagList(), AutoNumber(value));
     f.tool->AddInput(OrbID("Target"), "Target", CLSID_DataType_Point, TagList(), AutoPoint(at.x, at.y, at.z - 1.0));
@@ -69,7 +70,7 @@ private slots:
 void CameraControlTest::handles_data()
 {
     QTest::addColumn<double>("zoom");
-    QTest::addColumn<bool>("aim");   // the aim knob, else the position
+    QTest::addColumn<bool>("aim");    // the aim knob, else the position
     QTest::addColumn<bool>("target"); // the camera looks at a Target Input
     for (const double zoom : {1.0, 0.5}) {
         const QByteArray at = " at zoom " + QByteArray::number(zoom);

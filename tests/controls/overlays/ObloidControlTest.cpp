@@ -39,8 +39,12 @@ Input *AddBox(ViewerFixture &f, const Box &b, const TagList &more = TagList())
     attrs.Append(more);
     Input *c = f.tool->AddInput(OrbID("Center"), "Center", CLSID_DataType_Point, attrs,
                                 AutoPoint(b.center.x, b.center.y, b.center.z));
-    for (auto [id, value] : {std::pair{"SizeX", b.size.x}, {"SizeY", b.size.y}, {"SizeZ", b.size.z}, {"RotX", 0.0},
-                             {"RotY", b.rotY}, {"RotZ", 0.0}})
+    for (auto [id, value] : {std::pair{"SizeX", b.size.x},
+                             {"SizeY", b.size.y},
+                             {"SizeZ", b.size.z},
+                             {"RotX", 0.0},
+                             {"RotY", b.rotY},
+                             {"RotZ", 0.0}})
         f.tool->AddInput(OrbID(id), id, CLSID_DataType_Number, TagList(), AutoNumber(value));
     return c;
 }
@@ -234,8 +238,8 @@ void ObloidControlTest::nudges_data()
     QTest::addColumn<double>("dz");
     QTest::newRow("right") << int(Qt::Key_Right) << int(Qt::NoModifier) << false << 1.0 << 0.0 << 0.0;
     QTest::newRow("up is +Y") << int(Qt::Key_Up) << int(Qt::NoModifier) << false << 0.0 << 1.0 << 0.0;
-    QTest::newRow("left with shift: ten") << int(Qt::Key_Left) << int(Qt::ShiftModifier) << false << -10.0 << 0.0
-                                          << 0.0;
+    QTest::newRow("left with shift: ten")
+        << int(Qt::Key_Left) << int(Qt::ShiftModifier) << false << -10.0 << 0.0 << 0.0;
     QTest::newRow("up with depth keys: away") << int(Qt::Key_Up) << int(Qt::NoModifier) << true << 0.0 << 0.0 << -1.0;
     QTest::newRow("down with control: a tenth nearer")
         << int(Qt::Key_Down) << int(Qt::ControlModifier) << true << 0.0 << 0.0 << 0.1;

@@ -1,5 +1,5 @@
-#include "orbane/ScriptVal.h"
 #include "orbane/ViewCamera.h"
+#include "orbane/ScriptVal.h"
 
 #include <gtest/gtest.h>
 
@@ -65,25 +65,45 @@ TEST_P(Projection, MatchesThePinhole)
 INSTANTIATE_TEST_SUITE_P(
     ViewCamera, Projection,
     testing::Values(
-        ProjectCase{"default view: the origin is the image's centre", ViewCamera::Default(), false, {0, 0, 0}, true,
+        ProjectCase{"default view: the origin is the image's centre",
+                    ViewCamera::Default(),
+                    false,
+                    {0, 0, 0},
+                    true,
                     {0.5, 0.5}},
-        ProjectCase{"default view: the plane z = 0 lies on the image", ViewCamera::Default(), false, {0.25, 0.1, 0},
-                    true, {0.75, 0.7}},
+        ProjectCase{"default view: the plane z = 0 lies on the image",
+                    ViewCamera::Default(),
+                    false,
+                    {0.25, 0.1, 0},
+                    true,
+                    {0.75, 0.7}},
         ProjectCase{"twice as far: half as far out", ViewCamera::Default(), false, {0.25, 0, -kD}, true, {0.625, 0.5}},
         ProjectCase{"focal = aperture at the origin", At({0, 0, 0}, {0, 0, 0}), false, {1, 0.5, -2}, true, {1.0, 1.0}},
-        ProjectCase{"panned a quarter turn: looks down -X", At({0, 0, 0}, {0, 90, 0}), false, {-2, 0, 1}, true,
-                    {0.0, 0.5}},
-        ProjectCase{"tilted a quarter turn: looks up", At({0, 0, 0}, {90, 0, 0}), false, {0, 3, 0.5}, true,
+        ProjectCase{
+            "panned a quarter turn: looks down -X", At({0, 0, 0}, {0, 90, 0}), false, {-2, 0, 1}, true, {0.0, 0.5}},
+        ProjectCase{"tilted a quarter turn: looks up",
+                    At({0, 0, 0}, {90, 0, 0}),
+                    false,
+                    {0, 3, 0.5},
+                    true,
                     {0.5, 0.5 + 2.0 * 0.5 / 3.0}},
-        ProjectCase{"rolled a quarter turn: X goes up", At({0, 0, 0}, {0, 0, 90}), false, {0.5, 0, -1}, true,
+        ProjectCase{"rolled a quarter turn: X goes up",
+                    At({0, 0, 0}, {0, 0, 90}),
+                    false,
+                    {0.5, 0, -1},
+                    true,
                     {0.5, 0.5 - 2.0 * 0.5}},
-        ProjectCase{"wide pixels: Y reaches four image heights", At({0, 0, 0}, {0, 0, 0}), true, {0, 0.5, -2}, true,
+        ProjectCase{"wide pixels: Y reaches four image heights",
+                    At({0, 0, 0}, {0, 0, 0}),
+                    true,
+                    {0, 0.5, -2},
+                    true,
                     {0.5, 0.5 + 4.0 * 0.25}},
         ProjectCase{"behind the camera: clipped", ViewCamera::Default(), false, {0, 0, 5}, false, {}},
         ProjectCase{"nearer than the near plane: clipped", ViewCamera::Default(), false, {0, 0, kD - 0.005}, false, {}},
         ProjectCase{"not a number: nothing", ViewCamera::Default(), false, {NAN, 0, 0}, false, {}},
-        ProjectCase{"a camera with no focal length: nothing", At({0, 0, 0}, {0, 0, 0}, 0.0), false, {0, 0, -1},
-                    false, {}}));
+        ProjectCase{
+            "a camera with no focal length: nothing", At({0, 0, 0}, {0, 0, 0}, 0.0), false, {0, 0, -1}, false, {}}));
 
 TEST(ViewCamera, SegmentsAreClippedAtTheNearPlane)
 {
