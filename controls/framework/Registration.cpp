@@ -11,7 +11,6 @@
 #include "framework/CheckBoxTags.h"
 #include "framework/CheckListTags.h"
 #include "framework/ClipTags.h"
-#include "framework/ColorRangesTags.h"
 #include "framework/ColorSuppressionTags.h"
 #include "framework/ColorTags.h"
 #include "framework/ColorWheelTags.h"
@@ -26,7 +25,6 @@
 #include "framework/GradientTags.h"
 #include "framework/ImgOverlayTags.h"
 #include "framework/LabelTags.h"
-#include "framework/LevelsTags.h"
 #include "framework/ListTags.h"
 #include "framework/MultiButtonTags.h"
 #include "framework/ObloidTags.h"
@@ -39,6 +37,8 @@
 #include "framework/ScrewTags.h"
 #include "framework/SliderTags.h"
 #include "framework/SplineTags.h"
+#include "framework/LevelsTags.h"
+#include "framework/ColorRangesTags.h"
 #include "framework/TransformTags.h"
 #include "framework/VariantRegistration.h"
 #include "framework/XYOffsetTags.h"
@@ -130,7 +130,8 @@ VariantRegistration<LabelControl> gLabelNest{LabelDesc().Variant(CLSID_InputCont
 VariantRegistration<LabelControl> gLabelSeparator{LabelDesc().Variant(CLSID_InputControl_Separator)};
 VariantRegistration<LabelControl> gLabelSpacer{LabelDesc().Variant(CLSID_InputControl_Spacer)};
 ControlRegistration<LevelsControl> gLevels{D::Input("LevelsControl").Tags<LevelsControlTags>()};
-ControlRegistration<LevelsOutputControl> gLevelsOutput{D::Input("LevelsOutputControl").Tags<LevelsOutputControlTags>()};
+ControlRegistration<LevelsOutputControl> gLevelsOutput{
+    D::Input("LevelsOutputControl").Tags<LevelsOutputControlTags>()};
 ControlRegistration<LightControl, TransformControl> gLight{D::Preview("LightControl")
                                                                .Base(TransformControlID(), "TransformControl")
                                                                .Tags<LightControlTags>()
