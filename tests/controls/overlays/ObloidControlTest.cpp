@@ -5,6 +5,7 @@
 #include "orbane/ClassIDs.h"
 #include "orbane/Input.h"
 #include "orbane/Operator.h"
+#include "orbane/ScriptValParam.h"
 #include "orbane/ViewCamera.h"
 
 #include <QtTest>
@@ -17,7 +18,7 @@ using namespace Orbane::Test;
 
 namespace {
 
-constexpr Tag OBC_KeysDepth = 0x10058013, OBC_AxisMove = 0x10058011;
+constexpr Tag OBC_KeysDepth = 0x10058013, OBC_AxisMove = 0x10058011, OBCID_Camera = 0x80058003;
 constexpr double kNaN = std::numeric_limits<double>::quiet_NaN();
 // The default view's distance from the image plane, in image widths.
 constexpr double kD = 50.0 / 36.0;
@@ -111,6 +112,7 @@ private slots:
     void nudges();
     void badInput_data();
     void badInput();
+    void cameraInputTakesOver();
 };
 
 void ObloidControlTest::handles_data()
@@ -301,6 +303,29 @@ void ObloidControlTest::badInput()
     while (f.doc.CanUndo())
         QVERIFY(f.doc.Undo());
     QVERIFY2(Same(Read(f), b) || std::isnan(cz), Describe(Read(f)));
+}
+
+// A camera Input (a table over the viewer's camera) replaces the view:
+// from X = 2 looking down -X, the +Z face's knob lies left of the centre.
+void ObloidControlTest::cameraInputTakesOver()
+{
+    ViewerFixture f;
+    Input *c = AddBox(f, Box(), TagList{{OBCID_Camera, OrbID("View")}});
+    ScriptVal view = ScriptVal::NewTable();
+    ScriptVal position = ScriptVal::NewTable(), rotation = ScriptVal::NewTable();
+    for (double v : {2.0, 0.0, 0.0})
+        position.Append(ScriptVal(v));
+    for (double v : {0.0, 90.0, 0.0})
+        rotation.Append(ScriptVal(v));
+    view.SetKey(ScriptVal("position"), position);
+    view.SetKey(ScriptVal("rotation"), rotation);
+    const AutoParam<ScriptValParam> table(view);
+    f.tool->AddInput(OrbID("View"), "View", CLSID_DataType_ScriptVal, TagList(), table);
+    QVERIFY(f.Show());
+    const OrbPoint plusZ(0.5 - kD * 0.25 / 2.0, 0.5);
+    f.Hover(f.At(plusZ));
+    QCOMPARE(StateOf(f.OverlayOf(c), "hoverPart"), 6.0);
+    QCOMPARE(StateOf(f.OverlayOf(c), "frontFaces"), 1.0);
 }
 
 QTEST_MAIN(ObloidControlTest)
