@@ -211,6 +211,28 @@ int OverlayState(lua_State *L)
     return 1;
 }
 
+// ViewerCamera([camera]) -> the camera the 3D overlays are seen through,
+// as a table; a table sets it first (its fields over the camera now), the
+// text "default" the default view.
+int ViewerCamera(lua_State *L)
+{
+    ViewerPanel *viewer = gWindow->Viewer();
+    if (lua_type(L, 1) == LUA_TSTRING && std::strcmp(lua_tostring(L, 1), "default") == 0) {
+        viewer->SetCamera(ViewCamera::Default());
+    } else if (lua_istable(L, 1)) {
+        ScriptVal table;
+        std::string why;
+        if (!LuaRuntime::ToScriptVal(L, 1, table, why))
+            return Hands::Raise(L, QString("ViewerCamera: %1").arg(QString::fromStdString(why)));
+        if (!viewer->SetCamera(ViewCamera::FromTable(table, viewer->Camera())))
+            return Hands::Raise(L, "ViewerCamera: not a camera (focal length, aperture and near plane above 0)");
+    } else if (!lua_isnoneornil(L, 1)) {
+        return Hands::Raise(L, "ViewerCamera: argument 1 (camera): expected a table or \"default\"");
+    }
+    LuaRuntime::Push(L, viewer->Camera().ToTable());
+    return 1;
+}
+
 // --- the context menu, the toolbar and tips ---
 
 // A menu entry's flag word as the user sees the action: 0x001 disabled,
@@ -426,6 +448,7 @@ void ViewerScripting::Install(MainWindow *window)
         {"ViewerToolbar", ViewerToolbar},
         {"ViewerToolbarPress", ViewerToolbarPress},
         {"ViewerTip", ViewerTip},
+        {"ViewerCamera", ViewerCamera},
     };
     for (const auto &[name, fn] : functions)
         LuaRuntime::Instance().AddModuleFunction(name, fn);

@@ -42,6 +42,8 @@ const std::vector<Goal> &Goals()
          "BM_StockColourRows_Build/200", 1.0, "stock Qt rows"},
         {"C2", "decode a 1080p 8-bit sRGB image through the table OpenColorIO fills once", "BM_Srgb8Decode_Table",
          "BM_Srgb8Decode_Processor", 0.2, "OpenColorIO's processor over every value"},
+        {"V3", "hover over 100 each of the cube, camera and light overlays, one mouse event", "BM_Viewer_Hover3D/100",
+         nullptr, 0.5, ""},
     };
     return goals;
 }

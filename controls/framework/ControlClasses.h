@@ -33,10 +33,13 @@
 #include "inputcontrols/SliderControl.h"
 #include "inputcontrols/SplineControl.h"
 #include "overlays/AngleControl.h"
+#include "overlays/CameraControl.h"
 #include "overlays/CropControl.h"
 #include "overlays/CrosshairControl.h"
 #include "overlays/EllipseControl.h"
 #include "overlays/ImgOverlayControl.h"
+#include "overlays/LightControl.h"
+#include "overlays/ObloidControl.h"
 #include "overlays/PointControl.h"
 #include "overlays/PositionerControl.h"
 #include "overlays/RectangleControl.h"
@@ -61,10 +64,7 @@
 
 namespace Orbane {
 
-ORBANE_PENDING_DERIVED(CameraControl, TransformControl);
-ORBANE_PENDING_DERIVED(LightControl, TransformControl);
 ORBANE_PENDING_PREVIEW(MeshControl);
-ORBANE_PENDING_PREVIEW(ObloidControl);
 ORBANE_PENDING_PREVIEW(TrackerControl);
 
 } // namespace Orbane

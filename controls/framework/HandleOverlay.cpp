@@ -145,6 +145,28 @@ template <class Base> void HandleOverlayOn<Base>::EndHandle(Graphics::GPainter &
 }
 
 template <class Base>
+void HandleOverlayOn<Base>::DrawSquareKnob(Graphics::GPainter &p, const PreviewInfo &info, OrbPoint at, uint32 part,
+                                           float64 half, bool cross) const
+{
+    BeginHandle(p, info, at, part);
+    p.Begin(Graphics::GP_LineLoop);
+    p.Vertex(-half, -half);
+    p.Vertex(half, -half);
+    p.Vertex(half, half);
+    p.Vertex(-half, half);
+    p.End();
+    if (cross) {
+        p.Begin(Graphics::GP_Lines);
+        p.Vertex(-2 * half, 0);
+        p.Vertex(2 * half, 0);
+        p.Vertex(0, -2 * half);
+        p.Vertex(0, 2 * half);
+        p.End();
+    }
+    EndHandle(p);
+}
+
+template <class Base>
 bool HandleOverlayOn<Base>::NudgeCommand(PreviewInfo *info, const OrbID &command, uint64 data, const TagList *tags,
                                          OrbPoint point, float64 stepY, uint64 &result)
 {

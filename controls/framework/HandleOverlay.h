@@ -85,6 +85,10 @@ protected:
     // handle pixels; EndHandle goes back.
     void BeginHandle(Graphics::GPainter &p, const PreviewInfo &info, OrbPoint at, uint32 part, int32 item = -1) const;
     static void EndHandle(Graphics::GPainter &p);
+    // A square knob of half side `half` handle pixels at `at` in the
+    // colours of `part`, with a cross through it where `cross` (a centre).
+    void DrawSquareKnob(Graphics::GPainter &p, const PreviewInfo &info, OrbPoint at, uint32 part, float64 half,
+                        bool cross) const;
 
     // The arrow-key commands every overlay with a draggable point answers
     // alike: NeedsKey claims the arrows; KeyDown moves `point` by one image

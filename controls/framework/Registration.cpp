@@ -7,6 +7,7 @@
 
 #include "framework/AngleTags.h"
 #include "framework/ButtonTags.h"
+#include "framework/CameraTags.h"
 #include "framework/CheckBoxTags.h"
 #include "framework/CheckListTags.h"
 #include "framework/ClipTags.h"
@@ -26,6 +27,7 @@
 #include "framework/LabelTags.h"
 #include "framework/ListTags.h"
 #include "framework/MultiButtonTags.h"
+#include "framework/ObloidTags.h"
 #include "framework/OffsetTags.h"
 #include "framework/PatternTags.h"
 #include "framework/PointTags.h"
@@ -90,6 +92,7 @@ ControlRegistration<AngleControl> gAngle{
 ControlRegistration<ButtonControl> gButton{D::Input("ButtonControl").Tags<ButtonControlTags>()};
 ControlRegistration<CameraControl, TransformControl> gCamera{D::Preview("CameraControl")
                                                                  .Base(TransformControlID(), "TransformControl")
+                                                                 .Tags<CameraControlTags>()
                                                                  .Flag(REG_PreviewFlag64)
                                                                  .Flag(REG_PreviewFlag65)};
 ControlRegistration<CheckBoxControl> gCheckBox{
@@ -129,8 +132,10 @@ VariantRegistration<LabelControl> gLabelSpacer{LabelDesc().Variant(CLSID_InputCo
 ControlRegistration<LevelsControl> gLevels{D::Input("LevelsControl").Tags<LevelsControlTags>()};
 ControlRegistration<LevelsOutputControl> gLevelsOutput{
     D::Input("LevelsOutputControl").Tags<LevelsOutputControlTags>()};
-ControlRegistration<LightControl, TransformControl> gLight{
-    D::Preview("LightControl").Base(TransformControlID(), "TransformControl").Flag(REG_PreviewFlag65)};
+ControlRegistration<LightControl, TransformControl> gLight{D::Preview("LightControl")
+                                                               .Base(TransformControlID(), "TransformControl")
+                                                               .Tags<LightControlTags>()
+                                                               .Flag(REG_PreviewFlag65)};
 ControlRegistration<ListControl> gList{ListDesc()};
 VariantRegistration<ListControl> gListID{ListDesc().Variant(CLSID_InputControl_ListID, "ListIDControl")};
 ControlRegistration<LogControl> gLog{D::Input("LogControl")};
@@ -138,7 +143,7 @@ ControlRegistration<MeshControl> gMesh{D::Preview("MeshControl").Flag(REG_Previe
 ControlRegistration<MultiButtonControl> gMultiButton{MultiButtonDesc()};
 VariantRegistration<MultiButtonControl> gMultiButtonID{
     MultiButtonDesc().Variant(CLSID_InputControl_MultiButtonID, "MultiButtonIDControl")};
-ControlRegistration<ObloidControl> gObloid{D::Preview("ObloidControl", "CubeControl")};
+ControlRegistration<ObloidControl> gObloid{D::Preview("ObloidControl", "CubeControl").Tags<ObloidControlTags>()};
 ControlRegistration<OffsetControl> gOffset{D::Input("OffsetControl").Tags<OffsetControlTags>()};
 ControlRegistration<PatternControl> gPattern{D::Input("PatternControl").Tags<PatternControlTags>()};
 ControlRegistration<PointControl> gPoint{D::Preview("PointControl").Tags<PointControlTags>()};

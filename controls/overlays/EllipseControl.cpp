@@ -47,16 +47,6 @@ const std::vector<OrbPoint> &UnitCircle(int32 segments)
     return *gCircle;
 }
 
-void SetPen(GPainter &p, int32 style, float64 width)
-{
-    p.LineWidth(float32(std::clamp(width, 0.0, 16.0)));
-    if (style == 0)
-        return;
-    if (const uint16 pattern = RectangleControl::StipplePattern(style))
-        p.LineStipple(1, pattern);
-    p.Enable(Graphics::GC_LineStipple);
-}
-
 } // namespace
 
 const LinkedInput<EllipseControl> EllipseControl::Links[] = {
@@ -543,7 +533,7 @@ void EllipseControl::DrawLook(GPainter &p, const PreviewInfo &info, const Shape 
     }
     if (s.soft != 0.0 && mShowSoft) {
         p.PushAttrib();
-        SetPen(p, mSoftPenStyle, mSoftLineWidth);
+        RectangleControl::ApplyPen(p, mSoftPenStyle, mSoftLineWidth);
         p.Color(info.GetColor(mSoftColor), info.GetShadow(mSoftColor));
         const float64 in = mSoftMode == 2 ? 0.0 : mSoftMode == 1 ? 1.0 : 0.5;
         DrawCurve(p, Outline(s, -s.soft * in, info), Graphics::GP_LineLoop);
@@ -552,7 +542,7 @@ void EllipseControl::DrawLook(GPainter &p, const PreviewInfo &info, const Shape 
     }
     if (!(mHideWhileDragging && dragged)) {
         p.PushAttrib();
-        SetPen(p, mPenStyle, mLineWidth);
+        RectangleControl::ApplyPen(p, mPenStyle, mLineWidth);
         p.Color(info.GetColor(mColor), info.GetShadow(mColor));
         DrawCurve(p, Outline(s, 0.0, info), Graphics::GP_LineLoop);
         p.PopAttrib();

@@ -415,6 +415,16 @@ uint16 RectangleControl::StipplePattern(int32 penStyle) noexcept
     return penStyle >= 0 && penStyle < int32(std::size(patterns)) ? patterns[penStyle] : 0;
 }
 
+void RectangleControl::ApplyPen(GPainter &p, int32 style, float64 width)
+{
+    p.LineWidth(float32(std::clamp(width, 0.0, 16.0)));
+    if (style == 0)
+        return;
+    if (const uint16 pattern = StipplePattern(style))
+        p.LineStipple(1, pattern);
+    p.Enable(Graphics::GC_LineStipple);
+}
+
 void RectangleControl::DrawControls(PreviewInfo *info, const TagList *tags)
 {
     mDrawn = Shape();

@@ -56,6 +56,9 @@ public:
 
     // The stipple pattern of a pen style (0: solid, no pattern).
     static uint16 StipplePattern(int32 penStyle) noexcept;
+    // Sets the painter's line width (clamped to 0..16 viewer pixels) and, for
+    // a style other than 0, its stipple: the pen of every outline overlay.
+    static void ApplyPen(Graphics::GPainter &p, int32 style, float64 width);
     // Outline strips in drawing order, one per part code.
     static constexpr int32 StripOrder[8] = {1, 3, 2, 6, 4, 12, 8, 9};
 

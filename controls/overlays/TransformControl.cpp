@@ -363,23 +363,7 @@ void TransformControl::DrawFrame(GPainter &p, const PreviewInfo &info, const Tra
 // Knobs are squares; the centre is a cross in a small square.
 void TransformControl::DrawKnob(GPainter &p, const PreviewInfo &info, OrbPoint at, uint32 part) const
 {
-    BeginHandle(p, info, at, part);
-    const float64 k = part == TPART_Center ? kCenterDisc : kKnob;
-    p.Begin(Graphics::GP_LineLoop);
-    p.Vertex(-k, -k);
-    p.Vertex(k, -k);
-    p.Vertex(k, k);
-    p.Vertex(-k, k);
-    p.End();
-    if (part == TPART_Center) {
-        p.Begin(Graphics::GP_Lines);
-        p.Vertex(-2 * k, 0);
-        p.Vertex(2 * k, 0);
-        p.Vertex(0, -2 * k);
-        p.Vertex(0, 2 * k);
-        p.End();
-    }
-    EndHandle(p);
+    DrawSquareKnob(p, info, at, part, part == TPART_Center ? kCenterDisc : kKnob, part == TPART_Center);
 }
 
 // The ring with a tick where the angle points.

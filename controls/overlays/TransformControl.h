@@ -74,6 +74,10 @@ protected:
     // The frame's outline, in the frame colour.
     virtual void DrawFrame(Graphics::GPainter &p, const PreviewInfo &info, const TransformFrame &frame) const;
 
+    // A knob at `at` (viewer units): the centre's cross in a square for
+    // TPART_Center, a small square for any other part.
+    void DrawKnob(Graphics::GPainter &p, const PreviewInfo &info, OrbPoint at, uint32 part) const;
+
     // The frame's colour; "no colour" draws it in the overlay colour.
     OrbColor mFrameColor;
 
@@ -86,7 +90,6 @@ private:
     void DragScale(const PreviewInfo &info);
     void DragShear(const PreviewInfo &info);
     void WriteRole(Role role, float64 value);
-    void DrawKnob(Graphics::GPainter &p, const PreviewInfo &info, OrbPoint at, uint32 part) const;
     void DrawRing(Graphics::GPainter &p, const PreviewInfo &info, OrbPoint at) const;
 
     int32 mRoleIndex[TR_Count] = {1, 2, 3, 4, 5};

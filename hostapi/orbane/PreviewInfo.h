@@ -4,6 +4,7 @@
 #include "orbane/OrbColor.h"
 #include "orbane/OrbPointT.h"
 #include "orbane/OrbRectT.h"
+#include "orbane/ViewCamera.h"
 #include "orbane/ViewMapping.h"
 
 #include <functional>
@@ -56,6 +57,12 @@ public:
     void SetMouseFromViewer(OrbPoint viewer);
     OrbPoint MouseInViewer() const { return TransformOut(MouseX, MouseY); }
 
+    // The camera 3D overlays are seen through (ViewCamera::Default() unless
+    // the viewer was given another); world -> image through it, then image
+    // -> viewer through the mapping.
+    const ViewCamera &Camera() const { return mCamera; }
+    void SetCamera(const ViewCamera &camera) { mCamera = camera; }
+
     // Image -> viewer.
     OrbPoint TransformOut(float64 x, float64 y) const { return mMapping.ToViewer({x, y}); }
     OrbPoint TransformOut(const OrbPoint &p) const { return mMapping.ToViewer(p); }
@@ -97,6 +104,7 @@ public:
 
 private:
     ViewMapping mMapping;
+    ViewCamera mCamera = ViewCamera::Default();
     Graphics::GPainter *mPainter = nullptr;
     CursorHandler mCursorHandler;
 };

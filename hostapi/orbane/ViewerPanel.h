@@ -119,6 +119,10 @@ public:
     static float64 WheelZoom(float64 zoom, int32 angleDelta) noexcept;
     OrbPoint WidgetToImage(QPointF widget) const;
     QPointF ImageToWidget(OrbPoint image) const;
+    // The camera the 3D overlays are seen through (the default view until
+    // set); a camera that is not valid is refused.
+    bool SetCamera(const ViewCamera &camera);
+    const ViewCamera &Camera() const { return mInfo.Camera(); }
 
     // What every overlay call is given: tolerance, colours, Highlight.
     PreviewInfo &Info() { return mInfo; }

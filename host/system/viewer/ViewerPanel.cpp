@@ -420,6 +420,21 @@ void ViewerPanel::SetMapping(const ViewMapping &mapping)
     RequestRedraw();
 }
 
+bool ViewerPanel::SetCamera(const ViewCamera &camera)
+{
+    if (!camera.IsValid())
+        return false;
+    if (camera == Camera())
+        return true;
+    mInfo.SetCamera(camera);
+    // Every 3D handle moved: the hover index is built again.
+    mHoverIndex->Reset();
+    for (PreviewControl *overlay : mOverlays)
+        overlay->SetView(&mInfo, nullptr);
+    RequestRedraw();
+    return true;
+}
+
 void ViewerPanel::resizeEvent(QResizeEvent *event)
 {
     QWidget::resizeEvent(event);

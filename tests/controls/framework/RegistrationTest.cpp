@@ -276,6 +276,8 @@ TEST(TagMaps, PublishedMapsAreWellFormed)
     published.insert({{"ColorSuppressionControl", 7}, {"ColorRangesControl", 4}, {"LevelsControl", 3}});
     published.insert({{"LevelsOutputControl", 3}, {"SplineControl", 21}});
     published.insert({"PatternControl", 2});
+    // The 3D overlays.
+    published.insert({{"CameraControl", 26}, {"LightControl", 1}, {"ObloidControl", 46}});
     EXPECT_EQ(counts, published);
     const auto table = [](const char *type) { return FFITagMap::ForType(FFIType::FindScriptName(type))->Table(); };
     EXPECT_EQ(table("ComboIDControl"), table("ComboControl")) << "variants share their primary's table";

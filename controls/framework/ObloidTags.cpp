@@ -1,0 +1,57 @@
+#include "framework/ObloidTags.h"
+
+#include "framework/TagTable.h"
+
+namespace Orbane {
+
+const TagMapEntry ObloidControlTags[] = {
+    ORBANE_TAG(OBC_SizeXInput, TMK_Plain),
+    ORBANE_TAG(OBC_SizeYInput, TMK_Plain),
+    ORBANE_TAG(OBC_SizeZInput, TMK_Plain),
+    ORBANE_TAG(OBC_RotXInput, TMK_Plain),
+    ORBANE_TAG(OBC_RotYInput, TMK_Plain),
+    ORBANE_TAG(OBC_RotZInput, TMK_Plain),
+    ORBANE_TAG(OBC_Uniform, TMK_Boolean),
+    ORBANE_TAG(OBC_AboutCenter, TMK_Boolean),
+    ORBANE_TAG(OBC_Cube, TMK_Boolean),
+    ORBANE_TAG(OBC_ShowFaces, TMK_Boolean),
+    ORBANE_TAG(OBC_ShowCenter, TMK_Boolean),
+    ORBANE_TAG(OBC_ShowAxes, TMK_Boolean),
+    ORBANE_TAG(OBC_ShowHidden, TMK_Boolean),
+    ORBANE_TAG(OBC_PenStyle, TMK_Plain),
+    ORBANE_TAG(OBC_FillFaces, TMK_Boolean),
+    ORBANE_TAG(OBC_Color, TMK_Color),
+    ORBANE_TAG(OBC_FillColor, TMK_Color),
+    ORBANE_TAG(OBC_AxisMove, TMK_Plain),
+    ORBANE_TAG(OBC_HideWhileDragging, TMK_Boolean),
+    ORBANE_TAG(OBC_KeysDepth, TMK_Boolean),
+    ORBANE_TAG(OBCD_SetSizeX, TMK_Plain),
+    ORBANE_TAG(OBCD_SetSizeY, TMK_Plain),
+    ORBANE_TAG(OBCD_SetSizeZ, TMK_Plain),
+    ORBANE_TAG(OBCD_SetRotX, TMK_Plain),
+    ORBANE_TAG(OBCD_SetRotY, TMK_Plain),
+    ORBANE_TAG(OBCD_SetRotZ, TMK_Plain),
+    ORBANE_TAG(OBCD_MinSize, TMK_Plain),
+    ORBANE_TAG(OBCD_MaxSize, TMK_Plain),
+    ORBANE_TAG(OBCD_SizeScale, TMK_Plain),
+    ORBANE_TAG(OBCD_LineWidth, TMK_Plain),
+    ORBANE_TAG(OBCD_FillOpacity, TMK_Plain),
+    ORBANE_TAG(OBCD_KnobSize, TMK_Plain),
+    ORBANE_TAG(OBCD_CenterSize, TMK_Plain),
+    ORBANE_TAG(OBCD_SizeStep, TMK_Plain),
+    ORBANE_TAG(OBCD_CurrentSizeX, TMK_Plain),
+    ORBANE_TAG(OBCD_CurrentSizeY, TMK_Plain),
+    ORBANE_TAG(OBCD_CurrentSizeZ, TMK_Plain),
+    ORBANE_TAG(OBCS_Label, TMK_Plain),
+    ORBANE_TAG(OBCID_Visible, TMK_Plain),
+    ORBANE_OBJECT_TAG(OBCP_Visible, "Input"),
+    ORBANE_TAG(OBCID_Lock, TMK_Plain),
+    ORBANE_OBJECT_TAG(OBCP_Lock, "Input"),
+    ORBANE_TAG(OBCID_Size, TMK_Plain),
+    ORBANE_OBJECT_TAG(OBCP_Size, "Input"),
+    ORBANE_TAG(OBCID_Camera, TMK_Plain),
+    ORBANE_OBJECT_TAG(OBCP_Camera, "Input"),
+    ORBANE_TAG_END,
+};
+
+} // namespace Orbane
