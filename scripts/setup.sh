@@ -8,6 +8,7 @@ packages=(
     qtbase5-dev libqt5svg5-dev
     libluajit-5.1-dev luajit libmuparser-dev libpolyclipping-dev libpugixml-dev
     libopenimageio-dev
+    libopencv-imgproc-dev
     googletest libgtest-dev libbenchmark-dev
     fonts-dejavu-core
     clang libclang-rt-14-dev

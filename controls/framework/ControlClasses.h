@@ -37,10 +37,12 @@
 #include "overlays/CrosshairControl.h"
 #include "overlays/EllipseControl.h"
 #include "overlays/ImgOverlayControl.h"
+#include "overlays/MeshControl.h"
 #include "overlays/PointControl.h"
 #include "overlays/PositionerControl.h"
 #include "overlays/RectangleControl.h"
 #include "overlays/SliderOverlay.h"
+#include "overlays/TrackerControl.h"
 #include "overlays/TransformControl.h"
 #include "overlays/XYOffsetControl.h"
 #include "polyline/PolyLineControl.h"
@@ -63,8 +65,6 @@ namespace Orbane {
 
 ORBANE_PENDING_DERIVED(CameraControl, TransformControl);
 ORBANE_PENDING_DERIVED(LightControl, TransformControl);
-ORBANE_PENDING_PREVIEW(MeshControl);
 ORBANE_PENDING_PREVIEW(ObloidControl);
-ORBANE_PENDING_PREVIEW(TrackerControl);
 
 } // namespace Orbane

@@ -25,6 +25,7 @@
 #include "framework/ImgOverlayTags.h"
 #include "framework/LabelTags.h"
 #include "framework/ListTags.h"
+#include "framework/MeshTags.h"
 #include "framework/MultiButtonTags.h"
 #include "framework/OffsetTags.h"
 #include "framework/PatternTags.h"
@@ -37,6 +38,7 @@
 #include "framework/SplineTags.h"
 #include "framework/LevelsTags.h"
 #include "framework/ColorRangesTags.h"
+#include "framework/TrackerTags.h"
 #include "framework/TransformTags.h"
 #include "framework/VariantRegistration.h"
 #include "framework/XYOffsetTags.h"
@@ -134,7 +136,7 @@ ControlRegistration<LightControl, TransformControl> gLight{
 ControlRegistration<ListControl> gList{ListDesc()};
 VariantRegistration<ListControl> gListID{ListDesc().Variant(CLSID_InputControl_ListID, "ListIDControl")};
 ControlRegistration<LogControl> gLog{D::Input("LogControl")};
-ControlRegistration<MeshControl> gMesh{D::Preview("MeshControl").Flag(REG_PreviewFlag64)};
+ControlRegistration<MeshControl> gMesh{D::Preview("MeshControl").Tags<MeshControlTags>().Flag(REG_PreviewFlag64)};
 ControlRegistration<MultiButtonControl> gMultiButton{MultiButtonDesc()};
 VariantRegistration<MultiButtonControl> gMultiButtonID{
     MultiButtonDesc().Variant(CLSID_InputControl_MultiButtonID, "MultiButtonIDControl")};
@@ -164,7 +166,8 @@ ControlRegistration<SplineControl> gSpline{D::Input("SplineControl")
                                                .Flag(REG_DisplayName, "Spline Control")
                                                .Flag(REG_MenuPath, "Controls\\Spline")};
 // The tracker is an overlay whose map carries the inspector's name; kept so.
-ControlRegistration<TrackerControl> gTracker{D::Preview("TrackerControl").MapName("InputControl.Create")};
+ControlRegistration<TrackerControl> gTracker{
+    D::Preview("TrackerControl").Tags<TrackerControlTags>().MapName("InputControl.Create")};
 ControlRegistration<TransformControl> gTransform{
     D::Preview("TransformControl").Tags<TransformControlTags>().Flag(REG_PreviewFlag65)};
 ControlRegistration<XYOffsetControl> gXYOffset{D::Preview("XYOffsetControl").Tags<XYOffsetControlTags>()};

@@ -1,0 +1,227 @@
+// MeshControl: drawing the wireframe, the vertices, the selection box and
+// the labels.
+#include "overlays/MeshControl.h"
+
+#include "framework/OverlayValue.h"
+
+#include "orbane/GPainter.h"
+#include "orbane/PreviewInfo.h"
+
+#include <cmath>
+#include <string>
+
+namespace Orbane {
+
+using Graphics::GColor;
+using Graphics::GPainter;
+using OV = OverlayValue;
+
+namespace {
+
+// The rest mesh is drawn this faint, under the mesh.
+constexpr float32 kRestAlpha = 0.5f;
+// Stipples of MSC_LineStyle: dashes of 6 pixels, dots of 2.
+constexpr uint16 kDash = 0x0FC0;
+constexpr uint16 kDot = 0x3333;
+
+GColor ColorOr(const PreviewInfo &info, OrbColor c, GColor fallback)
+{
+    return c.IsNone() ? fallback : info.GetColor(c);
+}
+
+} // namespace
+
+void MeshControl::DrawControls(PreviewInfo *info, const TagList *tags)
+{
+    GPainter *p = info->GetPainter();
+    if (p && info->DrawPass != 3 && Shows()) {
+        p->PushAttrib();
+        const GColor overlay = info->GetColor(OrbColor());
+        if (mLook.showRest && mRestInput && mRest.Count() > 0) {
+            GColor rest = ColorOr(*info, mLook.rest, GColor{0.6f, 0.6f, 0.6f});
+            rest.a *= kRestAlpha;
+            DrawMesh(*p, *info, mRest, rest, true);
+        }
+        const bool dragging = mDragType == DRAG_Handle;
+        if (!(mLook.hideWhileDragging && dragging))
+            DrawMesh(*p, *info, mMesh, ColorOr(*info, mLook.line, overlay), false);
+        else
+            DrawMesh(*p, *info, mMesh, GColor{0, 0, 0, 0}, false);
+        DrawBox(*p, *info);
+        p->PopAttrib();
+    }
+    HandleOverlay::DrawControls(info, tags);
+}
+
+// The lines of `mesh` in `line` (nothing where it is clear), then, for the
+// mesh itself, its vertices and labels.
+void MeshControl::DrawMesh(GPainter &p, const PreviewInfo &info, const MeshGrid &mesh, GColor line, bool rest) const
+{
+    std::vector<OrbPoint> at(mesh.points.size());
+    for (std::size_t i = 0; i < at.size(); ++i)
+        at[i] = ViewerPoint(info, mesh.points[i]);
+    if (line.a > 0.0f) {
+        p.Enable(Graphics::GC_Blend);
+        line.a *= float32(mLook.opacity);
+        p.Color(line, rest ? GColor{0, 0, 0, 0} : HandleShadow(info));
+        p.LineWidth(float32(mLook.lineWidth));
+        if (mLook.lineStyle != 0) {
+            p.Enable(Graphics::GC_LineStipple);
+            p.LineStipple(1, mLook.lineStyle == 1 ? kDash : kDot);
+        }
+        DrawLines(p, at, mesh);
+        p.Disable(Graphics::GC_LineStipple);
+        if (mLook.showBorder && !rest) {
+            GColor border = ColorOr(info, mLook.border, line);
+            border.a = line.a;
+            p.Color(border, HandleShadow(info));
+            p.LineWidth(float32(mLook.borderWidth));
+            p.Begin(Graphics::GP_LineLoop);
+            auto vertex = [&](int32 c, int32 r) {
+                const OrbPoint &v = at[std::size_t(mesh.Index(c, r))];
+                p.Vertex(v.x, v.y);
+            };
+            for (int32 c = 0; c < mesh.cols; ++c)
+                vertex(c, 0);
+            for (int32 r = 1; r < mesh.rows; ++r)
+                vertex(mesh.cols - 1, r);
+            for (int32 c = mesh.cols - 2; c >= 0; --c)
+                vertex(c, mesh.rows - 1);
+            for (int32 r = mesh.rows - 2; r > 0; --r)
+                vertex(0, r);
+            p.End();
+        }
+    }
+    if (!rest) {
+        DrawVertices(p, info, at);
+        DrawLabels(p, info, at);
+    }
+}
+
+// Row lines, column lines (every n-th inner one) and the cells' diagonals,
+// one strip per line so that a dashed style runs along it.
+void MeshControl::DrawLines(GPainter &p, const std::vector<OrbPoint> &at, const MeshGrid &mesh) const
+{
+    auto drawn = [this](int32 n, int32 count) { return n == 0 || n == count - 1 || n % mLook.lineEvery == 0; };
+    auto strip = [&](int32 count, auto index) {
+        p.Begin(Graphics::GP_LineStrip);
+        for (int32 k = 0; k < count; ++k) {
+            const OrbPoint &v = at[std::size_t(index(k))];
+            p.Vertex(v.x, v.y);
+        }
+        p.End();
+    };
+    if (mLook.showRows)
+        for (int32 r = 0; r < mesh.rows; ++r)
+            if (drawn(r, mesh.rows))
+                strip(mesh.cols, [&](int32 c) { return mesh.Index(c, r); });
+    if (mLook.showColumns)
+        for (int32 c = 0; c < mesh.cols; ++c)
+            if (drawn(c, mesh.cols))
+                strip(mesh.rows, [&](int32 r) { return mesh.Index(c, r); });
+    if (mLook.showDiagonals) {
+        p.Begin(Graphics::GP_Lines);
+        for (int32 r = 0; r + 1 < mesh.rows; ++r)
+            for (int32 c = 0; c + 1 < mesh.cols; ++c) {
+                const OrbPoint &a = at[std::size_t(mesh.Index(c, r))], &b = at[std::size_t(mesh.Index(c + 1, r + 1))];
+                p.Vertex(a.x, a.y);
+                p.Vertex(b.x, b.y);
+            }
+        p.End();
+    }
+}
+
+// Idle vertices in one batch, then the selected ones, then the one under
+// the mouse, so that the highlight lies on top.
+void MeshControl::DrawVertices(GPainter &p, const PreviewInfo &info, const std::vector<OrbPoint> &at) const
+{
+    if (!mLook.showVertices || mLook.readOnly)
+        return;
+    std::vector<int32> idle, selected;
+    idle.reserve(at.size());
+    for (std::size_t i = 0; i < at.size(); ++i)
+        (mSelected[i] ? selected : idle).push_back(int32(i));
+    const GColor shadow = HandleShadow(info);
+    const GColor normal = ColorOr(info, mLook.handle, info.GetColor(OrbColor()));
+    p.Color(normal.Faded(Fade()), shadow);
+    DrawVertexSet(p, info, at, idle);
+    p.Color(ColorOr(info, mLook.selected, HandleSet::Highlight).Faded(Fade()), shadow);
+    DrawVertexSet(p, info, at, selected);
+    const HandleHit poised = Handles().PoisedHit();
+    if (poised.part == 1 && poised.item >= 0 && poised.item < int32(at.size())) {
+        p.Color(HandleSet::Highlight, shadow);
+        DrawVertexSet(p, info, at, {poised.item});
+    }
+}
+
+void MeshControl::DrawVertexSet(GPainter &p, const PreviewInfo &info, const std::vector<OrbPoint> &at,
+                                const std::vector<int32> &which) const
+{
+    if (which.empty())
+        return;
+    const float64 s = mLook.vertexSize * info.HandleScale;
+    if (mLook.vertexShape == 0) {
+        // Squares are points: one batch however many there are.
+        p.PointSize(float32(2.0 * s + 1.0));
+        p.Begin(Graphics::GP_Points);
+        for (const int32 i : which)
+            if (OV::OnScreen(at[std::size_t(i)]))
+                p.Vertex(at[std::size_t(i)].x, at[std::size_t(i)].y);
+        p.End();
+        return;
+    }
+    // Discs as octagons, diamonds as turned squares: triangles of one batch.
+    const int32 sides = mLook.vertexShape == 1 ? 8 : 4;
+    p.Begin(Graphics::GP_Triangles);
+    for (const int32 i : which) {
+        const OrbPoint c = at[std::size_t(i)];
+        if (!OV::OnScreen(c))
+            continue;
+        for (int32 k = 0; k < sides; ++k) {
+            const float64 a0 = 2 * M_PI * k / sides, a1 = 2 * M_PI * (k + 1) / sides;
+            p.Vertex(c.x, c.y);
+            p.Vertex(c.x + s * std::cos(a0), c.y + s * std::sin(a0));
+            p.Vertex(c.x + s * std::cos(a1), c.y + s * std::sin(a1));
+        }
+    }
+    p.End();
+}
+
+void MeshControl::DrawBox(GPainter &p, const PreviewInfo &info) const
+{
+    if (!mBoxing)
+        return;
+    const OrbPoint a = info.TransformOut(mBoxFrom), b = info.TransformOut(mBoxTo);
+    p.Color(ColorOr(info, mLook.box, HandleSet::Highlight), HandleShadow(info));
+    p.LineWidth(1.0f);
+    p.Enable(Graphics::GC_LineStipple);
+    p.LineStipple(1, kDash);
+    p.Begin(Graphics::GP_LineLoop);
+    p.Vertex(a.x, a.y);
+    p.Vertex(b.x, a.y);
+    p.Vertex(b.x, b.y);
+    p.Vertex(a.x, b.y);
+    p.End();
+    p.Disable(Graphics::GC_LineStipple);
+}
+
+// The label at the top-left vertex; with MSC_ShowLabels each selected
+// vertex's number (as OverlayState's `selection` counts them) beside it.
+void MeshControl::DrawLabels(GPainter &p, const PreviewInfo &info, const std::vector<OrbPoint> &at) const
+{
+    const GColor color = info.GetColor(OrbColor());
+    p.Color(color, HandleShadow(info));
+    const float64 gap = (mLook.vertexSize + 3.0) * info.HandleScale;
+    if (!mLook.label.empty()) {
+        const OrbPoint &corner = at[std::size_t(mMesh.Index(0, mMesh.rows - 1))];
+        if (OV::OnScreen(corner))
+            p.Text(corner.x, corner.y + gap, mLook.label.c_str());
+    }
+    if (!mLook.showLabels)
+        return;
+    for (std::size_t i = 0; i < at.size(); ++i)
+        if (mSelected[i] && OV::OnScreen(at[i]))
+            p.Text(at[i].x + gap, at[i].y + gap, std::to_string(i + 1).c_str());
+}
+
+} // namespace Orbane
