@@ -16,5 +16,6 @@ return {
     { file = "tools/Framing.lua", name = "Framing1" },
     { file = "tools/Colour.lua", name = "Colour1" },
     { file = "tools/Grading.lua", name = "Grading1" },
+    { file = "tools/Warp.lua", name = "Warp1" },
   },
 }
