@@ -40,6 +40,9 @@ const std::vector<Goal> &Goals()
         {"H2", "curve graph repaint while a point is dragged", "BM_CurveGraph_DragRepaint", nullptr, 1.0, ""},
         {"C1", "inspector build, 200 colour controls (four channel Inputs each)", "BM_Inspector_BuildColours/200",
          "BM_StockColourRows_Build/200", 1.0, "stock Qt rows"},
+        {"M1", "repaint a viewer with a 100 x 100 warp mesh", "BM_Viewer_DrawMesh/100", nullptr, 8.3, ""},
+        {"K1", "track one point over 100 HD frames read from disk, a key per frame", "BM_Tracker_HDSequence/100",
+         nullptr, 2000.0, ""},
     };
     return goals;
 }

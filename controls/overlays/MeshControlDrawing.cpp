@@ -69,7 +69,7 @@ void MeshControl::DrawMesh(GPainter &p, const PreviewInfo &info, const MeshGrid 
             p.Enable(Graphics::GC_LineStipple);
             p.LineStipple(1, mLook.lineStyle == 1 ? kDash : kDot);
         }
-        DrawLines(p, at, mesh);
+        DrawLines(p, at, mesh, mLook.showDiagonals && !rest);
         p.Disable(Graphics::GC_LineStipple);
         if (mLook.showBorder && !rest) {
             GColor border = ColorOr(info, mLook.border, line);
@@ -99,8 +99,9 @@ void MeshControl::DrawMesh(GPainter &p, const PreviewInfo &info, const MeshGrid 
 }
 
 // Row lines, column lines (every n-th inner one) and the cells' diagonals,
-// one strip per line so that a dashed style runs along it.
-void MeshControl::DrawLines(GPainter &p, const std::vector<OrbPoint> &at, const MeshGrid &mesh) const
+// one strip per line so that a dashed style runs along it. The rest mesh
+// shows no diagonals: they would only clutter the mesh over it.
+void MeshControl::DrawLines(GPainter &p, const std::vector<OrbPoint> &at, const MeshGrid &mesh, bool diagonals) const
 {
     auto drawn = [this](int32 n, int32 count) { return n == 0 || n == count - 1 || n % mLook.lineEvery == 0; };
     auto strip = [&](int32 count, auto index) {
@@ -119,7 +120,7 @@ void MeshControl::DrawLines(GPainter &p, const std::vector<OrbPoint> &at, const 
         for (int32 c = 0; c < mesh.cols; ++c)
             if (drawn(c, mesh.cols))
                 strip(mesh.rows, [&](int32 r) { return mesh.Index(c, r); });
-    if (mLook.showDiagonals) {
+    if (diagonals) {
         p.Begin(Graphics::GP_Lines);
         for (int32 r = 0; r + 1 < mesh.rows; ++r)
             for (int32 c = 0; c + 1 < mesh.cols; ++c) {

@@ -17,7 +17,8 @@ namespace {
 
 constexpr Tag MSC_ShowRows = 0x10058003, MSC_ShowColumns = 0x10058004, MSC_LockBorder = 0x1005800a;
 constexpr Tag MSC_SlideBorder = 0x1005800c, MSC_SnapToPixels = 0x1005800d, MSC_MirrorX = 0x1005801b;
-constexpr Tag MSC_BoxSelect = 0x10058010, MSCID_Visible = 0x80058002;
+constexpr Tag MSC_BoxSelect = 0x10058010, MSC_ClampToImage = 0x1005800f, MSCD_Falloff = 0x20058005;
+constexpr Tag MSCID_Visible = 0x80058002;
 
 // A 5 x 3 mesh from (0.1, 0.2) to (0.9, 0.8): at zoom 1 its vertices lie on
 // widget columns 90, 170, 250, 330, 410 and rows 210, 150, 90 (bottom up).
@@ -138,7 +139,8 @@ private slots:
 
     void drag_data()
     {
-        QTest::addColumn<int>("rule"); // a boolean tag switched on, or 0
+        QTest::addColumn<int>("rule");      // a tag, or 0
+        QTest::addColumn<double>("amount"); // its value
         QTest::addColumn<QStringList>("select");
         QTest::addColumn<int>("grab");
         QTest::addColumn<QPoint>("move"); // widget pixels, Y down
@@ -148,29 +150,36 @@ private slots:
         QTest::addColumn<int>("other");
         QTest::addColumn<QPointF>("otherMoved");
         const QPointF still;
-        QTest::newRow("one vertex") << 0 << QStringList{} << 7 << QPoint(20, -10) << 0 << 1.0 << QPointF(20, 10) << 8
-                                    << still;
+        QTest::newRow("one vertex") << 0 << 1.0 << QStringList{} << 7 << QPoint(20, -10) << 0 << 1.0 << QPointF(20, 10)
+                                    << 8 << still;
         QTest::newRow("zoom 2: half as far")
-            << 0 << QStringList{} << 7 << QPoint(20, -10) << 0 << 2.0 << QPointF(10, 5) << 6 << still;
-        QTest::newRow("the selection moves together") << 0 << QStringList{"click 8", "shift 7"} << 7 << QPoint(20, 10)
-                                                      << 0 << 1.0 << QPointF(20, -10) << 8 << QPointF(20, -10);
-        QTest::newRow("Ctrl: a tenth") << 0 << QStringList{} << 7 << QPoint(40, 0) << int(Qt::ControlModifier) << 1.0
-                                       << QPointF(4, 0) << 8 << still;
-        QTest::newRow("locked border stays") << int(MSC_LockBorder) << QStringList{"click 2", "shift 7"} << 7
+            << 0 << 1.0 << QStringList{} << 7 << QPoint(20, -10) << 0 << 2.0 << QPointF(10, 5) << 6 << still;
+        QTest::newRow("the selection moves together")
+            << 0 << 1.0 << QStringList{"click 8", "shift 7"} << 7 << QPoint(20, 10) << 0 << 1.0 << QPointF(20, -10) << 8
+            << QPointF(20, -10);
+        QTest::newRow("Ctrl: a tenth") << 0 << 1.0 << QStringList{} << 7 << QPoint(40, 0) << int(Qt::ControlModifier)
+                                       << 1.0 << QPointF(4, 0) << 8 << still;
+        QTest::newRow("locked border stays") << int(MSC_LockBorder) << 1.0 << QStringList{"click 2", "shift 7"} << 7
                                              << QPoint(20, -20) << 0 << 1.0 << QPointF(20, 20) << 2 << still;
         QTest::newRow("sliding border keeps to its side")
-            << int(MSC_SlideBorder) << QStringList{} << 2 << QPoint(20, -20) << 0 << 1.0 << QPointF(20, 0) << 7
+            << int(MSC_SlideBorder) << 1.0 << QStringList{} << 2 << QPoint(20, -20) << 0 << 1.0 << QPointF(20, 0) << 7
             << still;
-        QTest::newRow("snapped to whole pixels")
-            << int(MSC_SnapToPixels) << QStringList{} << 7 << QPoint(3, 0) << 0 << 4.0 << QPointF(1, 0) << 8 << still;
-        QTest::newRow("mirrored across the middle") << int(MSC_MirrorX) << QStringList{} << 6 << QPoint(10, -10) << 0
-                                                    << 1.0 << QPointF(10, 10) << 8 << QPointF(-10, 10);
+        QTest::newRow("snapped to whole pixels") << int(MSC_SnapToPixels) << 1.0 << QStringList{} << 7 << QPoint(3, 0)
+                                                 << 0 << 4.0 << QPointF(1, 0) << 8 << still;
+        QTest::newRow("mirrored across the middle") << int(MSC_MirrorX) << 1.0 << QStringList{} << 6 << QPoint(10, -10)
+                                                    << 0 << 1.0 << QPointF(10, 10) << 8 << QPointF(-10, 10);
+        QTest::newRow("soft selection: a neighbour follows a little")
+            << int(MSCD_Falloff) << 100.0 << QStringList{} << 7 << QPoint(20, 0) << 0 << 1.0 << QPointF(20, 0) << 8
+            << QPointF(20 * 0.104, 0); // 80 pixels off: weight 0.2^2 (3 - 0.4)
+        QTest::newRow("clamped to the image") << int(MSC_ClampToImage) << 1.0 << QStringList{} << 14 << QPoint(60, 0)
+                                              << 0 << 1.0 << QPointF(40, 0) << 13 << still;
     }
     // A drag moves the selection as the rules allow, one undo step that
     // puts every vertex back.
     void drag()
     {
         QFETCH(int, rule);
+        QFETCH(double, amount);
         QFETCH(QStringList, select);
         QFETCH(int, grab);
         QFETCH(QPoint, move);
@@ -180,7 +189,10 @@ private slots:
         QFETCH(int, other);
         QFETCH(QPointF, otherMoved);
         ViewerFixture f;
-        Input *mesh = AddMesh(f, rule ? TagList{{Tag(rule), 1}} : TagList());
+        TagList rules;
+        if (rule)
+            rules.Set(Tag(rule), TagTypeOf(Tag(rule)) == TAGTYPE_Double ? TagValue(amount) : TagValue(int32(amount)));
+        Input *mesh = AddMesh(f, rules);
         QVERIFY(f.Show());
         f.viewer.SetView(zoom);
         QApplication::processEvents();
