@@ -281,6 +281,14 @@ void MeshControl::BuildHandles(const PreviewInfo &info, HandleSet &handles) cons
     handles.AddBox(mid, (lo - mid) * (1.0 / scale), (hi - mid) * (1.0 / scale), kBody, HP_Body);
 }
 
+// Between vertices the mesh takes a press (for a selection box) but claims
+// no hover: overlays under it still light up, and the mesh does not.
+HandleHit MeshControl::HoverHit(PreviewInfo &info)
+{
+    const HandleHit hit = HandleOverlay::HoverHit(info);
+    return hit.part == kVertex ? hit : HandleHit();
+}
+
 MeshMoveRules MeshControl::RulesFor(const PreviewInfo &info) const
 {
     MeshMoveRules r = mLook.rules;

@@ -60,6 +60,7 @@ public:
 
 protected:
     void BuildHandles(const PreviewInfo &info, HandleSet &handles) const override;
+    HandleHit HoverHit(PreviewInfo &info) override;
 
 private:
     // What the tags set; see MeshTags.h for each.

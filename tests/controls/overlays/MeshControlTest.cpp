@@ -216,6 +216,19 @@ private slots:
             QVERIFY(Near(VertexOf(f, mesh, i), Rest(i)));
     }
 
+    // A vertex under the mouse lights up; between vertices the mesh takes a
+    // press but claims no hover.
+    void hover()
+    {
+        ViewerFixture f;
+        Input *mesh = AddMesh(f);
+        QVERIFY(f.Show());
+        f.Hover(f.At(Rest(7), QPoint(2, -2)));
+        QCOMPARE(StateOf(f.OverlayOf(mesh), "hoverPart"), 1.0);
+        f.Hover(QPoint(130, 120));
+        QCOMPARE(StateOf(f.OverlayOf(mesh), "hoverPart"), 0.0);
+    }
+
     // Arrow keys nudge the selection; a run of them is one step.
     void nudges()
     {
