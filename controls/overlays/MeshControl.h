@@ -93,6 +93,7 @@ private:
     void DrawMesh(Graphics::GPainter &p, const PreviewInfo &info, const MeshGrid &mesh, Graphics::GColor line,
                   bool rest) const;
     void DrawLines(Graphics::GPainter &p, const std::vector<OrbPoint> &at, const MeshGrid &mesh, bool diagonals) const;
+    static OrbPoint CellSizes(const std::vector<OrbPoint> &at, const MeshGrid &mesh);
     void DrawVertices(Graphics::GPainter &p, const PreviewInfo &info, const std::vector<OrbPoint> &at) const;
     void DrawVertexSet(Graphics::GPainter &p, const PreviewInfo &info, const std::vector<OrbPoint> &at,
                        const std::vector<int32> &which) const;

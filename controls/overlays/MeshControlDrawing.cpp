@@ -7,6 +7,7 @@
 #include "orbane/GPainter.h"
 #include "orbane/PreviewInfo.h"
 
+#include <algorithm>
 #include <cmath>
 #include <string>
 
@@ -23,6 +24,8 @@ constexpr float32 kRestAlpha = 0.5f;
 // Stipples of MSC_LineStyle: dashes of 6 pixels, dots of 2.
 constexpr uint16 kDash = 0x0FC0;
 constexpr uint16 kDot = 0x3333;
+// Row and column lines are drawn at least this far apart, viewer pixels.
+constexpr float64 kMinLineGap = 8.0;
 
 GColor ColorOr(const PreviewInfo &info, OrbColor c, GColor fallback)
 {
@@ -103,7 +106,12 @@ void MeshControl::DrawMesh(GPainter &p, const PreviewInfo &info, const MeshGrid 
 // shows no diagonals: they would only clutter the mesh over it.
 void MeshControl::DrawLines(GPainter &p, const std::vector<OrbPoint> &at, const MeshGrid &mesh, bool diagonals) const
 {
-    auto drawn = [this](int32 n, int32 count) { return n == 0 || n == count - 1 || n % mLook.lineEvery == 0; };
+    // Lines closer on screen than kMinLineGap make a grey mass, not a
+    // wireframe: a dense mesh shows every n-th line until it is zoomed in.
+    const OrbPoint cell = CellSizes(at, mesh);
+    const int32 everyRow = std::max(mLook.lineEvery, int32(std::ceil(kMinLineGap / std::max(cell.y, 1e-9))));
+    const int32 everyColumn = std::max(mLook.lineEvery, int32(std::ceil(kMinLineGap / std::max(cell.x, 1e-9))));
+    auto drawn = [](int32 n, int32 count, int32 every) { return n == 0 || n == count - 1 || n % every == 0; };
     auto strip = [&](int32 count, auto index) {
         p.Begin(Graphics::GP_LineStrip);
         for (int32 k = 0; k < count; ++k) {
@@ -114,11 +122,11 @@ void MeshControl::DrawLines(GPainter &p, const std::vector<OrbPoint> &at, const 
     };
     if (mLook.showRows)
         for (int32 r = 0; r < mesh.rows; ++r)
-            if (drawn(r, mesh.rows))
+            if (drawn(r, mesh.rows, std::min(everyRow, mesh.rows)))
                 strip(mesh.cols, [&](int32 c) { return mesh.Index(c, r); });
     if (mLook.showColumns)
         for (int32 c = 0; c < mesh.cols; ++c)
-            if (drawn(c, mesh.cols))
+            if (drawn(c, mesh.cols, std::min(everyColumn, mesh.cols)))
                 strip(mesh.rows, [&](int32 r) { return mesh.Index(c, r); });
     if (diagonals) {
         p.Begin(Graphics::GP_Lines);
@@ -138,10 +146,18 @@ void MeshControl::DrawVertices(GPainter &p, const PreviewInfo &info, const std::
 {
     if (!mLook.showVertices || mLook.readOnly)
         return;
+    // Where the cells are smaller than the handles, the handles would only
+    // cover the lines and each other: such a mesh shows its lines with only
+    // the selected vertices and the one under the mouse.
+    const OrbPoint cell = CellSizes(at, mMesh);
+    const bool dense = std::min(cell.x, cell.y) < 2.0 * mLook.vertexSize * info.HandleScale + 2.0;
     std::vector<int32> idle, selected;
-    idle.reserve(at.size());
+    idle.reserve(dense ? 0 : at.size());
     for (std::size_t i = 0; i < at.size(); ++i)
-        (mSelected[i] ? selected : idle).push_back(int32(i));
+        if (mSelected[i])
+            selected.push_back(int32(i));
+        else if (!dense)
+            idle.push_back(int32(i));
     const GColor shadow = HandleShadow(info);
     const GColor normal = ColorOr(info, mLook.handle, info.GetColor(OrbColor()));
     p.Color(normal.Faded(Fade()), shadow);
@@ -153,6 +169,17 @@ void MeshControl::DrawVertices(GPainter &p, const PreviewInfo &info, const std::
         p.Color(HandleSet::Highlight, shadow);
         DrawVertexSet(p, info, at, {poised.item});
     }
+}
+
+// An average cell's sides on screen (viewer units): across, up.
+OrbPoint MeshControl::CellSizes(const std::vector<OrbPoint> &at, const MeshGrid &mesh)
+{
+    OrbPoint lo(HUGE_VAL, HUGE_VAL), hi(-HUGE_VAL, -HUGE_VAL);
+    for (const OrbPoint &p : at) {
+        lo = {std::min(lo.x, p.x), std::min(lo.y, p.y)};
+        hi = {std::max(hi.x, p.x), std::max(hi.y, p.y)};
+    }
+    return {(hi.x - lo.x) / std::max(mesh.cols - 1, 1), (hi.y - lo.y) / std::max(mesh.rows - 1, 1)};
 }
 
 void MeshControl::DrawVertexSet(GPainter &p, const PreviewInfo &info, const std::vector<OrbPoint> &at,
