@@ -427,6 +427,42 @@ int ViewerTip(lua_State *L)
     return 1;
 }
 
+// Track(tool, input, "forward"|"backward" [, { from =, to = }]) -> frames
+// tracked, message: runs the tracker overlay of the Input through the
+// viewer's sequence, blocking, without a dialog. Forward runs from `from`
+// (the current frame) to `to` (the last frame); backward from `to` (the
+// current frame) down to `from` (the first frame).
+int Track(lua_State *L)
+{
+    const LuaArgs args(L, "Track");
+    const char *direction = args.String(3, "direction");
+    const bool forward = std::strcmp(direction, "forward") == 0;
+    if (!forward && std::strcmp(direction, "backward") != 0)
+        args.Fail(3, "direction", "expected \"forward\" or \"backward\"");
+    QString range = ":";
+    if (lua_istable(L, 4)) {
+        constexpr int32 kFar = 1 << 30;
+        const auto frame = [&](const char *key) {
+            return args.HasField(4, key) ? QString::number(args.IntegerField(4, key, -kFar, kFar, 0)) : QString();
+        };
+        range = forward ? frame("from") + ":" + frame("to") : frame("to") + ":" + frame("from");
+    }
+    lua_settop(L, 2);
+    lua_pushstring(L, "TrackerControl");
+    PreviewControl *overlay = OverlayOrRaise(L);
+    ViewerPanel *viewer = gWindow->Viewer();
+    TagList tags{{PCA_FromScript, 1}};
+    tags.Set(PCA_CommandValue, OrbString(range.toUtf8().constData()));
+    overlay->HandleEvent(OrbID(forward ? "TrackForward" : "TrackBackward"), &viewer->Info(), &tags);
+    ScriptVal state = ScriptVal::NewTable();
+    overlay->GetState(state);
+    const ScriptVal *tracked = state.FindKeyConst(ScriptVal("tracked"));
+    const ScriptVal *message = state.FindKeyConst(ScriptVal("trackMessage"));
+    lua_pushinteger(L, tracked ? lua_Integer(tracked->GetNumber()) : 0);
+    lua_pushstring(L, message ? message->GetString() : "");
+    return 2;
+}
+
 } // namespace
 
 void ViewerScripting::Install(MainWindow *window)
@@ -449,6 +485,7 @@ void ViewerScripting::Install(MainWindow *window)
         {"ViewerToolbarPress", ViewerToolbarPress},
         {"ViewerTip", ViewerTip},
         {"ViewerCamera", ViewerCamera},
+        {"Track", Track},
     };
     for (const auto &[name, fn] : functions)
         LuaRuntime::Instance().AddModuleFunction(name, fn);

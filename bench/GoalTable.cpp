@@ -44,6 +44,9 @@ const std::vector<Goal> &Goals()
          "BM_Srgb8Decode_Processor", 0.2, "OpenColorIO's processor over every value"},
         {"V3", "hover over 100 each of the cube, camera and light overlays, one mouse event", "BM_Viewer_Hover3D/100",
          nullptr, 0.5, ""},
+        {"M1", "repaint a viewer with a 100 x 100 warp mesh", "BM_Viewer_DrawMesh/100", nullptr, 8.3, ""},
+        {"K1", "track one point over 100 HD frames read from disk, a key per frame", "BM_Tracker_HDSequence/100",
+         nullptr, 2000.0, ""},
     };
     return goals;
 }

@@ -17,5 +17,6 @@ return {
     { file = "tools/Colour.lua", name = "Colour1" },
     { file = "tools/Grading.lua", name = "Grading1" },
     { file = "tools/Scene.lua", name = "Scene1" },
+    { file = "tools/Warp.lua", name = "Warp1" },
   },
 }

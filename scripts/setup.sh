@@ -9,6 +9,7 @@ packages=(
     libluajit-5.1-dev luajit libmuparser-dev libpolyclipping-dev libpugixml-dev
     libopenimageio-dev
     libopencolorio-dev
+    libopencv-imgproc-dev
     googletest libgtest-dev libbenchmark-dev
     fonts-dejavu-core
     clang libclang-rt-14-dev

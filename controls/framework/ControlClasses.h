@@ -1,6 +1,7 @@
 #pragma once
 
-#include "framework/PendingPreviewControl.h"
+// Every control class of the library, by its native type name: each has a
+// header/source pair named after it, and its registration in Registration.cpp.
 
 #include "inputcontrols/ButtonControl.h"
 #include "inputcontrols/CheckBoxControl.h"
@@ -40,31 +41,14 @@
 #include "overlays/ImgOverlayControl.h"
 #include "overlays/LightControl.h"
 #include "overlays/ObloidControl.h"
+#include "overlays/MeshControl.h"
 #include "overlays/PointControl.h"
 #include "overlays/PositionerControl.h"
 #include "overlays/RectangleControl.h"
 #include "overlays/SliderOverlay.h"
+#include "overlays/TrackerControl.h"
 #include "overlays/TransformControl.h"
 #include "overlays/XYOffsetControl.h"
 #include "polyline/PolyLineControl.h"
 
 #include "orbane/OverlayControl.h"
-
-// Every control class of the library, by its native type name. A class that
-// is not written yet is a pending stand-in of its family with a type of its
-// own. To bring in the real class: give it a header/source pair named after
-// it, replace its line here by an #include of that header, and give it
-// `static bool RegCleanup(Registry *)` where the pending one declares a
-// class-specific clean-up (Angle, Ellipse, Fontfile, Spline). The registration
-// in Registration.cpp stays as it is.
-#define ORBANE_PENDING_PREVIEW(Class) ORBANE_PENDING_DERIVED(Class, PreviewControl)
-#define ORBANE_PENDING_DERIVED(Class, Base)                                                                            \
-    struct Class##Marker;                                                                                              \
-    using Class = PendingPreviewControl<Class##Marker, Base>
-
-namespace Orbane {
-
-ORBANE_PENDING_PREVIEW(MeshControl);
-ORBANE_PENDING_PREVIEW(TrackerControl);
-
-} // namespace Orbane

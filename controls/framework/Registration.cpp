@@ -26,6 +26,7 @@
 #include "framework/ImgOverlayTags.h"
 #include "framework/LabelTags.h"
 #include "framework/ListTags.h"
+#include "framework/MeshTags.h"
 #include "framework/MultiButtonTags.h"
 #include "framework/ObloidTags.h"
 #include "framework/OffsetTags.h"
@@ -39,6 +40,7 @@
 #include "framework/SplineTags.h"
 #include "framework/LevelsTags.h"
 #include "framework/ColorRangesTags.h"
+#include "framework/TrackerTags.h"
 #include "framework/TransformTags.h"
 #include "framework/VariantRegistration.h"
 #include "framework/XYOffsetTags.h"
@@ -139,7 +141,7 @@ ControlRegistration<LightControl, TransformControl> gLight{D::Preview("LightCont
 ControlRegistration<ListControl> gList{ListDesc()};
 VariantRegistration<ListControl> gListID{ListDesc().Variant(CLSID_InputControl_ListID, "ListIDControl")};
 ControlRegistration<LogControl> gLog{D::Input("LogControl")};
-ControlRegistration<MeshControl> gMesh{D::Preview("MeshControl").Flag(REG_PreviewFlag64)};
+ControlRegistration<MeshControl> gMesh{D::Preview("MeshControl").Tags<MeshControlTags>().Flag(REG_PreviewFlag64)};
 ControlRegistration<MultiButtonControl> gMultiButton{MultiButtonDesc()};
 VariantRegistration<MultiButtonControl> gMultiButtonID{
     MultiButtonDesc().Variant(CLSID_InputControl_MultiButtonID, "MultiButtonIDControl")};
@@ -169,7 +171,8 @@ ControlRegistration<SplineControl> gSpline{D::Input("SplineControl")
                                                .Flag(REG_DisplayName, "Spline Control")
                                                .Flag(REG_MenuPath, "Controls\\Spline")};
 // The tracker is an overlay whose map carries the inspector's name; kept so.
-ControlRegistration<TrackerControl> gTracker{D::Preview("TrackerControl").MapName("InputControl.Create")};
+ControlRegistration<TrackerControl> gTracker{
+    D::Preview("TrackerControl").Tags<TrackerControlTags>().MapName("InputControl.Create")};
 ControlRegistration<TransformControl> gTransform{
     D::Preview("TransformControl").Tags<TransformControlTags>().Flag(REG_PreviewFlag65)};
 ControlRegistration<XYOffsetControl> gXYOffset{D::Preview("XYOffsetControl").Tags<XYOffsetControlTags>()};
