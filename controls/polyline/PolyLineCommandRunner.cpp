@@ -542,7 +542,7 @@ bool PolyLineCommandRunner::Editing(int32 command, int32 arg)
     case PLCMD_FollowNearby:
         return Edited(e.FollowNearby());
     case PLCMD_StopFollowing:
-        return Missing("Stop Points Following", "letting points stop following");
+        return Edited(e.StopFollowing());
     case PLCMD_PublishTo:
         return Edited(e.PublishTo(arg));
     default:
@@ -560,11 +560,6 @@ bool PolyLineCommandRunner::Tell(const std::string &message)
 {
     mControl.Tell(message.c_str());
     return false;
-}
-
-bool PolyLineCommandRunner::Missing(const char *what, const char *missing)
-{
-    return Tell(std::string(what) + ": " + missing + " is not built yet");
 }
 
 } // namespace Orbane

@@ -46,7 +46,6 @@ private:
     bool Write(const char *undo, PolyLine *shape);
     bool Editable(const char *what);
     bool Tell(const std::string &message);
-    bool Missing(const char *what, const char *missing);
     // The value a script gave, or empty.
     std::string Value() const;
     bool FromScript() const;
