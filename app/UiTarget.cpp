@@ -63,8 +63,9 @@ UiTarget Named(const QString &name, MainWindow *window)
         t.widget = window->Viewer();
     else if (name == "ruler")
         t.widget = window->findChild<QWidget *>("timeScale");
-    else
-        t.widget = window->findChild<QWidget *>(name);
+    else if (QWidget *part = window->findChild<QWidget *>(name))
+        t.widget = ClickSurface(part); // a list's rows, as for a control's child
+
     if (!t.widget && t.error.isEmpty())
         t.error = QString("unknown widget \"%1\"; expected inspector, viewer, window, popup, ruler, the object "
                           "name of a window part or a control table")

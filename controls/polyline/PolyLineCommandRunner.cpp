@@ -1,6 +1,7 @@
 #include "polyline/PolyLineCommandRunner.h"
 
 #include "polyline/PolyLineControl.h"
+#include "polyline/PolyLineDialogs.h"
 #include "polyline/PolyLineMenu.h"
 
 #include "orbane/ClassIDs.h"
@@ -14,7 +15,6 @@
 #include <QColor>
 #include <QColorDialog>
 #include <QFileDialog>
-#include <QInputDialog>
 
 #include <algorithm>
 #include <cmath>
@@ -24,20 +24,6 @@
 
 namespace Orbane {
 
-namespace {
-
-// What a newly created shape spans, in image units about the image's centre.
-constexpr float64 kCreateRadius = 0.25;
-
-std::string Format(const char *format, float64 value)
-{
-    char text[64];
-    std::snprintf(text, sizeof text, format, value);
-    return text;
-}
-
-} // namespace
-
 PolyLineCommandRunner::PolyLineCommandRunner(PolyLineControl &control, PreviewInfo *info, const TagList *tags)
     : mControl(control), mInfo(info), mTags(tags)
 {
@@ -46,6 +32,10 @@ PolyLineCommandRunner::PolyLineCommandRunner(PolyLineControl &control, PreviewIn
 bool PolyLineCommandRunner::Run(int32 command, int32 arg)
 {
     PolyLineControl &c = mControl;
+    bool handled = false;
+    const bool done = PolyLineDialogs(c, mInfo, Value()).Run(command, arg, handled);
+    if (handled)
+        return Edited(done);
     switch (command) {
     case PLCMD_ClickAppend:
     case PLCMD_DrawAppend:
@@ -96,16 +86,8 @@ bool PolyLineCommandRunner::Run(int32 command, int32 arg)
         return Edited(c.mEditor.SelectNext(arg));
     case PLCMD_NextKeyframe:
         return NextKeyframe(arg);
-    case PLCMD_KeyframeList:
-        return KeyframeList();
-    case PLCMD_CreateEllipse:
-    case PLCMD_CreateRectangle:
-    case PLCMD_CreateArrow:
-        return Create(command);
     case PLCMD_ToBSpline:
     case PLCMD_ToBezier:
-    case PLCMD_CardinalToBezier:
-    case PLCMD_ToXYPath:
         return Convert(command);
     case PLCMD_SplineColor:
     case PLCMD_KeyPointColor:
@@ -241,38 +223,9 @@ bool PolyLineCommandRunner::Write(const char *undo, PolyLine *shape)
     return true;
 }
 
-// A new shape about the image's centre, in place of the one there is.
-bool PolyLineCommandRunner::Create(int32 command)
-{
-    const char *what = command == PLCMD_CreateEllipse     ? "Create Ellipse"
-                       : command == PLCMD_CreateRectangle ? "Create Rectangle"
-                                                          : "Create Arrow";
-    if (!Editable(what))
-        return false;
-    const AutoRef<PolyLine> shape = mControl.Shape();
-    AutoRef<PolyLine> made(shape ? static_cast<PolyLine *>(shape->Clone()) : new PolyLine);
-    const float64 r = kCreateRadius;
-    bool ok = false;
-    if (command == PLCMD_CreateEllipse)
-        ok = made->MakeEllipse(0.5, 0.5, r, r);
-    else if (command == PLCMD_CreateRectangle)
-        ok = made->MakeRectangle(0.5, 0.5, 2 * r, 2 * r);
-    else
-        ok = made->MakeArrow(0.5 - r, 0.5, 0.5 + r, 0.5, r / 5, r / 2, r / 2);
-    if (!ok)
-        return Tell(std::string(what) + ": the shape could not be made");
-    mControl.mSelection.Reset();
-    return Write(what, made.get());
-}
-
-// Bezier and B-spline convert into each other where the Input holds either;
-// the cardinal and path forms have no value kind here yet.
+// Bezier and B-spline convert into each other where the Input holds either.
 bool PolyLineCommandRunner::Convert(int32 command)
 {
-    if (command == PLCMD_CardinalToBezier)
-        return Tell("Cardinal to Bezier: there are no cardinal splines to convert yet");
-    if (command == PLCMD_ToXYPath)
-        return Tell("Convert to XYPath: there is no XY path value yet");
     const char *what = command == PLCMD_ToBSpline ? "Bezier to B-Spline" : "B-Spline to Bezier";
     if (!Editable(what))
         return false;
@@ -466,12 +419,10 @@ bool PolyLineCommandRunner::Onion(int32 command)
         });
         return true;
     }
-    case PLCMD_OnionResetPrevColor:
+    default: // reset the colour before now
         s.onionPrevColor = OrbColor();
         mControl.Redraw();
         return true;
-    default: // settings
-        return Tell("Onion skin settings: there is no settings dialog yet; the skins show every other keyframe");
     }
 }
 
@@ -536,18 +487,6 @@ bool PolyLineCommandRunner::NextKeyframe(int32 step)
     return true;
 }
 
-// Until the keyframe list has a dialog of its own, the times are told.
-bool PolyLineCommandRunner::KeyframeList()
-{
-    const Input *main = mControl.GetMainInput();
-    if (!main || !main->IsAnimated())
-        return Tell("Polygon keyframes: the shape is not animated");
-    std::string list = "Polygon keyframes:";
-    for (const float64 t : main->KeyTimes())
-        list += Format(" %g", t);
-    return Tell(list);
-}
-
 // --- the editing operations ---
 
 // The edits of the points are the editor's; it refuses with a message.
@@ -555,18 +494,12 @@ bool PolyLineCommandRunner::Editing(int32 command, int32 arg)
 {
     PolyLineEditor &e = mControl.mEditor;
     switch (command) {
-    case PLCMD_EditPoint:
-        return Missing("Edit Point", "the point editor");
     case PLCMD_DeletePoints:
         return Edited(e.DeleteSelected());
     case PLCMD_Smooth:
         return Edited(e.Smooth());
     case PLCMD_Linear:
         return Edited(e.MakeLinear());
-    case PLCMD_SmoothPoints:
-    case PLCMD_SmoothAnimation:
-    case PLCMD_EaseInOut:
-        return Missing("Smoothing", "smoothing of the points' animation");
     case PLCMD_FlipPoints:
         return Edited(e.Flip(arg == 0 ? Qt::Horizontal : Qt::Vertical));
     case PLCMD_TagPoints:
@@ -600,8 +533,6 @@ bool PolyLineCommandRunner::Editing(int32 command, int32 arg)
     }
     case PLCMD_Subdivide:
         return Edited(e.Subdivide());
-    case PLCMD_ReducePoints:
-        return Reduce();
     case PLCMD_PublishPoints:
         return Edited(e.PublishSelected());
     case PLCMD_UnpublishPoints:
@@ -611,48 +542,12 @@ bool PolyLineCommandRunner::Editing(int32 command, int32 arg)
     case PLCMD_FollowNearby:
         return Edited(e.FollowNearby());
     case PLCMD_StopFollowing:
-        return Missing("Stop Points Following", "letting points stop following");
+        return Edited(e.StopFollowing());
     case PLCMD_PublishTo:
         return Edited(e.PublishTo(arg));
     default:
         return Tell("Polyline: unknown command " + std::to_string(command));
     }
-}
-
-// "Reduce Points…": the tolerance in viewer pixels, from a script's value or
-// the dialog; the overlay's freehand tolerance is the dialog's start.
-bool PolyLineCommandRunner::Reduce()
-{
-    PolyLineControl *c = &mControl;
-    const std::string value = Value();
-    if (!value.empty()) {
-        char *end = nullptr;
-        const float64 px = std::strtod(value.c_str(), &end);
-        if (*end || !(px > 0.0) || !std::isfinite(px))
-            return Tell("Reduce Points: \"" + value + "\" is not a tolerance in pixels above 0");
-        return Edited(c->mEditor.Reduce(px));
-    }
-    if (FromScript())
-        return Edited(c->mEditor.Reduce(c->ReduceTolerance()));
-    if (!c->mSurface->dialogs)
-        c->mSurface->dialogs = std::make_unique<QObject>();
-    auto *dialog = new QInputDialog;
-    dialog->setWindowTitle("Reduce Points");
-    dialog->setLabelText("Tolerance in pixels");
-    dialog->setInputMode(QInputDialog::DoubleInput);
-    dialog->setDoubleRange(0.01, 1000.0);
-    dialog->setDoubleValue(c->ReduceTolerance());
-    dialog->setAttribute(Qt::WA_DeleteOnClose);
-    QObject::connect(c->mSurface->dialogs.get(), &QObject::destroyed, dialog, &QObject::deleteLater);
-    QObject::connect(dialog, &QInputDialog::doubleValueSelected, c->mSurface->dialogs.get(), [c](double px) {
-        c->mEditor.Reduce(px);
-        c->ResetUndo(nullptr);
-    });
-    QObject::connect(dialog, &QDialog::finished, c->mSurface->dialogs.get(),
-                     [c](int) { c->mSurface->settings.reduceOpen = false; });
-    c->mSurface->settings.reduceOpen = true;
-    dialog->open();
-    return true;
 }
 
 bool PolyLineCommandRunner::Edited(bool done)
@@ -665,11 +560,6 @@ bool PolyLineCommandRunner::Tell(const std::string &message)
 {
     mControl.Tell(message.c_str());
     return false;
-}
-
-bool PolyLineCommandRunner::Missing(const char *what, const char *missing)
-{
-    return Tell(std::string(what) + ": " + missing + " is not built yet");
 }
 
 } // namespace Orbane

@@ -29,7 +29,6 @@ private:
     bool Mode(int32 command);
     bool Display(int32 command, int32 arg);
     bool Toggle(bool &flag);
-    bool Create(int32 command);
     bool Convert(int32 command);
     bool Color(int32 command);
     bool ExportShape();
@@ -39,17 +38,14 @@ private:
     bool Roto(int32 command);
     bool Number(const char *what, int32 &field, int32 low, int32 high);
     bool NextKeyframe(int32 step);
-    bool KeyframeList();
     bool EditMultiplePolys();
     bool Editing(int32 command, int32 arg);
-    bool Reduce();
     // The editor's answer; it has told the user why where it refused.
     bool Edited(bool done);
     // Writes `shape` as one undo step named `undo`.
     bool Write(const char *undo, PolyLine *shape);
     bool Editable(const char *what);
     bool Tell(const std::string &message);
-    bool Missing(const char *what, const char *missing);
     // The value a script gave, or empty.
     std::string Value() const;
     bool FromScript() const;

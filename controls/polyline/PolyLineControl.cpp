@@ -2,6 +2,7 @@
 
 #include "framework/OverlayValue.h"
 
+#include "polyline/PolyLineDialogs.h"
 #include "polyline/PolyLineTags.h"
 #include "polyline/ShapeBox.h"
 
@@ -31,9 +32,6 @@ constexpr OrbColor kGrey{192, 192, 192};
 constexpr GColor kCyan{0.0f, 1.0f, 1.0f}, kMagenta{1.0f, 0.0f, 1.0f}, kYellow{1.0f, 1.0f, 0.0f};
 // Dimmed handles are this much darker.
 constexpr float32 kDimming = 0.75f;
-// Onion skins: dotted, orange, half seen.
-constexpr uint16 kOnionStipple = 0x0F0F;
-constexpr GColor kOnionColor{1.0f, 0.55f, 0.1f, 0.6f};
 // The centre marker's arms, in handle pixels.
 constexpr float64 kCentreArm = 8.0;
 // A Click Append press pulls the new point's handles only once the mouse has
@@ -294,6 +292,10 @@ void PolyLineControl::NotifyChanged(Input *input, Parameter *value, const TagLis
         StoreLinked(input, value, moved);
     else
         moved = true;
+    // The keyframe list follows keys that come and go without changing
+    // the shape shown now.
+    if (moved || input == GetMainInput())
+        PolyLineDialogs::Follow(*mSurface);
     if (moved)
         HandleOverlay::NotifyChanged(input, value, tags);
 }
@@ -407,6 +409,8 @@ void PolyLineControl::DrawControls(PreviewInfo *info, const TagList *tags)
     GPainter *p = info->GetPainter();
     if (!p || info->DrawPass == 3)
         return HandleOverlay::DrawControls(info, tags);
+    // The point editor follows the selection, which changes in many places.
+    PolyLineDialogs::Follow(*mSurface);
     const ReadGuard guard(*this);
     p->PushAttrib();
     p->PushMatrix();
@@ -452,28 +456,46 @@ void PolyLineControl::DrawCentre(GPainter &p, const PreviewInfo &info) const
     p.PopMatrix();
 }
 
-// The shapes of the other keyframes, dotted in their own colour.
+// The shapes of the nearby keyframes, dotted in their own colour.
 void PolyLineControl::DrawOnionSkins(GPainter &p, const PreviewInfo &info, const PolyLineStyle &style) const
 {
     Input *main = GetMainInput();
-    if (!main || !main->IsAnimated() || !mSurface->settings.onionEnabled)
+    const PolyLineSettings &s = mSurface->settings;
+    if (!main || !main->IsAnimated() || !s.onionEnabled)
         return;
     const float64 now = GetCurrentTime();
     p.PushAttrib();
-    p.LineStipple(1, kOnionStipple);
+    p.LineStipple(1, s.onionStipple);
     p.Enable(Graphics::GC_LineStipple);
-    for (const float64 time : main->KeyTimes()) {
-        if (std::fabs(time - now) < 1e-9)
-            continue;
+    for (const float64 time : SkinTimes()) {
         const AutoParam<PolyLine> skin(main, time);
-        // The skins before now in their own colour, where one is set.
-        const bool prev = time < now && !mSurface->settings.onionPrevColor.IsNone();
-        p.Color(prev ? GColor::FromOrb(mSurface->settings.onionPrevColor) : kOnionColor,
-                info.GetShadow(OrbColor()).Faded(0.5f));
+        // The skins before now in their own colour, where one is set, as
+        // opaque as the others.
+        const OrbColor prev(s.onionPrevColor.R(), s.onionPrevColor.G(), s.onionPrevColor.B(), s.onionColor.A());
+        const bool before = time < now && !s.onionPrevColor.IsNone();
+        p.Color(GColor::FromOrb(before ? prev : s.onionColor), info.GetShadow(OrbColor()).Faded(0.5f));
         if (skin)
             PolyLineDrawing::DrawCurve(p, *skin, style.span);
     }
     p.PopAttrib();
+}
+
+std::vector<float64> PolyLineControl::SkinTimes() const
+{
+    const Input *main = GetMainInput();
+    if (!main || !main->IsAnimated())
+        return {};
+    const float64 now = GetCurrentTime();
+    const std::vector<float64> keys = main->KeyTimes();
+    // Keys this near to now are the shape itself, not a skin.
+    constexpr float64 kAtNow = 1e-9;
+    const auto after = std::upper_bound(keys.begin(), keys.end(), now + kAtNow);
+    const auto atOrAfter = std::lower_bound(keys.begin(), keys.end(), now - kAtNow);
+    const auto first = atOrAfter - std::min<std::ptrdiff_t>(mSurface->settings.onionBefore, atOrAfter - keys.begin());
+    const auto last = after + std::min<std::ptrdiff_t>(mSurface->settings.onionAfter, keys.end() - after);
+    std::vector<float64> times(first, atOrAfter);
+    times.insert(times.end(), after, last);
+    return times;
 }
 
 // --- handles ---

@@ -139,6 +139,8 @@ protected:
 
 private:
     friend class PolyLineCommandRunner;
+    friend class PolyLineDialogs;
+    friend class PolyLineKeyEdit;
     friend class PolyLineEditor;
     friend class PolyLineMouse;
     static const LinkedInput<PolyLineControl> Links[];
@@ -162,6 +164,9 @@ private:
     PolyLineStyle Style(const PreviewInfo &info) const;
     void DrawCentre(Graphics::GPainter &p, const PreviewInfo &info) const;
     void DrawOnionSkins(Graphics::GPainter &p, const PreviewInfo &info, const PolyLineStyle &style) const;
+    // The key times that show an onion skin now: the nearest keys before
+    // and after the current time, as many as the onion settings say.
+    std::vector<float64> SkinTimes() const;
     // Writes `shape` to the main Input at the current time.
     bool WriteShape(PolyLine *shape);
     void ShowCursor(const PreviewInfo &info, bool show);

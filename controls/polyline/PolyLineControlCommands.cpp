@@ -4,6 +4,7 @@
 #include "polyline/PolyLineControl.h"
 
 #include "polyline/PolyLineCommandRunner.h"
+#include "polyline/PolyLineDialogs.h"
 #include "polyline/PolyLineKeys.h"
 #include "polyline/PolyLineMenu.h"
 #include "polyline/PolyLineTips.h"
@@ -147,6 +148,7 @@ uint64 PolyLineControl::ControlCommand(PreviewInfo *info, const OrbID &command, 
         ResetUndo(nullptr);
     } else if (command == CCMD_TimeChanged) {
         // A new time may be a new keyframe: the point numbers and the skins move.
+        PolyLineDialogs::Follow(*mSurface);
         Redraw();
     } else if (command == CCMD_HitTest) {
         const uint64 result = HandleOverlay::ControlCommand(info, command, data, tags);
@@ -209,9 +211,7 @@ bool PolyLineControl::ControlGetTip(PreviewInfo *info, char *buffer, const TagLi
         tip = PolyLineTips::ForPoint(p);
     } else if (mSurface->settings.onionEnabled && main->IsAnimated()) {
         const OrbPoint mouse = info->MouseInViewer();
-        for (const float64 time : main->KeyTimes()) {
-            if (std::fabs(time - GetCurrentTime()) < 1e-9)
-                continue;
+        for (const float64 time : SkinTimes()) {
             const AutoParam<PolyLine> skin(main, time);
             const int32 n = skin ? skin->GetSegmentsCount() * kSkinSamples : 0;
             for (int32 i = 0; i <= n && tip.empty(); ++i)
@@ -238,12 +238,22 @@ void PolyLineControl::AddSurfaceState(ScriptVal &state) const
                            {"onionClickTime", s.onionClickTime},
                            {"rotoAssist", s.rotoEnabled},
                            {"reduceDialog", s.reduceOpen},
+                           {"pointEditor", mSurface->pointEditor && mSurface->pointEditor->isVisible()},
+                           {"keyList", mSurface->keyList && mSurface->keyList->isVisible()},
+                           {"onionDialog", mSurface->onion && mSurface->onion->isVisible()},
                            {"stopRendering", mStopRendering != 0}})
         state.SetKey(ScriptVal(key), ScriptVal(on));
     // Always there, empty until the overlay has told the user something.
     state.SetKey(ScriptVal("message"), ScriptVal(LastMessage().c_str()));
     state.SetKey(ScriptVal("rotoDistance"), ScriptVal(s.rotoDistance));
     state.SetKey(ScriptVal("rotoFrameSkip"), ScriptVal(s.rotoFrameSkip));
+    state.SetKey(ScriptVal("onionBefore"), ScriptVal(s.onionBefore));
+    state.SetKey(ScriptVal("onionAfter"), ScriptVal(s.onionAfter));
+    state.SetKey(ScriptVal("onionStipple"), ScriptVal(int32(s.onionStipple)));
+    char colour[16];
+    std::snprintf(colour, sizeof colour, "#%02x%02x%02x%02x", s.onionColor.R(), s.onionColor.G(), s.onionColor.B(),
+                  s.onionColor.A());
+    state.SetKey(ScriptVal("onionColor"), ScriptVal(colour));
     const bool record[6] = {mRecordTime,    mRecordPressure, mRecordHeight,
                             mRecordAngleXY, mRecordAngleZ,   mRecordRotation};
     int32 bits = 0;

@@ -460,6 +460,19 @@ bool PolyLineEditor::Unpublish()
            Refuse("None of the selected points is published");
 }
 
+// The selected points stop following: they stay where they are now.
+bool PolyLineEditor::StopFollowing()
+{
+    if (!CanEdit() || !NeedSelection())
+        return false;
+    const std::vector<uint8> sel(mControl.mSelection.Bytes(),
+                                 mControl.mSelection.Bytes() + mControl.mSelection.GetCount());
+    return Commit(
+               "Stop Points Following",
+               [&](PolyLine &s) { return PolyLineShapes::SetFlag(s, sel.data(), PPF_Following, false); }, false) ||
+           Refuse("None of the selected points follows another");
+}
+
 bool PolyLineEditor::FollowNearby()
 {
     if (!CanEdit() || !NeedSelection())

@@ -92,6 +92,7 @@ public:
     bool PublishSelected();
     bool Unpublish();
     bool FollowNearby();
+    bool StopFollowing();
     bool PublishTo(int32 target);
     bool LockSelected(bool locked);
     // Does the (first) selected point carry the lock?

@@ -3,7 +3,10 @@
 #include "orbane/OrbColor.h"
 #include "orbane/Types.h"
 
+#include <QDialog>
 #include <QObject>
+#include <QPointer>
+#include <QWidget>
 
 #include <memory>
 
@@ -20,7 +23,14 @@ struct PolyLineSettings
     bool onionEnabled = true;       // the other keyframes' shapes drawn
     bool onionClickTime = false;    // a click on an onion skin goes to its time
     float64 onionAnchor = TIME_UNDEFINED;
-    OrbColor onionPrevColor; // the skins before the current time; none: the skin colour
+    OrbColor onionPrevColor;                // the skins before the current time; none: the skin colour
+    int32 onionBefore = 5, onionAfter = 5;  // how many keyframes before and after now show a skin
+    OrbColor onionColor{255, 140, 26, 153}; // the skins: orange, 60% seen
+    uint16 onionStipple = 0x0F0F;           // their dots
+    // What the dialogs of smoothing and easing start from: the last used.
+    float64 smoothAmount = 0.5;
+    int32 smoothPasses = 1;
+    float64 easeIn = 1.0, easeOut = 1.0;
     bool rotoEnabled = false, rotoMultiple = false, rotoTrackPoints = false;
     bool rotoShowArea = false, rotoPatternEdit = false;
     int32 rotoDistance = 5;  // frames between tracked keys
@@ -33,6 +43,15 @@ struct PolyLineSurface
 {
     PolyLineSettings settings;
     std::unique_ptr<QObject> dialogs; // the parent of open dialogs: they go with the control
+    // The dialogs that live in the window (one each), and the viewer they
+    // open over; they go with the control at once, so none outlives it.
+    QPointer<QWidget> dialogParent;
+    QPointer<QDialog> pointEditor, keyList, onion, numbers;
+    ~PolyLineSurface()
+    {
+        for (QDialog *d : {pointEditor.data(), keyList.data(), onion.data(), numbers.data()})
+            delete d;
+    }
 };
 
 } // namespace Orbane

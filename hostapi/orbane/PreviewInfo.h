@@ -10,6 +10,7 @@
 #include <functional>
 
 class QCursor;
+class QWidget;
 
 namespace Orbane {
 
@@ -98,6 +99,12 @@ public:
     void SetCursor(const QCursor *cursor) const;
     void SetCursorHandler(CursorHandler handler) { mCursorHandler = std::move(handler); }
 
+    // The viewer's widget, under which overlays open their dialogs: they are
+    // then windows of the application (scripts find their parts by object
+    // name) and go with it. Null where no viewer shows the overlay.
+    QWidget *DialogParent() const { return mDialogParent; }
+    void SetDialogParent(QWidget *parent) { mDialogParent = parent; }
+
     // The painter of the pass being drawn; null outside draw passes.
     Graphics::GPainter *GetPainter() const { return mPainter; }
     void SetPainter(Graphics::GPainter *painter) { mPainter = painter; }
@@ -107,6 +114,7 @@ private:
     ViewCamera mCamera = ViewCamera::Default();
     Graphics::GPainter *mPainter = nullptr;
     CursorHandler mCursorHandler;
+    QWidget *mDialogParent = nullptr;
 };
 
 } // namespace Orbane

@@ -39,7 +39,9 @@ check.eq(orbane.ViewerMenuChoose(on, { "Roto Assist", "Distance 5…" }, "8"), t
 check.eq(state().rotoDistance, 8, "the distance taken")
 check.eq(orbane.ViewerMenuChoose(on, { "Draw Style", "Custom Spline Color…" }), false, "no colour given")
 check.eq(state().message, "Custom Spline Color: give the colour as \"#rrggbb\" (or \"none\")", "and says so")
-check.eq(orbane.ViewerMenuChoose(on, { "Edit Point" }), false, "the entry matched before its key")
+check.eq(orbane.ViewerMenuChoose(on, { "Edit Point" }), true, "the entry matched before its key")
+check.eq(state().pointEditor, true, "the point editor opens")
+orbane.Click("pointClose")
 check.fails(function() orbane.ViewerMenuChoose(on, { "Draw Style", "Wavy" }) end, "no entry", "an unknown entry")
 check.fails(function() orbane.ViewerMenuChoose(on, "Dash") end, "path", "a path must be a table")
 

@@ -60,6 +60,7 @@ ViewerPanel::ViewerPanel(OrbaneDoc *doc, QWidget *parent)
         else
             unsetCursor();
     });
+    mInfo.SetDialogParent(this);
     mToolBar = new QToolBar(this);
     mToolBar->hide();
     connect(doc, SIGNAL(toolRemoving(Orbane::Operator *)), this, SLOT(OnToolRemoving(Orbane::Operator *)));

@@ -235,6 +235,27 @@ const std::vector<OpRow> &OpRows()
              ASSERT_TRUE(p);
              EXPECT_TRUE(Near({p->X, p->Y}, kCorners[1]));
          }},
+        {"stop following",
+         [] {
+             AutoRef<PolyLine> s = Corners();
+             PolyPoint p = *s->GetPoint(1);
+             p.Flags |= PPF_Following;
+             s->SetPoint(1, p);
+             return s;
+         },
+         {1},
+         [](Rig &r) { return r.Edit().StopFollowing(); },
+         true,
+         {"Stop Points Following"},
+         [](Rig &, const PolyLine &s) { EXPECT_FALSE(s.GetPoint(1)->Flags & PPF_Following); }},
+        {"stop following where none follows",
+         Corners,
+         {1},
+         [](Rig &r) { return r.Edit().StopFollowing(); },
+         false,
+         {},
+         Unchanged,
+         "None of the selected points follows another"},
         {"a locked point stays",
          Corners,
          {1, 2},

@@ -11,6 +11,7 @@
 
 #include <QAction>
 #include <QMenu>
+#include <QPushButton>
 #include <QToolBar>
 #include <QtTest>
 
@@ -463,7 +464,7 @@ void PolyLineSurfaceTest::keyActions_data()
     row("Shift+B", Qt::Key_B, S, "", "shapeBox", "1");
     row("Shift+R", Qt::Key_R, S, "", "reduceDialog", "true");
     row("Ctrl+R", Qt::Key_R, C, "", "message", "The inner polyline has no points");
-    row("E", Qt::Key_E, N, "", "message", "Edit Point: the point editor is not built yet");
+    row("E", Qt::Key_E, N, "", "pointEditor", "true");
     row("PageDown", Qt::Key_PageDown, N, "", "message", "Keyframes: the shape is not animated");
     row("PageUp", Qt::Key_PageUp, N, "", "message", "Keyframes: the shape is not animated");
     row("Shift+F", Qt::Key_F, S, "", "message", "-");
@@ -585,6 +586,7 @@ void PolyLineSurfaceTest::menuCommandsAct()
     QVERIFY(Choose(f, kAway, "Record>Pressure"));
     QCOMPARE(FieldText(overlay, "record"), QString("2"));
     QVERIFY(Choose(f, kAway, "Create>Ellipse…"));
+    QTest::mouseClick(f.viewer.findChild<QPushButton *>("numbersOk"), Qt::LeftButton);
     QCOMPARE(f.doc.UndoNames().last(), QString("Create Ellipse"));
     QVERIFY(AutoParam<PolyLine>(input, 0.0)->IsClosed());
     QVERIFY(!Choose(f, kAway, "Import>Import Nuke Shapes…"));
