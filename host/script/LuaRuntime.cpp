@@ -364,11 +364,20 @@ void LuaRuntime::PushObject(lua_State *L, ScriptObject *obj)
         return;
     }
     obj->IncRef();
-    // Charged to a content run while the script holds it.
-    LuaSandbox::Charge(L, obj->SizeOf());
     PushKey(L, kWrapKey);
     lua_pushlightuserdata(L, obj);
-    lua_call(L, 1, 1);
+    // A limit met inside the wrapper (a content run's memory cap or budget)
+    // must not strand the reference the wrapper was to own: the script gets
+    // nil, and the limit stops it at its next check.
+    if (lua_pcall(L, 1, 1, 0) != 0) {
+        lua_pop(L, 1);
+        obj->DecRef();
+        lua_pushnil(L);
+        return;
+    }
+    // Charged to a content run while the script holds it; after the wrap, so
+    // that a run charged past its cap still gets the wrapper it is owed.
+    LuaSandbox::Charge(L, obj->SizeOf());
 }
 
 ScriptObject *LuaRuntime::ToObject(lua_State *L, int idx)
