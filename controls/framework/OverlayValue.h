@@ -68,6 +68,16 @@ public:
         return ReadNumber(value, n) && Take(copy, n);
     }
 
+    // A switch from a Number Input (not 0: on), where it is one and changed.
+    static bool TakeFlag(bool &copy, const Parameter *value)
+    {
+        float64 n = 0.0;
+        if (!ReadNumber(value, n) || copy == (n != 0.0))
+            return false;
+        copy = n != 0.0;
+        return true;
+    }
+
     static bool TakePoint(OrbPoint &copy, const Parameter *value)
     {
         OrbPoint p;

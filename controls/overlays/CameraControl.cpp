@@ -142,12 +142,9 @@ bool CameraControl::RemoveInput(Input *input, const TagList *tags)
 
 void CameraControl::NotifyChanged(Input *input, Parameter *value, const TagList *tags)
 {
-    float64 n = 0.0;
     if (value && input && input == mVisibleInput) {
-        if (OV::ReadNumber(value, n) && mVisible != (n != 0.0)) {
-            mVisible = n != 0.0;
+        if (OV::TakeFlag(mVisible, value))
             HandleOverlay::NotifyChanged(input, value, tags);
-        }
         return;
     }
     AimedControl::NotifyChanged(input, value, tags);

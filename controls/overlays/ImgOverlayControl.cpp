@@ -119,7 +119,6 @@ void ImgOverlayControl::NotifyChanged(Input *input, Parameter *value, const TagL
     if (!value || !FindLinkedInput(*this, Links, input))
         return TransformControl::NotifyChanged(input, value, tags);
     bool moved = false;
-    float64 n = 0.0;
     if (input == mImageInput) {
         const auto *image = dynamic_cast<const ImageParam *>(value);
         mImage = image ? image->Image : QImage();
@@ -127,10 +126,8 @@ void ImgOverlayControl::NotifyChanged(Input *input, Parameter *value, const TagL
     }
     if (input == mOpacityInput)
         moved = OV::TakeNumber(mOpacity, value) || moved;
-    if (input == mVisibleInput && OV::ReadNumber(value, n) && mVisible != (n != 0.0)) {
-        mVisible = n != 0.0;
-        moved = true;
-    }
+    if (input == mVisibleInput)
+        moved = OV::TakeFlag(mVisible, value) || moved;
     if (moved)
         HandleOverlay::NotifyChanged(input, value, tags);
 }

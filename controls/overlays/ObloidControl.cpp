@@ -229,16 +229,11 @@ void ObloidControl::Store(int32 index, const Parameter *value, bool &moved)
 
 bool ObloidControl::StoreLinked(const Input *input, const Parameter *value)
 {
-    float64 n = 0.0;
     bool moved = false;
-    if (input == mVisibleInput && OV::ReadNumber(value, n) && mVisible != (n != 0.0)) {
-        mVisible = n != 0.0;
-        moved = true;
-    }
-    if (input == mLockInput && OV::ReadNumber(value, n) && mLocked != (n != 0.0)) {
-        mLocked = n != 0.0;
-        moved = true;
-    }
+    if (input == mVisibleInput)
+        moved = OV::TakeFlag(mVisible, value) || moved;
+    if (input == mLockInput)
+        moved = OV::TakeFlag(mLocked, value) || moved;
     if (input == mSizeInput)
         moved = OV::TakeNumber(mSizeMul, value) || moved;
     if (input == mCameraInput) {
