@@ -29,7 +29,7 @@ public:
     // The number of bytes the factory allocated for this object.
     std::size_t SizeOf() const override { return sizeof(Object); }
     // Applies attributes; the base applies none.
-    virtual bool SetAttrsTagList(const TagList &tags);
+    bool SetAttrsTagList(const TagList &tags) override;
     // Writes a readable attribute through `out` and returns false (a value was
     // supplied); returns true where the attribute is not one of the object's.
     virtual bool CopyAttr(Tag tag, void *out);
