@@ -40,7 +40,7 @@ struct Gamut
 // The colour spaces offered, by name, in menu order: "Rec. 709", "DCI-P3",
 // "P3-D65", "Rec. 2020", "ACES AP0", "ACES AP1". Their primaries and whites
 // are the published constants (ITU-R BT.709-6, SMPTE RP 431-2, SMPTE EG
-// 432-1, ITU-R BT.2020-2, SMPTE ST 2065-1 and the ACEScg specification S-2014-004).
+// 432-1, ITU-R BT.2020-2, SMPTE ST 2065-1 and the ACEScg document S-2014-004).
 const std::vector<std::string> &SpaceNames();
 // False where `name` is none of them.
 bool StandardGamut(const std::string &name, Gamut &out);
