@@ -48,6 +48,21 @@ OIIO::ImageSpec OpenConfig()
     return config;
 }
 
+bool CheckHeader(const QString &path, const OIIO::ImageSpec &desc, QString *error)
+{
+    if (desc.width <= 0 || desc.height <= 0 || desc.depth > 1 || desc.nchannels <= 0)
+        return Fail(error, QString("%1: not a flat image of at least one pixel").arg(path));
+    return CheckSize(path, desc.width, desc.height, error);
+}
+
+// OpenImageIO's description of the file's first image (size, channels,
+// pixel type); the name is its own.
+const OIIO::ImageSpec &Described(const OIIO::ImageInput &in)
+{
+    return in.spec();
+}
+
+// Opens the file and checks its header (size, channels) before any pixel is read.
 std::unique_ptr<OIIO::ImageInput> Open(const QString &path, QString *error)
 {
     if (!QFileInfo(path).isFile())
@@ -58,14 +73,7 @@ std::unique_ptr<OIIO::ImageInput> Open(const QString &path, QString *error)
         const QString why = QString::fromStdString(OIIO::geterror());
         return Fail(error, QString("%1: not a readable image (%2)").arg(path, why.trimmed())), nullptr;
     }
-    return in;
-}
-
-bool CheckHeader(const QString &path, const OIIO::ImageSpec &desc, QString *error)
-{
-    if (desc.width <= 0 || desc.height <= 0 || desc.depth > 1 || desc.nchannels <= 0)
-        return Fail(error, QString("%1: not a flat image of at least one pixel").arg(path));
-    return CheckSize(path, desc.width, desc.height, error);
+    return CheckHeader(path, Described(*in), error) ? std::move(in) : nullptr;
 }
 
 // Does the file hold sRGB-encoded values (rather than linear light)?
@@ -113,7 +121,7 @@ constexpr int kBandRows = 64;
 // files are read whole.
 bool ReadPixels(OIIO::ImageInput &in, int channels, float *data, const ImageFile::Progress &progress, bool *stopped)
 {
-    const OIIO::ImageSpec &desc = in.spec();
+    const OIIO::ImageSpec &desc = Described(in);
     if (desc.tile_width > 0)
         return in.read_image(0, 0, 0, channels, OIIO::TypeDesc::FLOAT, data);
     const std::size_t rowValues = std::size_t(desc.width) * std::size_t(channels);
@@ -155,9 +163,9 @@ QImage ImageFile::Read(const QString &path, QString *error)
 bool ImageFile::ReadHeader(const QString &path, Header *header, QString *error)
 {
     const auto in = Open(path, error);
-    if (!in || !CheckHeader(path, in->spec(), error))
+    if (!in)
         return false;
-    const OIIO::ImageSpec &desc = in->spec();
+    const OIIO::ImageSpec &desc = Described(*in);
     header->width = desc.width;
     header->height = desc.height;
     header->channels = desc.nchannels;
@@ -169,9 +177,9 @@ bool ImageFile::ReadHeader(const QString &path, Header *header, QString *error)
 FloatImage ImageFile::ReadLinear(const QString &path, QString *error, const Progress &progress)
 {
     const auto in = Open(path, error);
-    if (!in || !CheckHeader(path, in->spec(), error))
+    if (!in)
         return FloatImage();
-    const OIIO::ImageSpec &desc = in->spec();
+    const OIIO::ImageSpec &desc = Described(*in);
     const int channels = std::min(desc.nchannels, 4);
     std::vector<float> pixels(std::size_t(desc.width) * std::size_t(desc.height) * std::size_t(channels));
     bool stopped = false;
